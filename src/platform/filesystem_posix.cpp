@@ -1,1 +1,255 @@
-// placeholder
+// File system backend for Linux and other POSIX systems, where names are case-sensitive and a
+// Windows game lives in a Wine prefix.
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <array>
+#include <cerrno>
+#include <cstring>
+
+#include "platform/filesystem.h"
+
+namespace kickvane::platform {
+
+namespace {
+
+std::string ErrnoText(int error) { return std::strerror(error); }
+
+Status Failure(const std::string& what, const fs::path& path, int error) {
+    return Status::Fail(what + " " + path.string() + ": " + ErrnoText(error));
+}
+
+// Closes a descriptor when it goes out of scope.
+class Fd {
+public:
+    explicit Fd(int fd) : fd_(fd) {}
+    Fd(const Fd&) = delete;
+    Fd& operator=(const Fd&) = delete;
+    ~Fd() {
+        if (fd_ >= 0) {
+            ::close(fd_);
+        }
+    }
+    int get() const { return fd_; }
+    // Closes now and reports the error that a deferred write may only show at close.
+    int Close() {
+        int result = ::close(fd_);
+        fd_ = -1;
+        return result;
+    }
+
+private:
+    int fd_;
+};
+
+// A temporary file beside its final place; removed unless it was renamed into place.
+class TempFile {
+public:
+    explicit TempFile(const fs::path& target)
+        : path_(target.parent_path() / ("." + target.filename().string() + ".kv-XXXXXX")) {
+        std::string pattern = path_.string();
+        fd_ = ::mkostemp(pattern.data(), O_CLOEXEC);
+        path_ = pattern;
+    }
+    TempFile(const TempFile&) = delete;
+    TempFile& operator=(const TempFile&) = delete;
+    ~TempFile() {
+        if (fd_ >= 0) {
+            ::close(fd_);
+        }
+        if (!committed_) {
+            ::unlink(path_.c_str());
+        }
+    }
+
+    bool valid() const { return fd_ >= 0; }
+    int fd() const { return fd_; }
+
+    // Closes the file and renames it over `target`.
+    Status CommitAs(const fs::path& target) {
+        int fd = fd_;
+        fd_ = -1;
+        if (::close(fd) != 0) {
+            return Failure("cannot write", target, errno);
+        }
+        if (::rename(path_.c_str(), target.c_str()) != 0) {
+            return Failure("cannot replace", target, errno);
+        }
+        committed_ = true;
+        return Status::Ok();
+    }
+
+private:
+    fs::path path_;
+    int fd_ = -1;
+    bool committed_ = false;
+};
+
+bool WriteAll(int fd, const char* data, size_t size) {
+    while (size > 0) {
+        ssize_t written = ::write(fd, data, size);
+        if (written < 0) {
+            if (errno == EINTR) {
+                continue;
+            }
+            return false;
+        }
+        data += written;
+        size -= static_cast<size_t>(written);
+    }
+    return true;
+}
+
+// Copies the whole content of `in` to `out`; the kernel copies without a user-space buffer where
+// it can, which keeps large texture sets as fast as cp.
+bool CopyContent(int in, int out, off_t size) {
+    off_t left = size;
+    while (left > 0) {
+        ssize_t copied = ::copy_file_range(in, nullptr, out, nullptr, static_cast<size_t>(left), 0);
+        if (copied > 0) {
+            left -= copied;
+            continue;
+        }
+        if (copied == 0) {
+            break;  // The source shrank while we copied; keep what there is.
+        }
+        if (errno == EINTR) {
+            continue;
+        }
+        if (errno != EXDEV && errno != ENOSYS && errno != EINVAL && errno != EOPNOTSUPP) {
+            return false;
+        }
+        // No in-kernel copy between these file systems: fall back to read and write.
+        std::array<char, 1 << 16> buffer;
+        for (;;) {
+            ssize_t got = ::read(in, buffer.data(), buffer.size());
+            if (got < 0 && errno == EINTR) {
+                continue;
+            }
+            if (got < 0) {
+                return false;
+            }
+            if (got == 0) {
+                return true;
+            }
+            if (!WriteAll(out, buffer.data(), static_cast<size_t>(got))) {
+                return false;
+            }
+        }
+    }
+    return true;
+}
+
+bool StatFile(const fs::path& path, struct stat& st) { return ::stat(path.c_str(), &st) == 0; }
+
+}  // namespace
+
+fs::path ResolveCaseInsensitive(const fs::path& path) {
+    fs::path resolved = path.root_path();
+    bool belowMissing = false;
+    for (const fs::path& part : path.relative_path()) {
+        if (part.empty() || part == ".") {
+            continue;  // Doubled or trailing separators name nothing.
+        }
+        if (!belowMissing && part != "..") {
+            if (auto found = FindEntryIgnoringCase(resolved, part.string())) {
+                resolved = *found;
+                continue;
+            }
+            belowMissing = true;
+        }
+        resolved /= part;
+    }
+    return resolved;
+}
+
+Status MakeDirectory(const fs::path& path) {
+    if (::mkdir(path.c_str(), 0777) != 0) {
+        return Failure("cannot create folder", path, errno);
+    }
+    return Status::Ok();
+}
+
+bool IsUpToDateCopy(const fs::path& source, const fs::path& target) {
+    struct stat src {};
+    struct stat dst {};
+    return StatFile(source, src) && StatFile(target, dst) && S_ISREG(dst.st_mode) &&
+           src.st_size == dst.st_size && src.st_mtim.tv_sec == dst.st_mtim.tv_sec &&
+           src.st_mtim.tv_nsec == dst.st_mtim.tv_nsec;
+}
+
+Status ReplaceFile(const fs::path& source, const fs::path& target) {
+    Fd in(::open(source.c_str(), O_RDONLY | O_CLOEXEC));
+    if (in.get() < 0) {
+        return Failure("cannot read", source, errno);
+    }
+    struct stat st {};
+    if (::fstat(in.get(), &st) != 0) {
+        return Failure("cannot read", source, errno);
+    }
+    if (!S_ISREG(st.st_mode)) {
+        return Status::Fail("not a file: " + source.string());
+    }
+    TempFile temp(target);
+    if (!temp.valid()) {
+        return Failure("cannot write", target, errno);
+    }
+    if (!CopyContent(in.get(), temp.fd(), st.st_size)) {
+        return Failure("cannot copy to", target, errno);
+    }
+    ::fchmod(temp.fd(), st.st_mode & 0777);
+    const struct timespec times[2] = {st.st_atim, st.st_mtim};
+    ::futimens(temp.fd(), times);
+    return temp.CommitAs(target);
+}
+
+Status WriteFileAtomically(const fs::path& path, std::string_view content) {
+    TempFile temp(path);
+    if (!temp.valid()) {
+        return Failure("cannot write", path, errno);
+    }
+    if (!WriteAll(temp.fd(), content.data(), content.size()) || ::fsync(temp.fd()) != 0) {
+        return Failure("cannot write", path, errno);
+    }
+    // Keep the permissions of the file being replaced; a new file gets the usual ones.
+    struct stat old {};
+    ::fchmod(temp.fd(), StatFile(path, old) ? (old.st_mode & 0777) : 0644);
+    return temp.CommitAs(path);
+}
+
+fs::path ProgramFolder() {
+    std::error_code ec;
+    fs::path exe = fs::read_symlink("/proc/self/exe", ec);
+    return ec ? fs::current_path(ec) : exe.parent_path();
+}
+
+fs::path NativePathFromUserText(std::string_view text) {
+    std::string path(text);
+    for (char& c : path) {
+        if (c == '\\') {
+            c = '/';
+        }
+    }
+    const bool hasDrive = path.size() >= 2 && path[1] == ':' &&
+                          ((path[0] >= 'A' && path[0] <= 'Z') || (path[0] >= 'a' && path[0] <= 'z'));
+    if (!hasDrive) {
+        return fs::path(path);
+    }
+    std::string prefix = GetEnv("WINEPREFIX");
+    if (prefix.empty()) {
+        prefix = GetEnv("HOME") + "/.wine";
+    }
+    const char drive = static_cast<char>(path[0] | 0x20);
+    fs::path mapped = fs::path(prefix) / "dosdevices" / (std::string(1, drive) + ":");
+    if (!IsDirectory(mapped) && drive == 'c') {
+        mapped = fs::path(prefix) / "drive_c";  // A prefix without its dosdevices links.
+    }
+    std::string rest = path.substr(2);
+    while (!rest.empty() && rest.front() == '/') {
+        rest.erase(rest.begin());
+    }
+    return rest.empty() ? mapped : mapped / rest;
+}
+
+}  // namespace kickvane::platform
