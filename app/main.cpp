@@ -1,1 +1,39 @@
-int main() { return 0; }
+// The kickvane program: the window by default, or one of the command-line subcommands.
+#include <iostream>
+#include <string_view>
+#include <vector>
+
+#include "commands.h"
+
+int main(int argc, char** argv) {
+    using namespace kickvane::app;
+    const std::vector<std::string_view> args(argv + 1, argv + argc);
+    if (args.empty()) {
+        PrintUsage(std::cout);
+        return 0;
+    }
+    const std::string_view command = args[0];
+    const Args rest(args.data() + 1, args.size() - 1);
+    if (command == "apply") {
+        return RunApply(rest);
+    }
+    if (command == "plan") {
+        return RunPlan(rest);
+    }
+    if (command == "quick-load") {
+        return RunQuickLoad(rest);
+    }
+    if (command == "vni") {
+        return RunVni(rest);
+    }
+    if (command == "ini") {
+        return RunIni(rest);
+    }
+    if (command == "--help" || command == "-h" || command == "help") {
+        PrintUsage(std::cout);
+        return 0;
+    }
+    std::cerr << "kickvane: unknown command " << command << "\n\n";
+    PrintUsage(std::cerr);
+    return 2;
+}

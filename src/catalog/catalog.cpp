@@ -1,1 +1,122 @@
-// placeholder
+#include "catalog/catalog.h"
+
+#include <array>
+
+namespace kickvane::catalog {
+
+namespace {
+
+constexpr std::array<PatchCategory, kCategoryCount> kCategories{{
+    {"Bong", "Thay đổi bóng", 0, 1, GroupId::Ball},
+    {"Co", "Thay đổi cỏ", 1, 1, GroupId::Pitch},
+    {"Qcao", "Thay biển q.cáo", 2, 1, GroupId::Adboard},
+    {"Gdien", "Thay đổi đồ hoạ ", 3, 1, std::nullopt},
+    {"Logo", "Thay Logo", 4, 1, std::nullopt},
+    {"Khac", "Các tuỳ chỉnh khác", 5, 1, std::nullopt},
+    {"Face", "Thay đổi ngoại hình", 6, 1, std::nullopt},
+    {"Giay", "Thay đổi giày", 7, 1, std::nullopt},
+    {"Kit", "Thay đổi áo đấu", 8, 1, std::nullopt},
+    {"Luoi", "Thay đổi lưới", 9, 1, std::nullopt},
+    {"TiSo", "Thay đổi bảng tỉ số", 10, 1, GroupId::Scoreboard},
+    {"Mark", "Thay đổi Mark", 11, 1, GroupId::Mark},
+    {"CDV", "Thay đổi Cổ động viên", 12, 0, std::nullopt},
+    {"SVD", "Thay đổi Sân vận động", 13, 0, std::nullopt},
+}};
+
+// The default ball is a variant, not the base set: with no settings "Europa League 2011" is on.
+constexpr std::array<PatchOption, 4> kBall{{
+    {"MacDinh", "Mặc định", 0, false},
+    {"Europa League 2011", "Europa League 2011", 1, true},
+    {"Teamgeist Blue White", "Teamgeist Blue White", 2, false},
+    {"UCL 2011", "UCL 2011", 3, false},
+}};
+
+constexpr std::array<PatchOption, 8> kScoreboard{{
+    {"MacDinh", "Mặc định", 0, true},
+    {"SkySportHDBlue", "Sky Sport HD Blue", 1, false},
+    {"ESPNHD", "ESPN HD", 2, false},
+    {"StarSportsBlue", "Star Sports Blue", 3, false},
+    {"K+NS", "K+ Nhịp sống", 4, false},
+    {"VTCHDVIP", "VTC HD VIP", 5, false},
+    {"VTV3UCL", "VTV3 UCL", 6, false},
+    {"SSUCLRed", "Supa Strikas UCL Red", 7, false},
+}};
+
+// Adboard, pitch and mark share the option array UniOption1 (indices 0-10) and section "Khac".
+constexpr std::array<PatchOption, 4> kAdboard{{
+    {"QcaoMacDinh", "Quảng cáo mặc định", 0, true},
+    {"QcaoUCL", "Quảng cáo UCL", 1, false},
+    {"QcaoVN", "Quảng cáo Việt Nam", 2, false},
+    {"QcaoWC2010", "Quảng cáo WC 2010", 3, false},
+}};
+
+constexpr std::array<PatchOption, 4> kPitch{{
+    {"CoMacDinh", "Mặt cỏ mặc định", 4, true},
+    {"CoCaro", "Mặt cỏ Caro", 5, false},
+    {"CoOvalUCL", "Mặt cỏ Oval UCL", 6, false},
+    {"CoCaroUCL", "Mặt cỏ Caro UCL", 7, false},
+}};
+
+constexpr std::array<PatchOption, 3> kMark{{
+    {"MarkMacDinh", "Mark mặc định", 8, true},
+    {"MarkMatCuoi", "Mark Mặt cười", 9, false},
+    {"MarkPESvang", "Mark PES (Vàng)", 10, false},
+}};
+
+constexpr std::array<VariantGroup, kGroupCount> kGroups{{
+    {GroupId::Ball, 0, "Bong", OptionArray::UniOption, LabelArray::UniLabel1, 1, 0, kBall},
+    {GroupId::Scoreboard, 10, "Bang Ti So", OptionArray::UniOption3, LabelArray::UniLabel2, 2, 1,
+     kScoreboard},
+    {GroupId::Adboard, 2, "Khac", OptionArray::UniOption1, LabelArray::UniLabel3, 3, 2, kAdboard},
+    {GroupId::Pitch, 1, "Khac", OptionArray::UniOption1, LabelArray::UniLabel3, 3, 3, kPitch},
+    {GroupId::Mark, 11, "Khac", OptionArray::UniOption1, LabelArray::UniLabel3, 3, 4, kMark},
+}};
+
+}  // namespace
+
+std::span<const PatchCategory> Categories() {
+    return kCategories;
+}
+
+std::span<const VariantGroup> Groups() {
+    return kGroups;
+}
+
+const VariantGroup& Group(GroupId id) {
+    return kGroups[static_cast<size_t>(id)];
+}
+
+const PatchCategory* FindCategory(std::string_view key) {
+    for (const PatchCategory& category : kCategories) {
+        if (category.key == key) {
+            return &category;
+        }
+    }
+    return nullptr;
+}
+
+const PatchOption* FindOption(std::string_view section, std::string_view key) {
+    for (const VariantGroup& group : kGroups) {
+        if (group.section != section) {
+            continue;
+        }
+        for (const PatchOption& option : group.options) {
+            if (option.key == key) {
+                return &option;
+            }
+        }
+    }
+    return nullptr;
+}
+
+const VariantGroup* GroupOfOption(OptionArray array, int index) {
+    for (const VariantGroup& group : kGroups) {
+        if (group.array == array && index >= group.options.front().index &&
+            index <= group.options.back().index) {
+            return &group;
+        }
+    }
+    return nullptr;
+}
+
+}  // namespace kickvane::catalog

@@ -49,7 +49,8 @@ Status WriteFileAtomically(const fs::path& path, std::string_view content);
 // Reads a whole file. nullopt when it cannot be opened or read.
 std::optional<std::string> ReadFile(const fs::path& path);
 
-// The plain files (not folders, not hidden: no leading dot) directly inside `folder`, sorted by name.
+// The plain files (not folders, not hidden: no leading dot) directly inside `folder`, sorted by
+// name.
 std::vector<fs::path> ListPlainFiles(const fs::path& folder);
 
 // Folder that holds the running program.

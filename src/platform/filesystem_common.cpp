@@ -17,9 +17,9 @@ char FoldChar(char c) {
 }  // namespace
 
 bool NamesEqualIgnoringCase(std::string_view a, std::string_view b) {
-    return a.size() == b.size() &&
-           std::equal(a.begin(), a.end(), b.begin(),
-                      [](char x, char y) { return FoldChar(x) == FoldChar(y); });
+    return a.size() == b.size() && std::equal(a.begin(), a.end(), b.begin(), [](char x, char y) {
+               return FoldChar(x) == FoldChar(y);
+           });
 }
 
 std::string FoldCase(std::string_view name) {

@@ -14,7 +14,9 @@ namespace kickvane::platform {
 
 namespace {
 
-std::string ErrnoText(int error) { return std::strerror(error); }
+std::string ErrnoText(int error) {
+    return std::strerror(error);
+}
 
 Status Failure(const std::string& what, const fs::path& path, int error) {
     return Status::Fail(what + " " + path.string() + ": " + ErrnoText(error));
@@ -141,7 +143,9 @@ bool CopyContent(int in, int out, off_t size) {
     return true;
 }
 
-bool StatFile(const fs::path& path, struct stat& st) { return ::stat(path.c_str(), &st) == 0; }
+bool StatFile(const fs::path& path, struct stat& st) {
+    return ::stat(path.c_str(), &st) == 0;
+}
 
 }  // namespace
 
@@ -231,8 +235,9 @@ fs::path NativePathFromUserText(std::string_view text) {
             c = '/';
         }
     }
-    const bool hasDrive = path.size() >= 2 && path[1] == ':' &&
-                          ((path[0] >= 'A' && path[0] <= 'Z') || (path[0] >= 'a' && path[0] <= 'z'));
+    const bool hasDrive =
+        path.size() >= 2 && path[1] == ':' &&
+        ((path[0] >= 'A' && path[0] <= 'Z') || (path[0] >= 'a' && path[0] <= 'z'));
     if (!hasDrive) {
         return fs::path(path);
     }

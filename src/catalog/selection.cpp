@@ -1,0 +1,75 @@
+#include "catalog/selection.h"
+
+namespace kickvane::catalog {
+
+namespace {
+
+bool ValidSwitch(int switchIndex) {
+    return switchIndex >= 0 && switchIndex < kCategoryCount;
+}
+
+size_t Slot(GroupId group) {
+    return static_cast<size_t>(group);
+}
+
+}  // namespace
+
+PatchSelection PatchSelection::Defaults() {
+    PatchSelection selection;
+    for (const PatchCategory& category : Categories()) {
+        selection.setSwitchValue(category.switchIndex, category.defaultValue);
+    }
+    for (const VariantGroup& group : Groups()) {
+        for (const PatchOption& option : group.options) {
+            selection.setOptionValue(group.array, option.index, option.isDefault);
+        }
+    }
+    return selection;
+}
+
+int PatchSelection::switchValue(int switchIndex) const {
+    return ValidSwitch(switchIndex) ? switches_[static_cast<size_t>(switchIndex)] : 0;
+}
+
+void PatchSelection::setSwitchValue(int switchIndex, int value) {
+    if (ValidSwitch(switchIndex)) {
+        switches_[static_cast<size_t>(switchIndex)] = value;
+    }
+}
+
+bool PatchSelection::optionValue(OptionArray array, int index) const {
+    const VariantGroup* group = GroupOfOption(array, index);
+    return group && chosen_[Slot(group->id)] == index;
+}
+
+void PatchSelection::setOptionValue(OptionArray array, int index, bool value) {
+    const VariantGroup* group = GroupOfOption(array, index);
+    if (!group) {
+        return;
+    }
+    std::optional<int>& chosen = chosen_[Slot(group->id)];
+    if (value) {
+        chosen = index;
+    } else if (chosen == index) {
+        chosen.reset();
+    }
+}
+
+std::optional<int> PatchSelection::chosen(GroupId group) const {
+    return chosen_[Slot(group)];
+}
+
+const PatchOption* PatchSelection::chosenOption(GroupId group) const {
+    const std::optional<int> index = chosen(group);
+    if (!index) {
+        return nullptr;
+    }
+    for (const PatchOption& option : Group(group).options) {
+        if (option.index == *index) {
+            return &option;
+        }
+    }
+    return nullptr;
+}
+
+}  // namespace kickvane::catalog

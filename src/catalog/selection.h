@@ -1,0 +1,42 @@
+#pragma once
+
+#include <array>
+#include <optional>
+
+#include "catalog/catalog.h"
+
+namespace kickvane::catalog {
+
+// The user's choice: one switch value per category and at most one chosen variant per group.
+// It mirrors the window's check boxes and option buttons, including their rule that choosing a
+// variant clears the other variants of its container and that clearing one touches nothing else.
+class PatchSelection {
+public:
+    // Nothing chosen and every switch 0, as the widgets are before the settings are loaded.
+    PatchSelection() = default;
+
+    // The catalog's defaults, as a load without a settings file gives them.
+    static PatchSelection Defaults();
+
+    int switchValue(int switchIndex) const;
+    void setSwitchValue(int switchIndex, int value);
+    // A category is on only when its switch value is exactly 1.
+    bool isOn(int switchIndex) const { return switchValue(switchIndex) == 1; }
+
+    // The value of option button `index` of `array`.
+    bool optionValue(OptionArray array, int index) const;
+    // True chooses the variant and clears the others of its container; false clears only it.
+    void setOptionValue(OptionArray array, int index, bool value);
+
+    // The chosen variant of a group, as its index in the group's option array.
+    std::optional<int> chosen(GroupId group) const;
+    const PatchOption* chosenOption(GroupId group) const;
+
+    friend bool operator==(const PatchSelection&, const PatchSelection&) = default;
+
+private:
+    std::array<int, kCategoryCount> switches_{};
+    std::array<std::optional<int>, kGroupCount> chosen_{};
+};
+
+}  // namespace kickvane::catalog

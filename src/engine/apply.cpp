@@ -1,0 +1,95 @@
+#include "engine/apply.h"
+
+#include "platform/filesystem.h"
+
+namespace kickvane::engine {
+
+std::vector<StepOutcome> ApplyOutcome::Failures() const {
+    std::vector<StepOutcome> failures;
+    for (const StepOutcome& step : steps) {
+        if (step.state == StepState::Failed) {
+            failures.push_back(step);
+        }
+    }
+    return failures;
+}
+
+std::string ToolDataMissingText(const Roots& roots) {
+    return "Khong tim thay: " + roots.toolData.string() + "\r\nKiem tra lai duong dan";
+}
+
+std::filesystem::path SignalSoundPath(const std::filesystem::path& toolFolder) {
+    return platform::ResolveCaseInsensitive(toolFolder / "sound.wav");
+}
+
+StepOutcome RunStep(const PlanStep& step, const Roots& roots) {
+    StepOutcome outcome{step, StepState::Done, {}, {}};
+    const bool needed = [&] {
+        switch (step.guard) {
+            case StepGuard::IfSourceFolderExists:
+                return FolderExists(roots.Resolve(step.source));
+            case StepGuard::IfGuardFolderMissing:
+                return !FolderExists(roots.Resolve(step.guardFolder));
+            case StepGuard::Always:
+                break;
+        }
+        return true;
+    }();
+    if (!needed) {
+        outcome.state = StepState::NotNeeded;
+        return outcome;
+    }
+    Status status = Status::Ok();
+    switch (step.kind) {
+        case StepKind::MergeCopy:
+            status =
+                MergeCopy(roots.Resolve(step.source), roots.Resolve(step.target), &outcome.files);
+            break;
+        case StepKind::FileCopy:
+            status = CopyFileInto(roots.Resolve(step.source), roots.Resolve(step.target),
+                                  &outcome.files);
+            break;
+        case StepKind::MakeFolder:
+            // The plan makes folders only so that the copy after it has a place to go; one that
+            // exists already is what the plan wants, not a failure to report.
+            if (FolderExists(roots.Resolve(step.target))) {
+                outcome.state = StepState::NotNeeded;
+                return outcome;
+            }
+            status = MakeFolder(roots.Resolve(step.target));
+            break;
+    }
+    if (!status) {
+        outcome.state = StepState::Failed;
+        outcome.reason = status.reason();
+    }
+    return outcome;
+}
+
+ApplyOutcome ApplyPatches(const std::filesystem::path& toolFolder, std::string_view gameFolder,
+                          const catalog::PatchSelection& selection, EngineUi& ui,
+                          const StepObserver& observer) {
+    ApplyOutcome outcome;
+    const Roots roots = ResolveRoots(toolFolder, gameFolder);
+    outcome.stoppedBy = CheckRoots(roots);
+    switch (outcome.stoppedBy) {
+        case RootProblem::ToolDataMissing:
+            ui.ShowPlainMessage(ToolDataMissingText(roots), kToolDataMissingTitle);
+            return outcome;
+        case RootProblem::DataMissing:
+            ui.Messages().ShowText(ui.Messages().ConvertText(kDataMissingVni));
+            return outcome;
+        case RootProblem::None:
+            break;
+    }
+    for (const PlanStep& step : BuildPlan(selection)) {
+        outcome.steps.push_back(RunStep(step, roots));
+        if (observer) {
+            observer(outcome.steps.back());
+        }
+    }
+    ui.PlaySound(SignalSoundPath(toolFolder));
+    return outcome;
+}
+
+}  // namespace kickvane::engine

@@ -1,0 +1,61 @@
+#pragma once
+
+#include <filesystem>
+#include <functional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "catalog/selection.h"
+#include "engine/engine_ui.h"
+#include "engine/file_ops.h"
+#include "engine/plan.h"
+#include "engine/roots.h"
+
+namespace kickvane::engine {
+
+enum class StepState {
+    Done,
+    NotNeeded,  // its guard said no: the source is absent or the folder exists
+    Failed,
+};
+
+struct StepOutcome {
+    PlanStep step;
+    StepState state = StepState::Done;
+    std::string reason;  // why it failed
+    CopyCount files;
+};
+
+struct ApplyOutcome {
+    RootProblem stoppedBy = RootProblem::None;  // a folder check stopped the run: nothing copied
+    std::vector<StepOutcome> steps;
+
+    bool stopped() const { return stoppedBy != RootProblem::None; }
+    std::vector<StepOutcome> Failures() const;
+};
+
+// Called after each step, for progress output.
+using StepObserver = std::function<void(const StepOutcome&)>;
+
+// Messages of the two folder checks, as stored (the second one VNI-typed).
+inline constexpr std::string_view kToolDataMissingTitle = "Thu muc nguon";
+std::string ToolDataMissingText(const Roots& roots);
+inline constexpr std::string_view kDataMissingVni =
+    "Kho6ng ti2m tha61y thu7 mu5c chu71a FIFA Online 2\r\nVui lo2ng kie63m tra la5i d9u7o72ng "
+    "da64n";
+
+// Copies the chosen sets from the tool folder into the game folder. The folder checks come first
+// and stop the run with their message. Then every step runs in plan order; a step that fails is
+// recorded and the run goes on. The run ends with the signal sound.
+ApplyOutcome ApplyPatches(const std::filesystem::path& toolFolder, std::string_view gameFolder,
+                          const catalog::PatchSelection& selection, EngineUi& ui,
+                          const StepObserver& observer = {});
+
+// Runs one step of a plan against resolved roots.
+StepOutcome RunStep(const PlanStep& step, const Roots& roots);
+
+// The path of the signal sound in the tool folder.
+std::filesystem::path SignalSoundPath(const std::filesystem::path& toolFolder);
+
+}  // namespace kickvane::engine

@@ -1,0 +1,267 @@
+#include "engine/plan.h"
+
+#include <array>
+#include <string_view>
+
+namespace kickvane::engine {
+
+namespace {
+
+using catalog::GroupId;
+using catalog::PatchSelection;
+
+// Switch indices of the categories, in the order they are applied.
+enum Category {
+    kBall = 0,
+    kPitch = 1,
+    kAdboard = 2,
+    kInterface = 3,
+    kEmblems = 4,
+    kOther = 5,
+    kFaces = 6,
+    kBoots = 7,
+    kKits = 8,
+    kNets = 9,
+    kScoreboard = 10,
+    kMark = 11,
+    kCrowd = 12,
+    kStadiums = 13,
+};
+
+class PlanBuilder {
+public:
+    explicit PlanBuilder(std::vector<PlanStep>& steps) : steps_(steps) {}
+
+    void Category(int category) { category_ = category; }
+
+    void Merge(Root from, std::string_view fromPath, Root to, std::string_view toPath,
+               StepGuard guard = StepGuard::Always) {
+        steps_.push_back({category_,
+                          StepKind::MergeCopy,
+                          {from, std::string(fromPath)},
+                          {to, std::string(toPath)},
+                          guard,
+                          {}});
+    }
+
+    // The same relative path on both sides: base set into the game.
+    void Mirror(Root from, Root to, std::string_view path) { Merge(from, path, to, path); }
+
+    void File(Root from, std::string_view fromPath, Root to, std::string_view toFolder) {
+        steps_.push_back({category_,
+                          StepKind::FileCopy,
+                          {from, std::string(fromPath)},
+                          {to, std::string(toFolder)},
+                          StepGuard::Always,
+                          {}});
+    }
+
+    // Make each folder in turn, but only while `guard` is missing.
+    void MakeFoldersUnless(Location guard, std::initializer_list<std::string_view> folders) {
+        for (std::string_view folder : folders) {
+            steps_.push_back({category_,
+                              StepKind::MakeFolder,
+                              {},
+                              {Root::Data, std::string(folder)},
+                              StepGuard::IfGuardFolderMissing,
+                              guard});
+        }
+    }
+
+private:
+    std::vector<PlanStep>& steps_;
+    int category_ = 0;
+};
+
+constexpr std::array<std::string_view, 4> kBallSets{
+    "", "\\Ball\\Europa League 2011", "\\Ball\\Teamgeist Blue White", "\\Ball\\UCL 2011"};
+
+// Pitch variants, by option index (4 is the default, which has its own steps).
+constexpr std::array<std::string_view, 3> kPitchSets{"\\pitch\\Caro", "\\pitch\\Oval UCL",
+                                                     "\\pitch\\Caro UCL"};
+
+constexpr std::array<std::string_view, 4> kAdboardSets{"", "\\adboard\\UCL", "\\adboard\\Viet Nam",
+                                                       "\\adboard\\WC 2010"};
+
+constexpr std::array<std::string_view, 8> kScoreboardSets{
+    "",
+    "\\scoreboard\\SkySport Blue",
+    "\\scoreboard\\ESPN HD",
+    "\\scoreboard\\StarSports Blue",
+    "\\scoreboard\\K+ NS",
+    "\\scoreboard\\VTC HD VIP",
+    "\\scoreboard\\VTV3 UCL",
+    "\\scoreboard\\SupaStrikas UCL Red",
+};
+
+// Mark variants, by option index (8 is the default).
+constexpr std::array<std::string_view, 2> kMarkSets{"\\Indicator\\Mat cuoi",
+                                                    "\\Indicator\\PES vang"};
+
+constexpr std::array<std::string_view, 8> kInterfaceFolders{
+    "\\gui\\hud\\chatting",     "\\gui\\hud\\DistanceToNet", "\\gui\\hud\\PK", "\\gui\\hud\\radar",
+    "\\gui\\hud\\RefAdvantage", "\\gui\\hud\\watermark",     "\\gui\\loading", "\\gui\\font",
+};
+
+void AddBall(PlanBuilder& plan, std::optional<int> variant) {
+    if (!variant) {
+        return;
+    }
+    if (*variant == 0) {
+        plan.Mirror(Root::ToolData, Root::Data, "\\ball");
+        plan.Mirror(Root::ToolZData, Root::ZData, "\\ball");
+    } else {
+        plan.Merge(Root::Extras, kBallSets[static_cast<size_t>(*variant)], Root::ZData, "\\ball");
+    }
+}
+
+void AddPitch(PlanBuilder& plan, std::optional<int> variant) {
+    if (!variant) {
+        return;
+    }
+    if (*variant == 4) {
+        plan.Mirror(Root::ToolData, Root::Data, "\\pitch");
+        plan.Mirror(Root::ToolZData, Root::ZData, "\\pitch");
+        return;
+    }
+    // A variant's own grass, then the shared textures, then the base set's dirt and pitch lines
+    // over whatever the variant brought, and the second tree's pitch reset to the base set.
+    plan.Merge(Root::Extras, kPitchSets[static_cast<size_t>(*variant - 5)], Root::Data,
+               "\\pitch\\textures");
+    plan.Merge(Root::Extras, "\\pitch\\_textures", Root::Data, "\\pitch\\textures");
+    plan.File(Root::ToolData, "\\pitch\\textures\\grass_dirt.dds", Root::Data, "\\pitch\\textures");
+    plan.File(Root::ToolData, "\\pitch\\textures\\grass_pitchlines.dds", Root::Data,
+              "\\pitch\\textures");
+    plan.Mirror(Root::ToolZData, Root::ZData, "\\pitch");
+}
+
+void AddAdboard(PlanBuilder& plan, std::optional<int> variant) {
+    if (variant == 0) {
+        // The default restores only the main tree's adboards.
+        plan.Mirror(Root::ToolData, Root::Data, "\\adboard");
+    } else if (variant) {
+        plan.Merge(Root::Extras, kAdboardSets[static_cast<size_t>(*variant)], Root::ZData,
+                   "\\adboard");
+    }
+    plan.Mirror(Root::ToolData, Root::Data, "\\ingame_ad");
+}
+
+void AddScoreboard(PlanBuilder& plan, std::optional<int> variant) {
+    if (!variant) {
+        return;
+    }
+    if (*variant == 0) {
+        plan.Mirror(Root::ToolData, Root::Data, "\\gui\\hud\\scoreboard");
+        plan.Mirror(Root::ToolData, Root::Data, "\\gui\\hud\\namebar");
+        return;
+    }
+    const std::string set(kScoreboardSets[static_cast<size_t>(*variant)]);
+    plan.Merge(Root::Extras, set + "\\scoreboard", Root::Data, "\\gui\\hud\\scoreboard");
+    plan.Merge(Root::Extras, set + "\\namebar", Root::Data, "\\gui\\hud\\namebar");
+}
+
+void AddMark(PlanBuilder& plan, std::optional<int> variant) {
+    if (!variant) {
+        return;
+    }
+    if (*variant == 8) {
+        plan.Mirror(Root::ToolData, Root::Data, "\\gui\\hud\\Indicator");
+    } else {
+        plan.Merge(Root::Extras, kMarkSets[static_cast<size_t>(*variant - 9)], Root::Data,
+                   "\\gui\\hud\\Indicator");
+    }
+}
+
+}  // namespace
+
+std::vector<PlanStep> BuildPlan(const PatchSelection& selection) {
+    std::vector<PlanStep> steps;
+    PlanBuilder plan(steps);
+    for (int category = 0; category < catalog::kCategoryCount; ++category) {
+        if (!selection.isOn(category)) {
+            continue;
+        }
+        plan.Category(category);
+        switch (category) {
+            case kBall:
+                AddBall(plan, selection.chosen(GroupId::Ball));
+                break;
+            case kPitch:
+                AddPitch(plan, selection.chosen(GroupId::Pitch));
+                break;
+            case kAdboard:
+                AddAdboard(plan, selection.chosen(GroupId::Adboard));
+                break;
+            case kInterface:
+                for (std::string_view folder : kInterfaceFolders) {
+                    plan.Merge(Root::ToolData, folder, Root::Data, folder,
+                               StepGuard::IfSourceFolderExists);
+                }
+                break;
+            case kEmblems:
+                plan.MakeFoldersUnless({Root::Data, "\\teams\\emblems"},
+                                       {"\\teams", "\\teams\\emblems"});
+                plan.Mirror(Root::ToolData, Root::Data, "\\teams\\emblems");
+                break;
+            case kOther:
+                plan.Mirror(Root::ToolData, Root::Data, "\\cmn");
+                break;
+            case kFaces:
+                plan.Mirror(Root::ToolData, Root::Data, "\\players\\bodies");
+                plan.Mirror(Root::ToolData, Root::Data, "\\players\\heads");
+                break;
+            case kBoots:
+                plan.Mirror(Root::ToolData, Root::Data, "\\players\\accessories");
+                break;
+            case kKits:
+                plan.Mirror(Root::ToolData, Root::Data, "\\players\\kit");
+                break;
+            case kNets:
+                plan.MakeFoldersUnless({Root::Data, "\\net\\textures"},
+                                       {"\\net", "\\net\\textures"});
+                plan.Mirror(Root::ToolData, Root::Data, "\\net\\textures");
+                break;
+            case kScoreboard:
+                AddScoreboard(plan, selection.chosen(GroupId::Scoreboard));
+                break;
+            case kMark:
+                AddMark(plan, selection.chosen(GroupId::Mark));
+                break;
+            case kCrowd:
+                plan.Mirror(Root::ToolZData, Root::ZData, "\\crowd\\textures");
+                break;
+            case kStadiums:
+                plan.Mirror(Root::ToolZData, Root::ZData, "\\stadiums");
+                break;
+            default:
+                break;
+        }
+    }
+    return steps;
+}
+
+std::string Describe(const PlanStep& step) {
+    auto where = [](const Location& location) {
+        return std::string(RootName(location.root)) + location.relative;
+    };
+    std::string text;
+    switch (step.kind) {
+        case StepKind::MergeCopy:
+            text = "merge " + where(step.source) + " -> " + where(step.target);
+            break;
+        case StepKind::FileCopy:
+            text = "copy " + where(step.source) + " -> " + where(step.target);
+            break;
+        case StepKind::MakeFolder:
+            text = "make folder " + where(step.target);
+            break;
+    }
+    if (step.guard == StepGuard::IfSourceFolderExists) {
+        text += " (if the source exists)";
+    } else if (step.guard == StepGuard::IfGuardFolderMissing) {
+        text += " (if " + where(step.guardFolder) + " is missing)";
+    }
+    return text;
+}
+
+}  // namespace kickvane::engine

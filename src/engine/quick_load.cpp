@@ -1,0 +1,103 @@
+#include "engine/quick_load.h"
+
+#include <array>
+#include <optional>
+
+#include "engine/file_ops.h"
+#include "engine/roots.h"
+#include "platform/filesystem.h"
+
+namespace kickvane::engine {
+
+namespace {
+
+namespace fs = std::filesystem;
+
+struct Pattern {
+    std::string_view direct;
+    std::string_view nestedFolder;  // empty when the pattern has no nested form
+    std::string_view target;        // below the tool's "data" folder
+};
+
+constexpr std::array<Pattern, 7> kPatterns{{
+    {"cm_*.dds", "heads\\textures", "\\data2\\players\\heads\\textures"},
+    {"face*.dds", "heads\\textures", "\\data2\\players\\heads\\textures"},
+    {"cmbhair_*.dds", "heads\\textures", "\\data2\\players\\heads\\textures"},
+    {"skin*.dds", "bodies\\textures", "\\data2\\players\\bodies\\textures"},
+    {"hhead*.pc.ea3.em", "heads", "\\data2\\players\\heads"},
+    {"ball10_*.ea3.em", "", "\\zdata\\data2\\ball"},
+    {"ball10.dds", "textures", "\\zdata\\data2\\ball\\textures"},
+}};
+
+char Fold(char c) {
+    return (c >= 'A' && c <= 'Z') ? static_cast<char>(c - 'A' + 'a') : c;
+}
+
+std::vector<fs::path> MatchingFiles(const fs::path& folder, std::string_view pattern) {
+    std::vector<fs::path> matches;
+    for (const fs::path& file : platform::ListPlainFiles(folder)) {
+        if (MatchesWildcard(file.filename().string(), pattern)) {
+            matches.push_back(file);
+        }
+    }
+    return matches;
+}
+
+}  // namespace
+
+bool MatchesWildcard(std::string_view name, std::string_view pattern) {
+    // Iterative match with one backtrack point for the last '*'.
+    size_t n = 0;
+    size_t p = 0;
+    std::optional<size_t> star;
+    size_t starName = 0;
+    while (n < name.size()) {
+        if (p < pattern.size() && (pattern[p] == '?' || Fold(pattern[p]) == Fold(name[n]))) {
+            ++n;
+            ++p;
+        } else if (p < pattern.size() && pattern[p] == '*') {
+            star = p++;
+            starName = n;
+        } else if (star) {
+            p = *star + 1;
+            n = ++starName;
+        } else {
+            return false;
+        }
+    }
+    while (p < pattern.size() && pattern[p] == '*') {
+        ++p;
+    }
+    return p == pattern.size();
+}
+
+QuickLoadOutcome QuickLoad(const fs::path& toolFolder, const fs::path& source, EngineUi& ui) {
+    QuickLoadOutcome outcome;
+    const fs::path from = source.empty() ? fs::path() : platform::ResolveCaseInsensitive(source);
+    if (from.empty() || platform::ListPlainFiles(from).empty()) {
+        ui.Messages().ShowText(ui.Messages().ConvertText(kNoFolderChosenVni));
+        outcome.stopped = true;
+        return outcome;
+    }
+    const fs::path dataFolder = toolFolder / "data";
+    for (const Pattern& pattern : kPatterns) {
+        std::vector<fs::path> files = MatchingFiles(from, pattern.direct);
+        if (files.empty() && !pattern.nestedFolder.empty()) {
+            files = MatchingFiles(
+                platform::ResolveCaseInsensitive(JoinWindowsPath(from, pattern.nestedFolder)),
+                pattern.direct);
+        }
+        const fs::path target = JoinWindowsPath(dataFolder, pattern.target);
+        for (const fs::path& file : files) {
+            if (Status copied = CopyFileInto(file, target); !copied) {
+                outcome.failures.push_back(std::string(pattern.direct) + ": " + copied.reason());
+                break;
+            }
+            outcome.copied.push_back(fs::relative(file, from).generic_string());
+        }
+    }
+    ui.ShowPopup({kQuickLoadDoneText, 2});
+    return outcome;
+}
+
+}  // namespace kickvane::engine
