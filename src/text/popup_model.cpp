@@ -1,0 +1,291 @@
+#include "text/popup_model.h"
+
+#include <algorithm>
+#include <cmath>
+#include <limits>
+#include <utility>
+
+namespace kickvane::text {
+namespace {
+
+constexpr int kLabelLeftPx = 5;
+constexpr int kStickyLabelTopPx = 5;
+constexpr int kTimedLabelTopPx = 10;
+constexpr int kLabelMarginPx = 10;  // label width = client width - this; auto-fit space below
+constexpr int kSlideStepSlot1 = 50;
+constexpr int kSlideStepHigherSlots = 100;
+constexpr int kFadeStartPercent = 20;
+constexpr int kFadeStepPercent = 2;
+constexpr int kFadeEndPercent = 100;
+
+int ClampToInt(long long value) {
+    return static_cast<int>(std::clamp<long long>(value, std::numeric_limits<int>::min(),
+                                                  std::numeric_limits<int>::max()));
+}
+
+int RoundToInt(double value) {
+    if (!std::isfinite(value)) {
+        return 0;
+    }
+    constexpr double kLimit = std::numeric_limits<int>::max();
+    return ClampToInt(RoundHalfEven(std::clamp(value, -kLimit, kLimit)));
+}
+
+double SaneTwipsPerPixel(double twips) {
+    return std::isfinite(twips) && twips > 0.0 ? twips : 15.0;
+}
+
+}  // namespace
+
+long long RoundHalfEven(double value) {
+    const double below = std::floor(value);
+    const double fraction = value - below;
+    double result = below;
+    if (fraction > 0.5 || (fraction == 0.5 && std::fmod(below, 2.0) != 0.0)) {
+        result = below + 1.0;
+    }
+    return static_cast<long long>(result);
+}
+
+PopupSlots& PopupSlots::Shared() {
+    static PopupSlots slots;
+    return slots;
+}
+
+int PopupSlots::Take() {
+    int slot = kSlotCount;
+    for (int k = 1; k < kSlotCount; ++k) {
+        if ((mask_ & (1u << (k - 1))) == 0) {
+            slot = k;
+            break;
+        }
+    }
+    mask_ = static_cast<std::uint8_t>(mask_ | (1u << (slot - 1)));
+    return slot;
+}
+
+void PopupSlots::Release(int slot) {
+    if (slot >= 1 && slot <= kSlotCount) {
+        mask_ = static_cast<std::uint8_t>(mask_ ^ (1u << (slot - 1)));
+    }
+}
+
+AlertPopupModel::AlertPopupModel(PopupEnvironment environment)
+    : env_(std::move(environment)), slots_(env_.slots ? *env_.slots : PopupSlots::Shared()) {
+    env_.screen.twipsPerPixelX = SaneTwipsPerPixel(env_.screen.twipsPerPixelX);
+    env_.screen.twipsPerPixelY = SaneTwipsPerPixel(env_.screen.twipsPerPixelY);
+}
+
+AlertPopupModel::~AlertPopupModel() {
+    // A popup that goes away early (the program ends) must not keep its slot.
+    if (initialised_ && !finished_) {
+        slots_.Release(slot_);
+    }
+}
+
+void AlertPopupModel::Initialise() {
+    const ScreenMetrics& screen = env_.screen;
+    workBottomTwips_ = RoundToInt(screen.workAreaBottomPx * screen.twipsPerPixelY);
+    screenHeightTwips_ = RoundToInt(screen.screenHeightPx * screen.twipsPerPixelY);
+    const int workRightTwips = RoundToInt(screen.workAreaRightPx * screen.twipsPerPixelX);
+    // Just below the work area at its right-hand side.
+    leftTwips_ = ClampToInt(static_cast<long long>(workRightTwips) - kPopupInitialWidthTwips);
+    topTwips_ = workBottomTwips_;
+    widthTwips_ = kPopupInitialWidthTwips;
+    heightTwips_ = kPopupInitialHeightTwips;
+    slot_ = slots_.Take();
+    initialised_ = true;
+}
+
+void AlertPopupModel::DisplayMessage(std::string_view message, int displaySeconds, bool fade,
+                                     bool autoFit, bool square, Colour backColour) {
+    if (finished_) {
+        return;
+    }
+    sticky_ = displaySeconds < 1;
+    noClickClose_ = displaySeconds < 0;
+    if (displaySeconds >= 1) {
+        ticksLeft_ = ClampToInt(static_cast<long long>(displaySeconds) * kPopupTicksPerSecond);
+        text_ = message;
+    } else {
+        ticksLeft_ = 1;
+        text_ = displaySeconds == 0 ? std::string(kClickToCloseLine) + "\r\n" + std::string(message)
+                                    : std::string(message);
+    }
+    if (!initialised_) {
+        Initialise();
+    }
+
+    label_.left = kLabelLeftPx;
+    label_.top = sticky_ ? kStickyLabelTopPx : kTimedLabelTopPx;
+    label_.width = std::max(0, ClientWidthPx() - kLabelMarginPx);
+    if (env_.labelHeight) {
+        // Bounded so that the auto-fit height stays a sane number of twips.
+        constexpr int kMaxLabelHeightPx = 100000;
+        label_.height = std::clamp(env_.labelHeight(label_.width, text_), 0, kMaxLabelHeightPx);
+        if (slot_ == 1 && autoFit) {
+            heightTwips_ = RoundToInt((label_.top + label_.height + kLabelMarginPx) *
+                                      env_.screen.twipsPerPixelY);
+        }
+    } else {
+        label_.height = std::max(0, ClientHeightPx() - label_.top - kLabelLeftPx);
+    }
+
+    fadeMode_ = fade;
+    if (fadeMode_) {
+        stepValue_ = kFadeStartPercent;
+        topTwips_ = std::max(RestingTop(), 0);
+        SetTransparency(stepValue_);
+        topmost_ = true;
+    } else {
+        stepValue_ = slot_ > 1 ? kSlideStepHigherSlots : kSlideStepSlot1;
+    }
+    DrawFrame(square, backColour);
+    shown_ = true;
+}
+
+void AlertPopupModel::Tick() {
+    if (!shown_ || finished_) {
+        return;
+    }
+    if (fadeMode_) {
+        FadeTick();
+    } else {
+        SlideTick();
+    }
+}
+
+void AlertPopupModel::SlideTick() {
+    if (ticksLeft_ > 0) {
+        const int resting = RestingTop();
+        const int stop = std::max(resting, 0);
+        if (topTwips_ > 0 && resting < topTwips_) {
+            // Stops at the resting place instead of passing it and jumping back on arrival.
+            topTwips_ = std::max(topTwips_ - stepValue_, stop);
+        } else {
+            if (!arrived_) {
+                topTwips_ = stop;
+                arrived_ = true;
+                topmost_ = true;
+            }
+            if (!sticky_) {
+                --ticksLeft_;
+            }
+        }
+        return;
+    }
+    if (topTwips_ <= screenHeightTwips_) {
+        if (arrived_) {
+            arrived_ = false;
+            topmost_ = false;
+        }
+        topTwips_ = ClampToInt(static_cast<long long>(topTwips_) + stepValue_);
+    } else {
+        Unload();
+    }
+}
+
+void AlertPopupModel::FadeTick() {
+    if (ticksLeft_ > 0) {
+        if (stepValue_ > 0) {
+            stepValue_ -= kFadeStepPercent;
+            SetTransparency(stepValue_);
+        } else if (!sticky_) {
+            --ticksLeft_;
+        }
+        return;
+    }
+    if (stepValue_ > kFadeEndPercent) {
+        Unload();
+    } else {
+        stepValue_ += kFadeStepPercent;
+        SetTransparency(stepValue_);
+    }
+}
+
+void AlertPopupModel::Click() {
+    if (shown_ && !noClickClose_) {
+        ticksLeft_ = 0;
+    }
+}
+
+void AlertPopupModel::SetCloseActivate(bool value) {
+    if (value) {
+        ticksLeft_ = 0;
+    }
+}
+
+PopupPhase AlertPopupModel::Phase() const {
+    if (!shown_) {
+        return PopupPhase::kHidden;
+    }
+    if (finished_) {
+        return PopupPhase::kFinished;
+    }
+    if (ticksLeft_ <= 0) {
+        return PopupPhase::kLeaving;
+    }
+    const bool atRest = fadeMode_ ? stepValue_ <= 0 : arrived_;
+    return atRest ? PopupPhase::kResting : PopupPhase::kArriving;
+}
+
+PixelRect AlertPopupModel::WindowPixels() const {
+    return {RoundToInt(leftTwips_ / env_.screen.twipsPerPixelX),
+            RoundToInt(topTwips_ / env_.screen.twipsPerPixelY), ClientWidthPx(), ClientHeightPx()};
+}
+
+int AlertPopupModel::RestingTop() const {
+    return ClampToInt(static_cast<long long>(workBottomTwips_) -
+                      static_cast<long long>(heightTwips_) * slot_);
+}
+
+int AlertPopupModel::ClientWidthPx() const {
+    return RoundToInt(widthTwips_ / env_.screen.twipsPerPixelX);
+}
+
+int AlertPopupModel::ClientHeightPx() const {
+    return RoundToInt(heightTwips_ / env_.screen.twipsPerPixelY);
+}
+
+void AlertPopupModel::SetTransparency(int percent) {
+    if (!env_.translucencySupported) {
+        return;
+    }
+    // alpha = (100 - percent) / 100 × 255; multiplying first keeps the halves exact.
+    const long long alpha = RoundHalfEven((100.0 - percent) * 255.0 / 100.0);
+    if (alpha < 0 || alpha > 255) {
+        return;
+    }
+    alpha_ = static_cast<std::uint8_t>(alpha);
+}
+
+void AlertPopupModel::DrawFrame(bool square, Colour backColour) {
+    const int w = ClientWidthPx();
+    const int h = ClientHeightPx();
+    frame_ = PopupFrame{};
+    if (square) {
+        frame_.lines = {
+            {w - 1, h - 1, w - 1, 0, kButtonFaceColour},
+            {w - 1, h - 1, 0, h - 1, kButtonFaceColour},
+            {w - 1, 0, 0, 0, kButtonFaceColour},
+            {0, h - 1, 0, 0, kButtonFaceColour},
+            {w - 2, h - 2, w - 2, 1, backColour},
+            {w - 2, h - 2, 1, h - 2, backColour},
+            {w - 2, 1, 1, 1, backColour},
+            {1, h - 2, 1, 1, backColour},
+        };
+    } else {
+        frame_.shapes = {
+            {0, 0, w - 1, h - 1, 20, 20, kButtonFaceColour},
+            {1, 1, w - 2, h - 2, 18, 18, backColour},
+        };
+        frame_.windowShape = RoundedRect{0, 0, w, h, 19, 19};
+    }
+}
+
+void AlertPopupModel::Unload() {
+    finished_ = true;
+    slots_.Release(slot_);
+}
+
+}  // namespace kickvane::text

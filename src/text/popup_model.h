@@ -1,0 +1,204 @@
+#pragma once
+
+#include <chrono>
+#include <cstdint>
+#include <functional>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace kickvane::text {
+
+// The alert popup as a model without a window or a timer: a window shows what the model says and
+// calls Tick() every kPopupTickInterval. Positions and sizes of the window are in twips (1/1440
+// inch); everything drawn inside it is in pixels.
+
+// The popup was timed on a timer that fired at the system timer's granularity; keeping that
+// interval keeps the length of a popup's life (DisplaySeconds × kPopupTicksPerSecond ticks).
+inline constexpr std::chrono::microseconds kPopupTickInterval{15625};
+inline constexpr int kPopupTicksPerSecond = 80;
+
+// Colours are 0x00BBGGRR; 0x80000000 + n is the system colour n.
+using Colour = std::uint32_t;
+inline constexpr Colour kButtonFaceColour = 0x8000000F;
+inline constexpr Colour kPopupBackgroundColour = 0x0000C000;  // RGB(0, 192, 0)
+inline constexpr Colour kPopupTextColour = 0x00FFFFFF;
+inline constexpr std::string_view kPopupCaption = "Alert";
+inline constexpr std::string_view kPopupFontFamily = "Tahoma";
+inline constexpr double kPopupFontPointSize = 9.75;
+inline constexpr int kPopupInitialWidthTwips = 2400;
+inline constexpr int kPopupInitialHeightTwips = 2000;
+// The first line of a popup that waits for a click.
+inline constexpr std::string_view kClickToCloseLine = "(click here to close)";
+
+// The eight places in which popups stack upwards from the bottom of the work area. Slots 1 to 7
+// belong to one popup each; when they are all taken, further popups share slot 8.
+class PopupSlots {
+public:
+    static constexpr int kSlotCount = 8;
+
+    // The slots that all popups of the process share.
+    static PopupSlots& Shared();
+
+    // Takes the lowest free slot from 1 to 7, or slot 8 when those are all taken.
+    int Take();
+    // Toggles the slot's bit: clears it for slots 1 to 7. Slot 8 is never looked at when taking.
+    void Release(int slot);
+    // Bit k - 1 is set while slot k is taken.
+    std::uint8_t Mask() const { return mask_; }
+
+private:
+    std::uint8_t mask_ = 0;
+};
+
+struct ScreenMetrics {
+    int workAreaRightPx = 0;   // right edge of the desktop work area (exclusive), in pixels
+    int workAreaBottomPx = 0;  // bottom edge of the desktop work area (exclusive), in pixels
+    int screenHeightPx = 0;    // height of the whole screen, in pixels
+    double twipsPerPixelX = 15.0;
+    double twipsPerPixelY = 15.0;
+};
+
+// The height in pixels that the label needs to show `text` (UTF-8) wrapped to `widthPx`.
+using LabelHeightFn = std::function<int(int widthPx, std::string_view text)>;
+
+struct PopupEnvironment {
+    ScreenMetrics screen;
+    // The window system can make a window translucent; without it fade mode keeps its timing but
+    // the window stays opaque.
+    bool translucencySupported = false;
+    // Without it the label fills the popup below its top and auto-fit leaves the height alone.
+    LabelHeightFn labelHeight;
+    // Null: PopupSlots::Shared().
+    PopupSlots* slots = nullptr;
+};
+
+struct PixelRect {
+    int left = 0;
+    int top = 0;
+    int width = 0;
+    int height = 0;
+    friend bool operator==(const PixelRect&, const PixelRect&) = default;
+};
+
+struct FrameLine {
+    int x1 = 0;
+    int y1 = 0;
+    int x2 = 0;
+    int y2 = 0;
+    Colour colour = 0;
+    friend bool operator==(const FrameLine&, const FrameLine&) = default;
+};
+
+// A rectangle with rounded corners from (left, top) to (right, bottom), corner ellipse of
+// ellipseWidth × ellipseHeight.
+struct RoundedRect {
+    int left = 0;
+    int top = 0;
+    int right = 0;
+    int bottom = 0;
+    int ellipseWidth = 0;
+    int ellipseHeight = 0;
+    Colour colour = 0;
+    friend bool operator==(const RoundedRect&, const RoundedRect&) = default;
+};
+
+// What the popup draws in its client area (pixels), in drawing order, and the window's shape.
+struct PopupFrame {
+    std::vector<FrameLine> lines;            // square frame
+    std::vector<RoundedRect> shapes;         // rounded frame
+    std::optional<RoundedRect> windowShape;  // rounded frame: the window is cut to this (no colour)
+};
+
+enum class PopupPhase {
+    kHidden,    // DisplayMessage not called yet
+    kArriving,  // rising (slide) or fading in (fade)
+    kResting,   // at its place, counting down unless sticky
+    kLeaving,   // sliding down or fading out
+    kFinished,  // unloaded: the window closes; the slot is free again
+};
+
+class AlertPopupModel {
+public:
+    explicit AlertPopupModel(PopupEnvironment environment);
+    ~AlertPopupModel();  // releases the slot if the popup has not finished
+    AlertPopupModel(const AlertPopupModel&) = delete;
+    AlertPopupModel& operator=(const AlertPopupModel&) = delete;
+
+    // Shows `message` (UTF-8). displaySeconds >= 1: stays that many × 80 ticks after arriving;
+    // 0: stays until clicked; negative: stays until CloseActivate. `fade` fades in place instead
+    // of sliding; `autoFit` fits the height to the text in slot 1; `square` draws a two-line
+    // rectangular frame instead of rounded corners; `backColour` is the inner line or shape.
+    void DisplayMessage(std::string_view message, int displaySeconds, bool fade, bool autoFit,
+                        bool square, Colour backColour);
+
+    // One step of the motion; call every kPopupTickInterval while the popup is shown.
+    void Tick();
+    // A click on the window or its text: the popup leaves unless it ignores clicks.
+    void Click();
+    // Setting true sends any popup away at the next tick; reading always gives false.
+    void SetCloseActivate(bool value);
+    bool CloseActivate() const { return false; }
+
+    PopupPhase Phase() const;
+    bool Shown() const { return shown_; }
+    bool Finished() const { return finished_; }
+    int Slot() const { return slot_; }  // 0 until shown
+
+    int LeftTwips() const { return leftTwips_; }
+    int TopTwips() const { return topTwips_; }
+    int WidthTwips() const { return widthTwips_; }
+    int HeightTwips() const { return heightTwips_; }
+    PixelRect WindowPixels() const;
+    // The label, in the window's client pixels.
+    PixelRect LabelPixels() const { return label_; }
+    const std::string& Text() const { return text_; }
+    const PopupFrame& Frame() const { return frame_; }
+    bool Topmost() const { return topmost_; }
+    // The window's opacity, 0 to 255; nullopt while it has never been made translucent.
+    std::optional<std::uint8_t> Alpha() const { return alpha_; }
+
+private:
+    void Initialise();
+    int RestingTop() const;
+    int ClientWidthPx() const;
+    int ClientHeightPx() const;
+    void SetTransparency(int percent);
+    void DrawFrame(bool square, Colour backColour);
+    void SlideTick();
+    void FadeTick();
+    void Unload();
+
+    PopupEnvironment env_;
+    PopupSlots& slots_;
+
+    int leftTwips_ = 0;
+    int topTwips_ = 0;
+    int widthTwips_ = kPopupInitialWidthTwips;
+    int heightTwips_ = kPopupInitialHeightTwips;
+    int workBottomTwips_ = 0;
+    int screenHeightTwips_ = 0;
+
+    int stepValue_ = 0;
+    int ticksLeft_ = 0;
+    int slot_ = 0;
+    bool initialised_ = false;
+    bool shown_ = false;
+    bool finished_ = false;
+    bool arrived_ = false;
+    bool sticky_ = false;
+    bool noClickClose_ = false;
+    bool fadeMode_ = false;
+    bool topmost_ = false;
+    std::optional<std::uint8_t> alpha_;
+
+    std::string text_;
+    PixelRect label_;
+    PopupFrame frame_;
+};
+
+// Rounds to the nearest whole number, halves to the even neighbour.
+long long RoundHalfEven(double value);
+
+}  // namespace kickvane::text
