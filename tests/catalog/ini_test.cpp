@@ -80,8 +80,10 @@ using WriteIniTest = IniTest;
 using IniDocumentTest = IniTest;
 
 TEST_F(ReadIniTest, MatchesNamesIgnoringCaseAndBlanks) {
-    WriteBytes(file_,
-               "[ Thiet Lap ]\r\n  duongdan =  D:\\Games\\FO2 \t\r\n[Bang Ti So]\r\nk+ns=True\r\n");
+    // A byte-order mark, then lines ending in LF and in CR LF.
+    WriteBytes(
+        file_,
+        "\xEF\xBB\xBF[ Thiet Lap ]\n  duongdan =  D:\\Games\\FO2 \t\r\n[Bang Ti So]\nk+ns=True");
 
     EXPECT_EQ(ReadIni(file_, "Thiet lap", "DuongDan", "x"), "D:\\Games\\FO2");
     EXPECT_EQ(ReadIni(file_, "THIET LAP", " duongDAN ", "x"), "D:\\Games\\FO2");
@@ -124,13 +126,6 @@ TEST_F(ReadIniTest, ToleratesStrayLines_AndReturnsFirstMatchingKey) {
     EXPECT_EQ(ReadIni(file_, "S", "no equals sign", "d"), "d");
 }
 
-TEST_F(ReadIniTest, IgnoresByteOrderMark_AndAcceptsLfAndCrLf) {
-    WriteBytes(file_, "\xEF\xBB\xBF[Thiet lap]\nDuongDan=D:\\A\r\nPhimTat=F9\n");
-
-    EXPECT_EQ(ReadIni(file_, "Thiet lap", "DuongDan", ""), "D:\\A");
-    EXPECT_EQ(ReadIni(file_, "Thiet lap", "PhimTat", ""), "F9");
-}
-
 TEST_F(ReadIniTest, ReturnsLongValuesWhole) {
     const std::string path = "D:\\" + std::string(300, 'p') + "\\FIFA Online 2";
     ASSERT_TRUE(WriteIni(file_, "Thiet lap", "DuongDan", path).ok());
@@ -151,23 +146,6 @@ TEST_F(ReadIniTest, DecodesLinesThatAreNotUtf8AsWindows1252) {
     EXPECT_EQ(ReadIni(file_, "Caf\xC3\xA9", "Mixed", ""), "\xC3\x83\xC2\xA9\xC3\xA9");
 }
 
-TEST_F(ReadIniTest, FindsFileUnderAnotherLetterCase) {
-    WriteBytes(file_, "[KiemTra]\r\nPhienBan=v2.0\r\n");
-
-    EXPECT_EQ(ReadIni(folder_.path() / "Thietlap.ini", "KiemTra", "PhienBan", ""), "v2.0");
-    EXPECT_EQ(ReadIni(folder_.path() / "THIETLAP.INI", "KiemTra", "PhienBan", ""), "v2.0");
-}
-
-TEST_F(WriteIniTest, CreatesFile_AppendsKeysAndSections_WithCrLf) {
-    ASSERT_TRUE(WriteIni(file_, "Thiet lap", "DuongDan", "C:\\Program Files").ok());
-    ASSERT_TRUE(WriteIni(file_, "Thiet lap", "PhimTat", "F7").ok());
-    ASSERT_TRUE(WriteIni(file_, "KiemTra", "PhienBan", "v2.1").ok());
-
-    EXPECT_EQ(ReadBytes(file_),
-              "[Thiet lap]\r\nDuongDan=C:\\Program Files\r\nPhimTat=F7\r\n"
-              "[KiemTra]\r\nPhienBan=v2.1\r\n");
-}
-
 TEST_F(WriteIniTest, ReplacesValueInPlace_AndKeepsRestOfFile) {
     WriteBytes(file_,
                "; settings\r\n[Thiet lap]\r\n  duongdan = old \r\nPhimTat=F7\r\n\r\n"
@@ -184,29 +162,22 @@ TEST_F(WriteIniTest, ReplacesValueInPlace_AndKeepsRestOfFile) {
               "[Bong]\r\nMacDinh=False\r\n");
 }
 
-TEST_F(WriteIniTest, KeepsByteOrderMark_AndRewritesLfAsCrLf) {
-    WriteBytes(file_, "\xEF\xBB\xBF[S]\nA=1\nB=2\n");
+TEST_F(WriteIniTest, KeepsByteOrderMark_AndRewritesOldLinesAsUtf8WithCrLf) {
+    WriteBytes(file_, "\xEF\xBB\xBF[S]\nPath=C:\\Caf\xE9\nB=2\n");
 
-    ASSERT_TRUE(WriteIni(file_, "S", "A", "3").ok());
+    ASSERT_TRUE(WriteIni(file_, "S", "B", "3").ok());
 
-    EXPECT_EQ(ReadBytes(file_), "\xEF\xBB\xBF[S]\r\nA=3\r\nB=2\r\n");
+    EXPECT_EQ(ReadBytes(file_), "\xEF\xBB\xBF[S]\r\nPath=C:\\Caf\xC3\xA9\r\nB=3\r\n");
 }
 
-TEST_F(WriteIniTest, StoresWindows1252LinesAsUtf8) {
-    WriteBytes(file_, "[S]\r\nPath=C:\\Caf\xE9\r\n");
+TEST_F(WriteIniTest, UsesExistingFileWhateverTheLetterCaseOfItsName) {
+    WriteBytes(file_, "[Thiet lap]\r\nPhimTat=F9\r\n");
 
-    ASSERT_TRUE(WriteIni(file_, "S", "Other", "x").ok());
-
-    EXPECT_EQ(ReadBytes(file_), "[S]\r\nPath=C:\\Caf\xC3\xA9\r\nOther=x\r\n");
-}
-
-TEST_F(WriteIniTest, WritesToExistingFileUnderItsOwnName) {
-    WriteBytes(file_, "[Thiet lap]\r\nPhimTat=F7\r\n");
-
+    EXPECT_EQ(ReadIni(folder_.path() / "THIETLAP.INI", "Thiet lap", "PhimTat", ""), "F9");
     ASSERT_TRUE(WriteIni(folder_.path() / "Thietlap.ini", "KiemTra", "PhienBan", "v2.1").ok());
 
     EXPECT_EQ(FileNames(folder_.path()), std::vector<std::string>{"ThietLap.ini"});
-    EXPECT_EQ(ReadBytes(file_), "[Thiet lap]\r\nPhimTat=F7\r\n[KiemTra]\r\nPhienBan=v2.1\r\n");
+    EXPECT_EQ(ReadBytes(file_), "[Thiet lap]\r\nPhimTat=F9\r\n[KiemTra]\r\nPhienBan=v2.1\r\n");
 }
 
 TEST_F(WriteIniTest, StripsLineBreaks_SoNoOtherEntryIsDisturbed) {
@@ -276,20 +247,17 @@ TEST_F(WriteIniTest, Fails_AndKeepsFile_WhenExistingFileCannotBeRead) {
     EXPECT_EQ(ReadBytes(file_), before);
 }
 
-TEST_F(IniDocumentTest, SavesManyValuesInOneWrite) {
+TEST_F(IniDocumentTest, SaveReplacesWholeFile) {
     WriteBytes(file_, "[KiemTra]\r\nPhienBan=v2.1\r\n");
     IniDocument document;
-    ASSERT_TRUE(document.Set("Thiet lap", "DuongDan", "C:\\Program Files").ok());
     ASSERT_TRUE(document.Set("Bong", "Europa League 2011", "True").ok());
     ASSERT_TRUE(document.Set("Bang Ti So", "K+NS", "False").ok());
 
     ASSERT_TRUE(document.Save(folder_.path() / "thietlap.ini").ok());
 
     EXPECT_EQ(FileNames(folder_.path()), std::vector<std::string>{"ThietLap.ini"});
-    const IniDocument loaded = IniDocument::Load(file_);
-    EXPECT_EQ(loaded.Get("bong", "europa league 2011"), "True");
-    EXPECT_EQ(loaded.Get("Bang Ti So", "K+NS"), "False");
-    EXPECT_EQ(loaded.Get("KiemTra", "PhienBan"), std::nullopt);
+    EXPECT_EQ(ReadBytes(file_),
+              "[Bong]\r\nEuropa League 2011=True\r\n[Bang Ti So]\r\nK+NS=False\r\n");
 }
 
 TEST(IniDocumentGarbageTest, ParsesAnyBytes_AndReadsBackWhatWasSet) {
@@ -306,7 +274,6 @@ TEST(IniDocumentGarbageTest, ParsesAnyBytes_AndReadsBackWhatWasSet) {
         SCOPED_TRACE(::testing::PrintToString(bytes));
 
         IniDocument document = IniDocument::Parse(bytes);
-        (void)document.Get("a", "a");
         ASSERT_TRUE(document.Set("a", "a", "value").ok());
         EXPECT_EQ(document.Get("A", "A"), "value");
 
