@@ -1,0 +1,110 @@
+#include "engine/quick_load.h"
+
+#include <gtest/gtest.h>
+
+#include "fake_ui.h"
+#include "support/temp_dir.h"
+
+namespace kickvane::engine {
+namespace {
+
+namespace fs = std::filesystem;
+using testing::FakeUi;
+using testing::ReadText;
+using testing::TempDir;
+using testing::WriteFile;
+
+class QuickLoadTest : public ::testing::Test {
+protected:
+    void SetUp() override {
+        for (const char* folder :
+             {"data/data2/players/heads/textures", "data/data2/players/bodies/textures",
+              "data/zdata/data2/ball/textures"}) {
+            fs::create_directories(tool() / folder);
+        }
+    }
+
+    fs::path tool() const { return dir_ / "tool"; }
+    fs::path source() const { return dir_ / "source"; }
+    fs::path heads() const { return tool() / "data/data2/players/heads"; }
+
+    QuickLoadOutcome Load() { return QuickLoad(tool(), source(), ui_); }
+
+    TempDir dir_;
+    FakeUi ui_;
+};
+
+TEST_F(QuickLoadTest, FlatFolderGoesToTheMatchingBaseSetFolders) {
+    WriteFile(source() / "face1.dds", "face");
+    WriteFile(source() / "CM_2.DDS", "cm");
+    WriteFile(source() / "ball10.dds", "ball");
+    WriteFile(source() / "notes.txt", "not a pattern");
+    const QuickLoadOutcome outcome = Load();
+
+    EXPECT_TRUE(outcome.ok());
+    EXPECT_EQ(ReadText(heads() / "textures/face1.dds"), "face");
+    EXPECT_EQ(ReadText(heads() / "textures/CM_2.DDS"), "cm");
+    EXPECT_EQ(ReadText(tool() / "data/zdata/data2/ball/textures/ball10.dds"), "ball");
+    EXPECT_EQ(ui_.popups, std::vector<std::string>{"Hoàn tất!"});
+    EXPECT_TRUE(ui_.messages.shown.empty());
+}
+
+TEST_F(QuickLoadTest, NestedFormsAreUsedOnlyWhenNoDirectFileMatches) {
+    WriteFile(source() / "readme.txt", "a plain file at the top");
+    WriteFile(source() / "cm_1.dds", "top cm");
+    WriteFile(source() / "Heads/Textures/cm_9.dds", "nested cm");
+    WriteFile(source() / "Heads/Textures/face7.dds", "nested face");
+    WriteFile(source() / "Heads/Textures/.face8.dds", "hidden");
+    WriteFile(source() / "bodies/textures/skin3.dds", "nested skin");
+    WriteFile(source() / "Textures/Ball10.dds", "nested ball");
+    const QuickLoadOutcome outcome = Load();
+
+    EXPECT_TRUE(outcome.ok());
+    EXPECT_TRUE(fs::exists(heads() / "textures/cm_1.dds"));
+    EXPECT_FALSE(fs::exists(heads() / "textures/cm_9.dds"));
+    EXPECT_EQ(ReadText(heads() / "textures/face7.dds"), "nested face");
+    EXPECT_FALSE(fs::exists(heads() / "textures/.face8.dds"));
+    EXPECT_EQ(ReadText(tool() / "data/data2/players/bodies/textures/skin3.dds"), "nested skin");
+    EXPECT_EQ(ReadText(tool() / "data/zdata/data2/ball/textures/Ball10.dds"), "nested ball");
+}
+
+TEST_F(QuickLoadTest, NoFolderOrNoPlainFileStopsWithTheMessage) {
+    EXPECT_TRUE(QuickLoad(tool(), fs::path(), ui_).stopped);
+    WriteFile(source() / "heads/textures/face1.dds", "nested only");
+    WriteFile(source() / ".hidden", "x");
+    const QuickLoadOutcome outcome = Load();
+
+    EXPECT_TRUE(outcome.stopped);
+    EXPECT_EQ(ui_.messages.shown, std::vector<std::string>(2, "Bạn chưa chọn thư mục nào!"));
+    EXPECT_TRUE(ui_.popups.empty());
+    EXPECT_FALSE(fs::exists(heads() / "textures/face1.dds"));
+}
+
+TEST_F(QuickLoadTest, FailedPatternIsNamedAndTheOthersGoOn) {
+    fs::remove_all(tool() / "data/data2/players/bodies");
+    WriteFile(source() / "skin1.dds", "skin");
+    WriteFile(source() / "face1.dds", "face");
+    WriteFile(source() / "hhead1.pc.ea3.em", "head model");
+    const QuickLoadOutcome outcome = Load();
+
+    ASSERT_EQ(outcome.failures.size(), 1u);
+    EXPECT_NE(outcome.failures[0].find("skin*.dds"), std::string::npos);
+    EXPECT_TRUE(fs::exists(heads() / "textures/face1.dds"));
+    EXPECT_TRUE(fs::exists(heads() / "hhead1.pc.ea3.em"));
+    EXPECT_EQ(ui_.popups.size(), 1u);
+}
+
+TEST(MatchesWildcard, FollowsWindowsRulesWithoutCase) {
+    EXPECT_TRUE(MatchesWildcard("cm_123.dds", "cm_*.dds"));
+    EXPECT_TRUE(MatchesWildcard("CM_.DDS", "cm_*.dds"));
+    EXPECT_TRUE(MatchesWildcard("hhead5.pc.ea3.em", "hhead*.pc.ea3.em"));
+    EXPECT_TRUE(MatchesWildcard("face.x.dds", "face*.dds"));
+    EXPECT_FALSE(MatchesWildcard("face1.dds.bak", "face*.dds"));
+    EXPECT_FALSE(MatchesWildcard("xcm_1.dds", "cm_*.dds"));
+    EXPECT_TRUE(MatchesWildcard("ball10.dds", "ball10.dds"));
+    EXPECT_FALSE(MatchesWildcard("ball10.ddsx", "ball10.dds"));
+    EXPECT_TRUE(MatchesWildcard("a1", "a?"));
+}
+
+}  // namespace
+}  // namespace kickvane::engine

@@ -1,0 +1,60 @@
+#pragma once
+
+#include <string>
+
+#include "support/temp_dir.h"
+
+namespace kickvane::testing {
+
+// A tool folder with one small file in every folder that the plan copies from.
+inline void MakeToolFolder(const fs::path& tool) {
+    const fs::path base = tool / "data/data2";
+    for (const char* folder : {"ball",
+                               "adboard",
+                               "ingame_ad",
+                               "gui/hud/chatting",
+                               "gui/hud/DistanceToNet",
+                               "gui/hud/PK",
+                               "gui/hud/radar",
+                               "gui/hud/RefAdvantage",
+                               "gui/hud/watermark",
+                               "gui/loading",
+                               "gui/hud/scoreboard",
+                               "gui/hud/namebar",
+                               "gui/hud/Indicator",
+                               "teams/emblems",
+                               "cmn",
+                               "players/bodies/textures",
+                               "players/heads/textures",
+                               "players/accessories",
+                               "players/kit",
+                               "net/textures"}) {
+        WriteFile(base / folder / "base.dds", std::string("base ") + folder);
+    }
+    WriteFile(base / "pitch/textures/grass_dirt.dds", "base dirt");
+    WriteFile(base / "pitch/textures/grass_pitchlines.dds", "base lines");
+    const fs::path zbase = tool / "data/zdata/data2";
+    for (const char* folder : {"ball/textures", "pitch", "crowd/textures", "stadiums"}) {
+        WriteFile(zbase / folder / "zbase.dds", std::string("zbase ") + folder);
+    }
+    const fs::path extras = tool / "extras";
+    WriteFile(extras / "Ball/UCL 2011/ball10.dds", "ucl ball");
+    WriteFile(extras / "Ball/Europa League 2011/ball10.dds", "europa ball");
+    WriteFile(extras / "pitch/Caro/grass.dds", "caro grass");
+    WriteFile(extras / "pitch/Caro/grass_dirt.dds", "caro dirt");
+    WriteFile(extras / "pitch/_textures/shadow.dds", "shared shadow");
+    WriteFile(extras / "adboard/WC 2010/board.dds", "wc board");
+    WriteFile(tool / "sound.wav", "RIFF");
+}
+
+// A game folder with its two data trees and the top folders a real install has.
+inline void MakeGameFolder(const fs::path& game, bool withZData = true) {
+    for (const char* folder : {"data2/gui/hud", "data2/players", "data2/pitch/textures"}) {
+        fs::create_directories(game / folder);
+    }
+    if (withZData) {
+        fs::create_directories(game / "zdata/data2");
+    }
+}
+
+}  // namespace kickvane::testing

@@ -1,0 +1,159 @@
+#include "platform/filesystem.h"
+
+#include <gtest/gtest.h>
+#include <stdlib.h>
+
+#include <fstream>
+
+#include "support/temp_dir.h"
+
+namespace kickvane::platform {
+namespace {
+
+using testing::ReadText;
+using testing::TempDir;
+using testing::WriteFile;
+
+size_t EntryCount(const fs::path& folder) {
+    return static_cast<size_t>(
+        std::distance(fs::directory_iterator(folder), fs::directory_iterator()));
+}
+
+TEST(ResolveCaseInsensitive, MatchesEveryComponentAndKeepsSpellingOfMissingTail) {
+    TempDir dir;
+    fs::create_directories(dir / "Data2/Ball/Textures");
+    WriteFile(dir / "Data2/Ball/Textures/Ball10.DDS", "x");
+
+    EXPECT_EQ(ResolveCaseInsensitive(dir / "data2/ball/textures/ball10.dds"),
+              dir / "Data2/Ball/Textures/Ball10.DDS");
+    // Below the first missing component the given spelling stays, so new folders get it.
+    EXPECT_EQ(ResolveCaseInsensitive(dir / "data2/BALL/new/Deep"), dir / "Data2/Ball/new/Deep");
+    // Doubled and trailing separators, as "D:\" + "\data2" gives, name the same folder.
+    EXPECT_EQ(ResolveCaseInsensitive(fs::path(dir.path().string() + "//DATA2//ball/")),
+              dir / "Data2/Ball");
+}
+
+TEST(ResolveCaseInsensitive, PrefersExactSpellingWhenSeveralCasesExist) {
+    TempDir dir;
+    fs::create_directories(dir / "ball");
+    fs::create_directories(dir / "Ball");
+    EXPECT_EQ(ResolveCaseInsensitive(dir / "Ball"), dir / "Ball");
+    EXPECT_EQ(ResolveCaseInsensitive(dir / "ball"), dir / "ball");
+    EXPECT_EQ(ResolveCaseInsensitive(dir / "BALL"), dir / "Ball");  // first in name order
+}
+
+TEST(ReplaceFile, ReplacesContentTakesSourceTimeAndLeavesNoTemporaryFile) {
+    TempDir dir;
+    WriteFile(dir / "src/a.dds", "new content");
+    WriteFile(dir / "dst/a.dds", "old");
+    const auto sourceTime = fs::last_write_time(dir / "src/a.dds") - std::chrono::hours(30);
+    fs::last_write_time(dir / "src/a.dds", sourceTime);
+
+    EXPECT_FALSE(IsUpToDateCopy(dir / "src/a.dds", dir / "dst/a.dds"));
+    ASSERT_TRUE(ReplaceFile(dir / "src/a.dds", dir / "dst/a.dds").ok());
+    EXPECT_EQ(ReadText(dir / "dst/a.dds"), "new content");
+    EXPECT_EQ(fs::last_write_time(dir / "dst/a.dds"), sourceTime);
+    EXPECT_TRUE(IsUpToDateCopy(dir / "src/a.dds", dir / "dst/a.dds"));
+    EXPECT_EQ(EntryCount(dir / "dst"), 1u);
+}
+
+TEST(ReplaceFile, ReaderOfTheOldFileKeepsReadingTheWholeOldFile) {
+    TempDir dir;
+    WriteFile(dir / "src/tex.dds", std::string(100000, 'N'));
+    WriteFile(dir / "dst/tex.dds", std::string(50000, 'O'));
+    std::ifstream game(dir / "dst/tex.dds", std::ios::binary);  // the running game holds it
+
+    ASSERT_TRUE(ReplaceFile(dir / "src/tex.dds", dir / "dst/tex.dds").ok());
+    std::string seen((std::istreambuf_iterator<char>(game)), std::istreambuf_iterator<char>());
+    EXPECT_EQ(seen, std::string(50000, 'O'));
+    EXPECT_EQ(ReadText(dir / "dst/tex.dds"), std::string(100000, 'N'));
+}
+
+TEST(ReplaceFile, FailureLeavesTargetWholeAndNamesThePath) {
+    TempDir dir;
+    WriteFile(dir / "dst/a.dds", "old");
+
+    Status missingSource = ReplaceFile(dir / "src/none.dds", dir / "dst/a.dds");
+    EXPECT_FALSE(missingSource.ok());
+    EXPECT_NE(missingSource.reason().find("none.dds"), std::string::npos);
+
+    WriteFile(dir / "src/dir.dds/inner", "x");  // a folder is no file to copy
+    EXPECT_FALSE(ReplaceFile(dir / "src/dir.dds", dir / "dst/a.dds").ok());
+
+    WriteFile(dir / "src/a.dds", "new");
+    EXPECT_FALSE(ReplaceFile(dir / "src/a.dds", dir / "missing/a.dds").ok());
+
+    EXPECT_EQ(ReadText(dir / "dst/a.dds"), "old");
+    EXPECT_EQ(EntryCount(dir / "dst"), 1u);
+}
+
+TEST(WriteFileAtomically, ReplacesWholeFileOrLeavesItAsItWas) {
+    TempDir dir;
+    WriteFile(dir / "settings.ini", "previous");
+    ASSERT_TRUE(WriteFileAtomically(dir / "settings.ini", "next").ok());
+    EXPECT_EQ(ReadText(dir / "settings.ini"), "next");
+    EXPECT_EQ(EntryCount(dir.path()), 1u);
+
+    EXPECT_FALSE(WriteFileAtomically(dir / "no/such/folder.ini", "x").ok());
+}
+
+TEST(MakeDirectory, FailsWhenFolderExistsOrParentIsMissing) {
+    TempDir dir;
+    EXPECT_TRUE(MakeDirectory(dir / "a").ok());
+    EXPECT_FALSE(MakeDirectory(dir / "a").ok());
+    EXPECT_FALSE(MakeDirectory(dir / "b/c").ok());
+}
+
+TEST(ListPlainFiles, SkipsFoldersAndHiddenFiles) {
+    TempDir dir;
+    WriteFile(dir / "b.dds", "x");
+    WriteFile(dir / "a.dds", "x");
+    WriteFile(dir / ".hidden.dds", "x");
+    WriteFile(dir / "heads/textures/face1.dds", "x");
+    const std::vector<fs::path> files = ListPlainFiles(dir.path());
+    ASSERT_EQ(files.size(), 2u);
+    EXPECT_EQ(files[0].filename(), "a.dds");
+    EXPECT_EQ(files[1].filename(), "b.dds");
+    EXPECT_TRUE(ListPlainFiles(dir / "missing").empty());
+}
+
+class WinePrefixTest : public ::testing::Test {
+protected:
+    void SetUp() override {
+        const char* old = getenv("WINEPREFIX");
+        saved_ = old ? std::optional<std::string>(old) : std::nullopt;
+        setenv("WINEPREFIX", prefix_.path().c_str(), 1);
+    }
+    void TearDown() override {
+        if (saved_) {
+            setenv("WINEPREFIX", saved_->c_str(), 1);
+        } else {
+            unsetenv("WINEPREFIX");
+        }
+    }
+
+    TempDir prefix_;
+    std::optional<std::string> saved_;
+};
+
+TEST_F(WinePrefixTest, WindowsPathGoesThroughTheDriveMapping) {
+    fs::create_directories(prefix_ / "drive_c/Games");
+    fs::create_directories(prefix_ / "dosdevices");
+    fs::create_directory_symlink("../drive_c", prefix_ / "dosdevices/c:");
+    fs::create_directories(prefix_ / "other");
+    fs::create_directory_symlink(prefix_ / "other", prefix_ / "dosdevices/d:");
+
+    EXPECT_EQ(NativePathFromUserText("C:\\Games\\FIFA Online 2\\data2"),
+              prefix_ / "dosdevices/c:/Games/FIFA Online 2/data2");
+    EXPECT_TRUE(IsDirectory(NativePathFromUserText("c:\\GAMES").parent_path()));
+    EXPECT_EQ(NativePathFromUserText("D:\\\\data2"), prefix_ / "dosdevices/d:/data2");
+    EXPECT_EQ(NativePathFromUserText("/home/u/game\\data2"), fs::path("/home/u/game/data2"));
+}
+
+TEST_F(WinePrefixTest, DriveCFallsBackToDriveFolderWithoutDosdevices) {
+    EXPECT_EQ(NativePathFromUserText("C:\\Program Files\\data2"),
+              prefix_ / "drive_c/Program Files/data2");
+}
+
+}  // namespace
+}  // namespace kickvane::platform
