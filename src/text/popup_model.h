@@ -33,7 +33,8 @@ inline constexpr int kPopupInitialHeightTwips = 2000;
 inline constexpr std::string_view kClickToCloseLine = "(click here to close)";
 
 // The eight places in which popups stack upwards from the bottom of the work area. Slots 1 to 7
-// belong to one popup each; when they are all taken, further popups share slot 8.
+// belong to one popup each; when they are all taken, further popups share slot 8. Used on the
+// user-interface thread only.
 class PopupSlots {
 public:
     static constexpr int kSlotCount = 8;
@@ -45,7 +46,7 @@ public:
     int Take();
     // Toggles the slot's bit: clears it for slots 1 to 7. Slot 8 is never looked at when taking.
     void Release(int slot);
-    // Bit k - 1 is set while slot k is taken.
+    // Bit k - 1 is set while slot k (1 to 7) is taken.
     std::uint8_t Mask() const { return mask_; }
 
 private:
