@@ -3,7 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "fake_ui.h"
-#include "trees.h"
+#include "support/trees.h"
 
 namespace kickvane::engine {
 namespace {

@@ -1,0 +1,136 @@
+// The kickvane program's subcommands, run as a user runs them, on temporary folders.
+#include <gtest/gtest.h>
+#include <sys/wait.h>
+
+#include <cstdlib>
+
+#include "support/temp_dir.h"
+#include "support/trees.h"
+
+namespace kickvane::testing {
+namespace {
+
+struct Result {
+    int exitCode;
+    std::string out;
+    std::string err;
+};
+
+class CliTest : public ::testing::Test {
+protected:
+    // Runs the program with `args` (already quoted for the shell) and `input` on standard input.
+    Result Kickvane(const std::string& args, const std::string& input = "") {
+        WriteFile(dir_ / "stdin", input);
+        const std::string command =
+            std::string("'") + KICKVANE_BINARY + "' " + args + " < '" + (dir_ / "stdin").string() +
+            "' > '" + (dir_ / "stdout").string() + "' 2> '" + (dir_ / "stderr").string() + "'";
+        const int status = std::system(command.c_str());
+        return {WIFEXITED(status) ? WEXITSTATUS(status) : -1, ReadText(dir_ / "stdout"),
+                ReadText(dir_ / "stderr")};
+    }
+
+    static std::string Quote(const fs::path& path) { return "'" + path.string() + "'"; }
+
+    fs::path tool() const { return dir_ / "tool"; }
+    fs::path game() const { return dir_ / "game"; }
+    std::string Folders() const {
+        return "--tool-folder " + Quote(tool()) + " --game " + Quote(game());
+    }
+
+    TempDir dir_;
+};
+
+TEST_F(CliTest, ApplyCopiesTheChosenSetsAndPrintsEachStep) {
+    MakeToolFolder(tool());
+    MakeGameFolder(game());
+    const Result run = Kickvane("apply " + Folders());
+    EXPECT_EQ(run.exitCode, 0) << run.err;
+    EXPECT_NE(run.out.find("done     Bong: merge ExtrasFolder\\Ball\\Europa League 2011"),
+              std::string::npos);
+    EXPECT_NE(run.out.find("skipped  Gdien: merge ToolDataRoot\\gui\\font"), std::string::npos);
+    EXPECT_EQ(ReadText(game() / "zdata/data2/ball/ball10.dds"), "europa ball");
+}
+
+TEST_F(CliTest, ApplyTakesTheGameFolderFromTheSettingsAndExitsOneOnFailedSteps) {
+    MakeToolFolder(tool());
+    MakeGameFolder(game(), /*withZData=*/false);
+    WriteFile(tool() / "thietlap.ini",
+              "[Thiet lap]\r\nDuongDan=" + game().string() + "\r\n[Thay doi]\r\nCDV=1\r\n");
+    const Result run = Kickvane("apply --tool-folder " + Quote(tool()));
+    EXPECT_EQ(run.exitCode, 1);
+    EXPECT_NE(run.err.find("failed: CDV: merge ToolZDataRoot\\crowd\\textures"), std::string::npos);
+    EXPECT_TRUE(fs::exists(game() / "data2/cmn/base.dds"));
+}
+
+TEST_F(CliTest, ApplyStopsWithExitTwoWhenAFolderCheckFails) {
+    MakeToolFolder(tool());
+    fs::create_directories(game());
+    const Result run = Kickvane("apply " + Folders());
+    EXPECT_EQ(run.exitCode, 2);
+    EXPECT_NE(run.err.find("Không tìm thấy thư mục chứa FIFA Online 2"), std::string::npos);
+    EXPECT_TRUE(fs::is_empty(game()));
+
+    fs::remove_all(tool() / "data");
+    const Result noBase = Kickvane("apply " + Folders());
+    EXPECT_EQ(noBase.exitCode, 2);
+    EXPECT_NE(noBase.err.find("Thu muc nguon: Khong tim thay: "), std::string::npos);
+}
+
+TEST_F(CliTest, PlanListsTheStepsAndCopiesNothing) {
+    MakeToolFolder(tool());
+    MakeGameFolder(game());
+    const Result run = Kickvane("plan " + Folders());
+    EXPECT_EQ(run.exitCode, 0);
+    EXPECT_NE(run.out.find(
+                  "Mark: merge ToolDataRoot\\gui\\hud\\Indicator -> DataRoot\\gui\\hud\\Indicator"),
+              std::string::npos);
+    EXPECT_FALSE(fs::exists(game() / "data2/cmn"));
+}
+
+TEST_F(CliTest, QuickLoadExitCodes) {
+    fs::create_directories(tool() / "data/data2/players/heads/textures");
+    WriteFile(dir_ / "faces/face1.dds", "face");
+    WriteFile(dir_ / "faces/skin1.dds", "skin");  // no bodies folder in the base set
+    const Result partly =
+        Kickvane("quick-load " + Quote(dir_ / "faces") + " --tool-folder " + Quote(tool()));
+    EXPECT_EQ(partly.exitCode, 1);
+    EXPECT_EQ(partly.out, "Hoàn tất!\n");
+    EXPECT_TRUE(fs::exists(tool() / "data/data2/players/heads/textures/face1.dds"));
+
+    fs::remove(dir_ / "faces/skin1.dds");
+    EXPECT_EQ(Kickvane("quick-load " + Quote(dir_ / "faces") + " --tool-folder " + Quote(tool()))
+                  .exitCode,
+              0);
+
+    const Result empty =
+        Kickvane("quick-load " + Quote(dir_ / "nothing") + " --tool-folder " + Quote(tool()));
+    EXPECT_EQ(empty.exitCode, 2);
+    EXPECT_EQ(empty.err, "Bạn chưa chọn thư mục nào!\n");
+}
+
+TEST_F(CliTest, VniConvertsArgumentOrStandardInput) {
+    EXPECT_EQ(Kickvane("vni 'Tho6ng ba1o'").out, "Thông báo\n");
+    EXPECT_EQ(Kickvane("vni", "U71ng du5ng\nd9u7o7ng\n").out, "Ứng dụng\nđương\n");
+}
+
+TEST_F(CliTest, IniGetAndSet) {
+    const std::string file = Quote(dir_ / "ThietLap.ini");
+    EXPECT_EQ(Kickvane("ini set " + file + " 'Thiet lap' PhimTat F9").exitCode, 0);
+    EXPECT_EQ(Kickvane("ini get " + Quote(dir_ / "THIETLAP.INI") + " 'thiet lap' phimtat").out,
+              "F9\n");
+    EXPECT_EQ(Kickvane("ini get " + file + " 'Thiet lap' DuongDan 'C:\\Program Files'").out,
+              "C:\\Program Files\n");
+    const Result failed = Kickvane("ini set " + Quote(dir_ / "missing/ThietLap.ini") + " a b c");
+    EXPECT_NE(failed.exitCode, 0);
+    EXPECT_FALSE(failed.err.empty());
+}
+
+TEST_F(CliTest, UnknownCommandOrMissingArgumentsShowUsage) {
+    EXPECT_EQ(Kickvane("frobnicate").exitCode, 2);
+    const Result usage = Kickvane("apply --game");
+    EXPECT_EQ(usage.exitCode, 2);
+    EXPECT_NE(usage.err.find("Usage: kickvane"), std::string::npos);
+}
+
+}  // namespace
+}  // namespace kickvane::testing
