@@ -1,0 +1,43 @@
+#include "skin/pointer_probe.h"
+
+#include <QCoreApplication>
+#include <QCursor>
+#include <QGuiApplication>
+#include <QWindow>
+
+namespace kickvane::skin {
+namespace {
+
+// The visible child window of `window` under the global point, searched depth first; the last
+// child is the topmost.
+QWindow* DeepestAt(QWindow* window, const QPoint& global) {
+    const QObjectList& children = window->children();
+    for (auto it = children.rbegin(); it != children.rend(); ++it) {
+        auto* child = qobject_cast<QWindow*>(*it);
+        if (child == nullptr || !child->isVisible()) {
+            continue;
+        }
+        const QRect area(child->mapToGlobal(QPoint(0, 0)), child->size());
+        if (area.contains(global)) {
+            return DeepestAt(child, global);
+        }
+    }
+    return window;
+}
+
+}  // namespace
+
+Status QtPointerProbe::WindowAtCursor(WindowHandle& window) const {
+    window = 0;
+    if (qobject_cast<QGuiApplication*>(QCoreApplication::instance()) == nullptr) {
+        return Status::Fail("reading the cursor needs a running application");
+    }
+    const QPoint global = QCursor::pos();
+    QWindow* top = QGuiApplication::topLevelAt(global);
+    if (top != nullptr) {
+        window = static_cast<WindowHandle>(DeepestAt(top, global)->winId());
+    }
+    return Status::Ok();
+}
+
+}  // namespace kickvane::skin
