@@ -18,7 +18,7 @@ namespace kickvane::skin {
 namespace {
 
 constexpr int kSheetWidth = 1180;
-constexpr int kLabelWidth = 170;
+constexpr int kLabelWidth = 200;
 constexpr int kCaptionHeight = 14;
 constexpr int kGap = 10;
 constexpr WindowHandle kHotWindow = 1;  // the window the gallery's cursor rests on

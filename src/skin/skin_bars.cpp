@@ -167,9 +167,9 @@ void Skin::ThemeStatusBar(WindowHandle handle, Surface& dc, int plDraw, const Re
     const auto divider = [&] {
         const auto column =
             MakeRect(static_cast<long long>(box.right) - 3, box.top, box.right, box.bottom);
-        if (column && height > 0) {
+        if (column && height > 0 && rect_math::FitsInt(height)) {
             (void)dc.Copy(picture, Piece{0, 44, 3, 22},
-                          Piece{column->left, column->top, 3, column->bottom - column->top});
+                          Piece{column->left, column->top, 3, static_cast<int>(height)});
         }
     };
     switch (plDraw) {

@@ -355,6 +355,48 @@ TEST(PaintersTest, ThemeMDITab_RoundsItsCoordinates_AndRejectsOnesThatAreNoPixel
     EXPECT_EQ(measure, 5);
 }
 
+TEST(PaintersTest, EveryPainter_StaysInsideThePicture_WithRectanglesAtTheCoordinateLimits) {
+    const int lo = std::numeric_limits<int>::min();
+    const int hi = std::numeric_limits<int>::max();
+    Skin& skin = TheSkin();
+    skin.SetPointerProbe(std::make_shared<FakePointer>(1));
+    for (const Rect& box : {Rect{lo, lo, hi, hi}, Rect{hi, hi, lo, lo}, Rect{hi - 1, 0, hi, 5},
+                            Rect{lo, lo, lo + 1, lo + 1}}) {
+        QImage target(16, 16, QImage::Format_RGB32);
+        target.fill(Qt::white);
+        ImageSurface dc(target);
+        int measure = 0;
+        for (int part = 0; part <= 15; ++part) {
+            for (int state = -1; state <= 5; ++state) {
+                skin.ThemeCommandBarMenu(1, dc, part, state, box);
+                skin.ThemePropertyGrid(1, dc, state, part, box);
+                skin.ThemeDate(1, dc, state, part, box);
+                skin.ThemeSpinButton(dc, state, part, box);
+                skin.DrawTextbox(1, dc, state, box.left, box.top, box.right, box.bottom);
+                skin.ThemeTrackbar(1, dc, state > 0, state > 1, state, part % 2, part / 8, box);
+                skin.ThemeScroll(1, dc, box, part, state, state % 2 == 0);
+                skin.ThemeListbox(1, dc, part, box);
+                skin.ThemeStatusBar(1, dc, part, box);
+                skin.ThemeTab(1, dc, part, state, box, 0);
+                skin.DrawListview(1, dc, part, state, box);
+                skin.ThemeCombobox(1, dc, state, part, box);
+                skin.ThemeButton(1, dc, state, false, false, box);
+                skin.ThemeProgress(1, dc, part, box.right, box.bottom, box);
+                (void)skin.ThemeCheck(1, dc, state, part, box);
+                (void)skin.ThemeOption(1, dc, state, part, box);
+                skin.ThemeUniToolbar(1, dc, part, 0, box.left, box.top, box.right, box.bottom,
+                                     state, box.right, box.bottom);
+                skin.ThemeMenus(1, dc, part, state, box.left, box.top, box.right, box.bottom);
+                (void)skin.ThemePopupColor(1, dc, part, box);
+                (void)skin.ThemeMDITab(1, dc, part, static_cast<float>(box.left),
+                                       static_cast<float>(box.top), static_cast<float>(box.right),
+                                       static_cast<float>(box.bottom), measure);
+            }
+        }
+        EXPECT_EQ(target.size(), QSize(16, 16));
+    }
+}
+
 TEST(PaintersTest, MDMouseOver_IsFalseOverAChildWindow_AndTrueOverTheChild) {
     QWindow parent;
     parent.setGeometry(100, 100, 200, 200);
