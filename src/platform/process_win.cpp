@@ -1,0 +1,117 @@
+// Starting programs on Windows.
+#include <windows.h>
+
+#include <array>
+#include <fstream>
+#include <system_error>
+
+#include "platform/process.h"
+
+namespace kickvane::platform {
+
+namespace fs = std::filesystem;
+
+namespace {
+
+std::wstring Widen(const std::string& text) {
+    if (text.empty()) {
+        return {};
+    }
+    const int size =
+        MultiByteToWideChar(CP_UTF8, 0, text.data(), static_cast<int>(text.size()), nullptr, 0);
+    std::wstring wide(static_cast<size_t>(size), L'\0');
+    MultiByteToWideChar(CP_UTF8, 0, text.data(), static_cast<int>(text.size()), wide.data(), size);
+    return wide;
+}
+
+std::string SystemMessage(DWORD error) {
+    return std::system_category().message(static_cast<int>(error));
+}
+
+// Appends one argument quoted so that the program's command-line parser (CommandLineToArgvW and
+// the C runtime) gives it back unchanged: backslashes are literal except before a quote.
+void AppendQuoted(std::wstring& line, const std::wstring& argument) {
+    if (!argument.empty() && argument.find_first_of(L" \t\n\v\"") == std::wstring::npos) {
+        line += argument;
+        return;
+    }
+    line += L'"';
+    size_t backslashes = 0;
+    for (wchar_t c : argument) {
+        if (c == L'\\') {
+            ++backslashes;
+            continue;
+        }
+        if (c == L'"') {
+            line.append(backslashes * 2 + 1, L'\\');
+        } else {
+            line.append(backslashes, L'\\');
+        }
+        backslashes = 0;
+        line += c;
+    }
+    line.append(backslashes * 2, L'\\');
+    line += L'"';
+}
+
+}  // namespace
+
+Status StartDetached(const fs::path& program, const std::vector<std::string>& arguments,
+                     const fs::path& workingFolder, bool minimised) {
+    std::error_code error;
+    const fs::path absoluteProgram = fs::absolute(program, error);
+    if (program.empty() || error) {
+        return Status::Fail("cannot run " + program.string());
+    }
+    std::wstring commandLine;
+    AppendQuoted(commandLine, absoluteProgram.wstring());
+    for (const std::string& argument : arguments) {
+        commandLine += L' ';
+        AppendQuoted(commandLine, Widen(argument));
+    }
+
+    STARTUPINFOW startup{};
+    startup.cb = sizeof startup;
+    if (minimised) {
+        startup.dwFlags = STARTF_USESHOWWINDOW;
+        startup.wShowWindow = SW_SHOWMINIMIZED;
+    }
+    PROCESS_INFORMATION process{};
+    const std::wstring folder = workingFolder.wstring();
+    if (!CreateProcessW(absoluteProgram.c_str(), commandLine.data(), nullptr, nullptr, FALSE,
+                        CREATE_NEW_PROCESS_GROUP, nullptr,
+                        folder.empty() ? nullptr : folder.c_str(), &startup, &process)) {
+        return Status::Fail("cannot run " + program.string() + ": " +
+                            SystemMessage(GetLastError()));
+    }
+    // The program runs on its own; the handles are not needed to let it.
+    CloseHandle(process.hThread);
+    CloseHandle(process.hProcess);
+    return Status::Ok();
+}
+
+fs::path FindOnPath(const std::string& name) {
+    if (name.empty()) {
+        return {};
+    }
+    const std::wstring wide = Widen(name);
+    std::array<wchar_t, MAX_PATH> found{};
+    const DWORD size = SearchPathW(nullptr, wide.c_str(), L".exe", static_cast<DWORD>(found.size()),
+                                   found.data(), nullptr);
+    if (size == 0 || size >= found.size()) {
+        return {};
+    }
+    return fs::path(found.data());
+}
+
+bool IsNativeExecutable(const fs::path& file) {
+    std::error_code error;
+    if (!fs::is_regular_file(file, error)) {
+        return false;
+    }
+    std::ifstream in(file, std::ios::binary);
+    std::array<char, 2> head{};
+    return in.read(head.data(), head.size()) && head[0] == 'M' && head[1] == 'Z';
+}
+
+}  // namespace kickvane::platform
