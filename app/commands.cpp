@@ -9,6 +9,7 @@
 #include "engine/apply.h"
 #include "engine/quick_load.h"
 #include "platform/filesystem.h"
+#include "platform/single_instance.h"
 #include "text/vni.h"
 
 namespace kickvane::app {
@@ -106,7 +107,8 @@ void PrintStep(const engine::StepOutcome& outcome) {
 }  // namespace
 
 void PrintUsage(std::ostream& out) {
-    out << "Usage: kickvane COMMAND [ARGS]\n"
+    out << "Usage: kickvane [--tool-folder DIR]      open the window\n"
+           "       kickvane COMMAND [ARGS]\n"
            "\n"
            "  apply [--tool-folder DIR] [--game DIR]   copy the chosen sets into the game\n"
            "  plan [--tool-folder DIR] [--game DIR]    list the copy steps, copy nothing\n"
@@ -114,6 +116,8 @@ void PrintUsage(std::ostream& out) {
            "  vni [TEXT]                                convert VNI-typed text to Unicode\n"
            "  ini get FILE SECTION KEY [DEFAULT]        read one settings value\n"
            "  ini set FILE SECTION KEY VALUE            write one settings value\n"
+           "  trigger                                   make the running window apply the sets "
+           "now\n"
            "  skin-gallery OUT.png                      draw every themed control into a sheet\n"
            "\n"
            "The tool folder defaults to the program's folder; the selection and the game folder\n"
@@ -212,6 +216,18 @@ int RunIni(Args args) {
     }
     PrintUsage(std::cerr);
     return kExitStopped;
+}
+
+int RunTrigger(Args args) {
+    if (!args.empty()) {
+        PrintUsage(std::cerr);
+        return kExitStopped;
+    }
+    if (!platform::SendToRunningInstance("trigger")) {
+        std::cerr << "kickvane: Kickvane chưa chạy, không có gì để kích hoạt.\n";
+        return 1;
+    }
+    return kExitOk;
 }
 
 }  // namespace kickvane::app

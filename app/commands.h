@@ -1,5 +1,6 @@
 #pragma once
 
+#include <iosfwd>
 #include <span>
 #include <string_view>
 
@@ -14,6 +15,11 @@ int RunPlan(Args args);
 int RunQuickLoad(Args args);
 int RunVni(Args args);
 int RunIni(Args args);
+int RunTrigger(Args args);
+
+// Commands that need the window system; in a build without it they say so.
+int RunWindowCommand(int& argc, char** argv, Args args);
+int RunSkinGallery(Args args);
 
 void PrintUsage(std::ostream& out);
 

@@ -8,11 +8,10 @@
 int main(int argc, char** argv) {
     using namespace kickvane::app;
     const std::vector<std::string_view> args(argv + 1, argv + argc);
-    if (args.empty()) {
-        PrintUsage(std::cout);
-        return 0;
+    const std::string_view command = args.empty() ? std::string_view() : args[0];
+    if (args.empty() || command == "--tool-folder") {
+        return RunWindowCommand(argc, argv, Args(args.data(), args.size()));
     }
-    const std::string_view command = args[0];
     const Args rest(args.data() + 1, args.size() - 1);
     if (command == "apply") {
         return RunApply(rest);
@@ -28,6 +27,12 @@ int main(int argc, char** argv) {
     }
     if (command == "ini") {
         return RunIni(rest);
+    }
+    if (command == "trigger") {
+        return RunTrigger(rest);
+    }
+    if (command == "skin-gallery") {
+        return RunSkinGallery(rest);
     }
     if (command == "--help" || command == "-h" || command == "help") {
         PrintUsage(std::cout);

@@ -71,7 +71,7 @@ void PopupSlots::Release(int slot) {
 }
 
 AlertPopupModel::AlertPopupModel(PopupEnvironment environment)
-    : env_(std::move(environment)), slots_(env_.slots ? *env_.slots : PopupSlots::Shared()) {
+    : env_(std::move(environment)), slots_(env_.slotTable ? *env_.slotTable : PopupSlots::Shared()) {
     env_.screen.twipsPerPixelX = SaneTwipsPerPixel(env_.screen.twipsPerPixelX);
     env_.screen.twipsPerPixelY = SaneTwipsPerPixel(env_.screen.twipsPerPixelY);
 }

@@ -72,7 +72,7 @@ struct PopupEnvironment {
     // Without it the label fills the popup below its top and auto-fit leaves the height alone.
     LabelHeightFn labelHeight;
     // Null: PopupSlots::Shared().
-    PopupSlots* slots = nullptr;
+    PopupSlots* slotTable = nullptr;
 };
 
 struct PixelRect {

@@ -21,7 +21,7 @@ protected:
         PopupEnvironment env;
         env.screen = {1600, 1000, 1080, 15.0, 15.0};
         env.translucencySupported = translucent;
-        env.slots = &slots_;
+        env.slotTable = &slots_;
         env.labelHeight = [this](int widthPx, std::string_view shown) {
             measuredWidth_ = widthPx;
             return kLineHeightPx *
@@ -190,7 +190,7 @@ TEST(PopupModel, ConvertsScreenToTwips_HalvesToEven_AndSurvivesHugeSeconds) {
     PopupSlots slots;
     PopupEnvironment env;
     env.screen = {1001, 1001, 1200, 14.5, 14.5};  // 14514.5 twips
-    env.slots = &slots;
+    env.slotTable = &slots;
     AlertPopupModel popup(env);
     popup.DisplayMessage("x", INT_MAX, false, false, false, 0);
     EXPECT_EQ(popup.TopTwips(), 14514);

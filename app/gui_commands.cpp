@@ -1,0 +1,30 @@
+// Subcommands that use the window system.
+#include <iostream>
+
+#include "commands.h"
+#include "platform/filesystem.h"
+#include "shell/run_window.h"
+#include "skin/gallery.h"
+
+namespace kickvane::app {
+
+int RunWindowCommand(int& argc, char** argv, Args args) {
+    std::filesystem::path toolFolder = platform::ProgramFolder();
+    if (args.size() == 2 && args[0] == "--tool-folder") {
+        toolFolder = std::filesystem::absolute(std::filesystem::path(std::string(args[1])));
+    } else if (!args.empty()) {
+        PrintUsage(std::cerr);
+        return 2;
+    }
+    return shell::RunWindow(argc, argv, toolFolder);
+}
+
+int RunSkinGallery(Args args) {
+    if (args.size() != 1) {
+        PrintUsage(std::cerr);
+        return 2;
+    }
+    return skin::RunSkinGallery(std::filesystem::path(std::string(args[0])), std::cerr);
+}
+
+}  // namespace kickvane::app

@@ -1,0 +1,24 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+
+#include "engine/engine_ui.h"
+
+namespace kickvane::engine {
+
+inline constexpr std::string_view kLauncherMissingVni =
+    "Kho6ng ti2m tha61y Gameloader.exe hoa85c d9u7o72ng da64n kho6ng chi1nh xa1c!";
+inline constexpr std::string_view kWineMissingText =
+    "Không chạy được Gameloader.exe: máy chưa cài Wine. Hãy cài Wine (gói wine) rồi thử lại.";
+inline constexpr std::string_view kStartFailedText = "Không chạy được Gameloader.exe: ";
+
+enum class LaunchResult { Started, LauncherMissing, WineMissing, StartFailed };
+
+// Starts "Gameloader.exe" from the game folder without waiting, with the game folder as the
+// working folder. A Windows program runs through Wine (the `wine` on PATH, with the WINEPREFIX of
+// the environment); a file that this system can run itself is started directly. When it cannot
+// start, the user is told why and the result says so.
+LaunchResult LaunchGame(std::string_view gameFolder, EngineUi& ui);
+
+}  // namespace kickvane::engine

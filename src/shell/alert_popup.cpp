@@ -1,0 +1,141 @@
+#include "shell/alert_popup.h"
+
+#include <QFontMetrics>
+#include <QGuiApplication>
+#include <QPainter>
+#include <QPainterPath>
+#include <QPalette>
+#include <QScreen>
+#include <chrono>
+
+namespace kickvane::shell {
+
+namespace {
+
+QColor ToQColor(text::Colour colour, const QPalette& palette) {
+    if (colour == text::kButtonFaceColour) {
+        return palette.color(QPalette::Button);
+    }
+    return QColor(static_cast<int>(colour & 0xFF), static_cast<int>((colour >> 8) & 0xFF),
+                  static_cast<int>((colour >> 16) & 0xFF));
+}
+
+QFont PopupFont() {
+    QFont font(QString::fromUtf8(text::kPopupFontFamily.data(),
+                                 static_cast<qsizetype>(text::kPopupFontFamily.size())));
+    font.setPointSizeF(text::kPopupFontPointSize);
+    return font;
+}
+
+QString DisplayText(const std::string& text) {
+    QString shown = QString::fromStdString(text);
+    shown.replace(QStringLiteral("\r\n"), QStringLiteral("\n"));
+    return shown;
+}
+
+}  // namespace
+
+text::PopupEnvironment AlertPopup::ScreenEnvironment() {
+    text::PopupEnvironment environment;
+    if (QScreen* screen = QGuiApplication::primaryScreen()) {
+        const QRect work = screen->availableGeometry();
+        environment.screen.workAreaRightPx = work.x() + work.width();
+        environment.screen.workAreaBottomPx = work.y() + work.height();
+        environment.screen.screenHeightPx = screen->geometry().height();
+        environment.screen.twipsPerPixelX = 1440.0 / screen->logicalDotsPerInchX();
+        environment.screen.twipsPerPixelY = 1440.0 / screen->logicalDotsPerInchY();
+    }
+    environment.translucencySupported =
+        QGuiApplication::platformName() != QLatin1String("offscreen");
+    environment.labelHeight = [](int widthPx, std::string_view text) {
+        const QFontMetrics metrics(PopupFont());
+        return metrics
+            .boundingRect(QRect(0, 0, widthPx, 100000), Qt::TextWordWrap,
+                          DisplayText(std::string(text)))
+            .height();
+    };
+    return environment;
+}
+
+AlertPopup::AlertPopup(text::PopupEnvironment environment)
+    : QWidget(nullptr, Qt::Tool | Qt::FramelessWindowHint | Qt::WindowStaysOnTopHint |
+                           Qt::WindowDoesNotAcceptFocus),
+      model_(std::move(environment)) {
+    setAttribute(Qt::WA_DeleteOnClose);
+    setAttribute(Qt::WA_ShowWithoutActivating);
+    setWindowTitle(QString::fromUtf8(text::kPopupCaption.data(),
+                                     static_cast<qsizetype>(text::kPopupCaption.size())));
+    setFont(PopupFont());
+    timer_.setTimerType(Qt::PreciseTimer);
+    timer_.setInterval(
+        std::chrono::duration_cast<std::chrono::milliseconds>(text::kPopupTickInterval));
+    connect(&timer_, &QTimer::timeout, this, &AlertPopup::Tick);
+}
+
+AlertPopup* AlertPopup::Show(const QString& text, int displaySeconds) {
+    auto* popup = new AlertPopup(ScreenEnvironment());
+    popup->DisplayMessage(text, displaySeconds, false, true, true, kToolFrameColour);
+    return popup;
+}
+
+void AlertPopup::DisplayMessage(const QString& text, int displaySeconds, bool fade, bool autoFit,
+                                bool square, text::Colour backColour) {
+    model_.DisplayMessage(text.toStdString(), displaySeconds, fade, autoFit, square, backColour);
+    if (const auto& shape = model_.Frame().windowShape) {
+        QPainterPath path;
+        path.addRoundedRect(
+            QRectF(shape->left, shape->top, shape->right - shape->left, shape->bottom - shape->top),
+            shape->ellipseWidth / 2.0, shape->ellipseHeight / 2.0);
+        setMask(QRegion(path.toFillPolygon().toPolygon()));
+    }
+    Follow();
+    show();
+    timer_.start();
+}
+
+void AlertPopup::Tick() {
+    model_.Tick();
+    if (model_.Finished()) {
+        timer_.stop();
+        close();
+        return;
+    }
+    Follow();
+}
+
+void AlertPopup::Follow() {
+    const text::PixelRect rect = model_.WindowPixels();
+    setGeometry(rect.left, rect.top, rect.width, rect.height);
+    if (const auto alpha = model_.Alpha()) {
+        setWindowOpacity(*alpha / 255.0);
+    }
+}
+
+void AlertPopup::paintEvent(QPaintEvent*) {
+    QPainter painter(this);
+    const QColor green = ToQColor(text::kPopupBackgroundColour, palette());
+    painter.fillRect(rect(), green);
+    const text::PopupFrame& frame = model_.Frame();
+    for (const text::RoundedRect& shape : frame.shapes) {
+        painter.setPen(ToQColor(shape.colour, palette()));
+        painter.setBrush(Qt::NoBrush);
+        painter.drawRoundedRect(
+            QRect(QPoint(shape.left, shape.top), QPoint(shape.right, shape.bottom)),
+            shape.ellipseWidth / 2.0, shape.ellipseHeight / 2.0);
+    }
+    for (const text::FrameLine& line : frame.lines) {
+        painter.setPen(ToQColor(line.colour, palette()));
+        painter.drawLine(line.x1, line.y1, line.x2, line.y2);
+    }
+    const text::PixelRect label = model_.LabelPixels();
+    painter.setPen(ToQColor(text::kPopupTextColour, palette()));
+    painter.setFont(PopupFont());
+    painter.drawText(QRect(label.left, label.top, label.width, label.height),
+                     Qt::TextWordWrap | Qt::AlignLeft | Qt::AlignTop, DisplayText(model_.Text()));
+}
+
+void AlertPopup::mousePressEvent(QMouseEvent*) {
+    model_.Click();
+}
+
+}  // namespace kickvane::shell

@@ -1,0 +1,44 @@
+#pragma once
+
+#include <QTimer>
+#include <QWidget>
+
+#include "text/popup_model.h"
+
+namespace kickvane::shell {
+
+// The corner popup: a frameless window that never takes the focus and follows its model, which
+// decides where it is, what it shows and when it goes. It deletes itself when the model finishes.
+class AlertPopup final : public QWidget {
+    Q_OBJECT
+public:
+    // The colour every caller of the tool gives the inner frame line: RGB(255, 255, 192).
+    static constexpr text::Colour kToolFrameColour = 0x00C0FFFF;
+
+    explicit AlertPopup(text::PopupEnvironment environment);
+
+    // Opens a popup the way the tool's callers do: timed, sliding, fitted, square frame.
+    static AlertPopup* Show(const QString& text, int displaySeconds);
+
+    void DisplayMessage(const QString& text, int displaySeconds, bool fade, bool autoFit,
+                        bool square, text::Colour backColour);
+
+    const text::AlertPopupModel& model() const { return model_; }
+    // One tick of the motion; the timer calls it, tests may too.
+    void Tick();
+
+    // The screen and text measures the model needs, from the primary screen and the popup font.
+    static text::PopupEnvironment ScreenEnvironment();
+
+protected:
+    void paintEvent(QPaintEvent* event) override;
+    void mousePressEvent(QMouseEvent* event) override;
+
+private:
+    void Follow();
+
+    text::AlertPopupModel model_;
+    QTimer timer_;
+};
+
+}  // namespace kickvane::shell

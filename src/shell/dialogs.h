@@ -1,0 +1,40 @@
+#pragma once
+
+#include <QString>
+#include <optional>
+
+class QWidget;
+
+namespace kickvane::shell {
+
+// The dialogs the window opens. The real ones are Qt's; tests record instead of blocking.
+class Dialogs {
+public:
+    enum class Icon { Information, Warning };
+
+    virtual ~Dialogs() = default;
+
+    // A folder picker; nullopt when the user cancels.
+    virtual std::optional<QString> PickFolder(QWidget* owner, const QString& title) = 0;
+
+    // A message box with one OK button; returns when the user has closed it.
+    virtual void ShowMessage(QWidget* owner, const QString& title, const QString& text,
+                             Icon icon = Icon::Information) = 0;
+
+    // A message that does not wait: the window goes on while it is open.
+    virtual void ShowNotice(QWidget* owner, const QString& title, const QString& text) = 0;
+
+    // The corner popup that confirms an action.
+    virtual void ShowPopup(const QString& text, int displaySeconds) = 0;
+};
+
+// Qt's file dialog, message boxes and the alert popup.
+class QtDialogs final : public Dialogs {
+public:
+    std::optional<QString> PickFolder(QWidget* owner, const QString& title) override;
+    void ShowMessage(QWidget* owner, const QString& title, const QString& text, Icon icon) override;
+    void ShowNotice(QWidget* owner, const QString& title, const QString& text) override;
+    void ShowPopup(const QString& text, int displaySeconds) override;
+};
+
+}  // namespace kickvane::shell

@@ -1,0 +1,155 @@
+#pragma once
+
+#include <QCheckBox>
+#include <QComboBox>
+#include <QLineEdit>
+#include <QPushButton>
+#include <QRadioButton>
+#include <QTimer>
+#include <QWidget>
+#include <array>
+#include <filesystem>
+#include <functional>
+#include <memory>
+#include <vector>
+
+#include "catalog/settings.h"
+#include "engine/hotkey_poll.h"
+#include "engine/launcher.h"
+#include "shell/dialogs.h"
+#include "shell/widgets.h"
+#include "shell/window_ui.h"
+
+namespace kickvane::shell {
+
+inline constexpr int kTabCount = 4;
+inline constexpr int kClientWidth = 425;
+inline constexpr int kClientHeight = 478;
+inline constexpr int kTabHeadWidth = 82;
+inline constexpr int kTabHeadHeight = 31;
+inline const QColor kUnselectedTabColour{0xE0, 0xE0, 0xE0};
+
+// Texts and run-time values that the window keeps for its parts: popup texts, the active skin,
+// the quick load's folder and what the update check fetched.
+struct HiddenTexts {
+    QString skn = QStringLiteral("skin1");
+    QString skintxt = QStringLiteral("Đã thay đổi giao diện!");
+    QString text2 = QStringLiteral("Đã lưu thiết lập!");
+    QString tAlert = QStringLiteral("Ẩn xuống khay hệ thống!");
+    QString cph = QStringLiteral("Hoàn tất!");
+    QString cpn;   // the folder chosen for the quick load
+    QString pban;  // version text of the last update check
+    QString vlk;   // download link of the last update check
+};
+
+// What the window needs from outside; tests pass fakes.
+struct ShellServices {
+    Dialogs* dialogs = nullptr;                        // not owned
+    std::unique_ptr<platform::KeySampler> keySampler;  // null: no global key state here
+    SoundPlayer playSound;
+    std::function<engine::LaunchResult(std::string_view, engine::EngineUi&)> launchGame =
+        engine::LaunchGame;
+};
+
+// The main window: four panels under tab heads with the catalog's check boxes and option buttons,
+// the game folder, the hotkey and the command buttons. It polls the hotkey every 100 ms and
+// applies the chosen sets when the key is pressed anywhere on the desktop.
+class MainWindow final : public QWidget {
+    Q_OBJECT
+public:
+    MainWindow(std::filesystem::path toolFolder, ShellServices services, QWidget* parent = nullptr);
+    ~MainWindow() override;
+
+    const std::filesystem::path& toolFolder() const { return toolFolder_; }
+    HiddenTexts& hiddenTexts() { return hidden_; }
+
+    int currentTab() const { return currentTab_; }
+    int tabHeight() const { return tabHeight_; }
+    void selectTab(int index);
+    TabHead* tabHead(int index) const { return tabs_[static_cast<size_t>(index)]; }
+    PictureBox* panel(int index) const { return panels_[static_cast<size_t>(index)]; }
+
+    QCheckBox* categoryCheck(int switchIndex) const;
+    QRadioButton* optionButton(catalog::OptionArray array, int index) const;
+    ClickableLabel* categoryLabel(int switchIndex) const;
+    ClickableLabel* optionLabel(catalog::OptionArray array, int index) const;
+    QLineEdit* gameFolderBox() const { return gameFolder_; }
+    QComboBox* hotkeyBox() const { return hotkey_; }
+    QPushButton* saveButton() const { return save_; }
+    QPushButton* launchButton() const { return launch_; }
+    QPushButton* quickLoadButton() const { return quickLoad_; }
+    QPushButton* browseButton() const { return browse_; }
+
+    // The settings as the widgets hold them now.
+    catalog::Settings currentSettings() const;
+    const catalog::PatchSelection& selection() const { return selection_; }
+
+    // Applies the chosen sets now, as a hotkey press does; ignored while a run is going on.
+    void applyPatchesNow();
+    // One tick of the hotkey poll.
+    void pollHotkey();
+
+    void saveSettings();
+    void launchGame();
+    void quickLoad();
+    void browseGameFolder();
+
+    // Draws the tab heads and shows the current panel, with the active skin's pictures.
+    void paintTabs();
+
+signals:
+    // A catalog label was clicked: label array and index, for the preview.
+    void labelClicked(catalog::LabelArray labels, int index);
+    // The window should go out of sight (the launcher started).
+    void hideRequested();
+
+protected:
+    void paintEvent(QPaintEvent* event) override;
+
+private:
+    void buildTabs();
+    void buildCategoryPanel(QWidget* panel);
+    void buildGroupPanel(QWidget* panel, catalog::GroupId group, int top);
+    void buildVariantFrames(QWidget* panel);
+    void buildButtons();
+    void initTabs();
+    void loadSettings();
+    void showSelection();
+    void onOptionClicked(catalog::OptionArray array, int index);
+    QString skinFile(const QString& suffix) const;
+
+    std::filesystem::path toolFolder_;
+    ShellServices services_;
+    WindowUi ui_;
+    HiddenTexts hidden_;
+    catalog::PatchSelection selection_;
+
+    int currentTab_ = 0;
+    int tabHeight_ = 32;
+    std::array<TabHead*, kTabCount> tabs_{};
+    std::array<PictureBox*, kTabCount> panels_{};
+    std::array<QCheckBox*, catalog::kCategoryCount> checks_{};
+    std::array<ClickableLabel*, catalog::kCategoryCount> categoryLabels_{};
+    struct OptionWidgets {
+        catalog::OptionArray array;
+        int index;
+        QRadioButton* button;
+        ClickableLabel* label;
+    };
+    std::vector<OptionWidgets> options_;
+    std::array<PictureBox*, 3> groupFrames_{};
+
+    QLineEdit* gameFolder_ = nullptr;
+    QPushButton* browse_ = nullptr;
+    QComboBox* hotkey_ = nullptr;
+    QPushButton* save_ = nullptr;
+    QPushButton* launch_ = nullptr;
+    QPushButton* quickLoad_ = nullptr;
+    QPixmap background_;
+
+    std::unique_ptr<engine::HotkeyPoll> poll_;
+    QTimer hotkeyTimer_;
+    bool applying_ = false;
+};
+
+}  // namespace kickvane::shell

@@ -1,0 +1,72 @@
+#include "shell/run_window.h"
+
+#include <QApplication>
+#include <QScreen>
+#include <QSocketNotifier>
+#include <QTimer>
+
+#include "platform/single_instance.h"
+#include "platform/sound.h"
+#include "shell/main_window.h"
+#include "shell/message_box.h"
+
+namespace kickvane::shell {
+
+namespace {
+
+constexpr std::string_view kAlreadyRunningVni = "U71ng du5ng d9ang cha5y ro62i ma2";
+
+const QString kNoGlobalKeysText = QStringLiteral(
+    "Không đọc được phím tắt toàn cục trong phiên làm việc này (không có máy chủ X).\n"
+    "Hãy gắn lệnh \"kickvane trigger\" vào một phím tắt của màn hình nền: lệnh này chép các bộ "
+    "đồ hoạ đã chọn vào game, như khi nhấn phím tắt.");
+
+void CentreOnScreen(QWidget& window) {
+    if (const QScreen* screen = QGuiApplication::primaryScreen()) {
+        const QRect area = screen->availableGeometry();
+        window.move(area.center() - QPoint(window.width() / 2, window.height() / 2));
+    }
+}
+
+}  // namespace
+
+int RunWindow(int& argc, char** argv, const std::filesystem::path& toolFolder) {
+    QApplication app(argc, argv);
+    QApplication::setApplicationName(QStringLiteral("Kickvane"));
+
+    const std::unique_ptr<platform::SingleInstance> instance = platform::AcquireSingleInstance();
+    if (!instance) {
+        ShowMessageW(kAlreadyRunningVni, kNoticeTitleVni, kStyleInformation, nullptr);
+        return 0;
+    }
+
+    QtDialogs dialogs;
+    ShellServices services;
+    services.dialogs = &dialogs;
+    services.keySampler = platform::CreateKeySampler();
+    services.playSound = platform::PlaySoundAsync;
+    const bool globalKeys = services.keySampler != nullptr;
+
+    MainWindow window(toolFolder, std::move(services));
+    QObject::connect(&window, &MainWindow::hideRequested, &window, &QWidget::showMinimized);
+
+    // Commands from later starts: "kickvane trigger" applies the sets as the hotkey does.
+    QSocketNotifier commands(instance->commandDescriptor(), QSocketNotifier::Read);
+    QObject::connect(&commands, &QSocketNotifier::activated, &window, [&] {
+        while (const std::optional<std::string> command = instance->TakeCommand()) {
+            if (*command == kTriggerCommand) {
+                window.applyPatchesNow();
+            }
+        }
+    });
+
+    CentreOnScreen(window);
+    window.show();
+    if (!globalKeys) {
+        QTimer::singleShot(0, &window,
+                           [&] { dialogs.ShowNotice(&window, NoticeTitle(), kNoGlobalKeysText); });
+    }
+    return QApplication::exec();
+}
+
+}  // namespace kickvane::shell

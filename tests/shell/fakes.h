@@ -1,0 +1,54 @@
+#pragma once
+
+#include <QStringList>
+#include <deque>
+#include <map>
+
+#include "platform/keystate.h"
+#include "shell/dialogs.h"
+
+namespace kickvane::testing {
+
+// Records what the window would show, and answers folder pickers from a queue.
+class RecordingDialogs final : public shell::Dialogs {
+public:
+    std::optional<QString> PickFolder(QWidget*, const QString& title) override {
+        pickerTitles << title;
+        if (folders.empty()) {
+            return std::nullopt;
+        }
+        std::optional<QString> folder = folders.front();
+        folders.pop_front();
+        return folder;
+    }
+    void ShowMessage(QWidget*, const QString& title, const QString& text, Icon) override {
+        messages << title + QLatin1Char('|') + text;
+    }
+    void ShowNotice(QWidget*, const QString&, const QString& text) override { notices << text; }
+    void ShowPopup(const QString& text, int seconds) override {
+        popups << text + QLatin1Char('|') + QString::number(seconds);
+    }
+
+    std::deque<std::optional<QString>> folders;  // nullopt: the user cancels
+    QStringList pickerTitles;
+    QStringList messages;
+    QStringList notices;
+    QStringList popups;
+};
+
+// Key state set by the test: a key reads as pressed once, or as held.
+class FakeKeySampler final : public platform::KeySampler {
+public:
+    platform::KeySample Sample(int virtualKey) override {
+        ++samples[virtualKey];
+        platform::KeySample sample{held.count(virtualKey) > 0, pressed.count(virtualKey) > 0};
+        pressed.erase(virtualKey);
+        return sample;
+    }
+
+    std::map<int, int> samples;
+    std::map<int, bool> held;
+    std::map<int, bool> pressed;
+};
+
+}  // namespace kickvane::testing

@@ -1,0 +1,240 @@
+#include "shell/main_window.h"
+
+#include <gtest/gtest.h>
+
+#include <QSignalSpy>
+#include <QTest>
+
+#include "fakes.h"
+#include "support/temp_dir.h"
+#include "support/trees.h"
+
+namespace kickvane::shell {
+namespace {
+
+using catalog::GroupId;
+using catalog::OptionArray;
+using testing::FakeKeySampler;
+using testing::ReadText;
+using testing::RecordingDialogs;
+using testing::TempDir;
+using testing::WriteFile;
+
+class MainWindowTest : public ::testing::Test {
+protected:
+    std::unique_ptr<MainWindow> Open() {
+        ShellServices services;
+        services.dialogs = &dialogs_;
+        auto keys = std::make_unique<FakeKeySampler>();
+        keys_ = keys.get();
+        services.keySampler = std::move(keys);
+        services.playSound = [this](const std::filesystem::path& wav) { sounds_.push_back(wav); };
+        return std::make_unique<MainWindow>(tool(), std::move(services));
+    }
+
+    std::filesystem::path tool() const { return dir_ / "tool"; }
+    std::filesystem::path game() const { return dir_ / "game"; }
+
+    void Click(QWidget* widget) { QTest::mouseClick(widget, Qt::LeftButton, {}, QPoint(5, 5)); }
+
+    int VisiblePanels(const MainWindow& window) {
+        int visible = 0;
+        for (int i = 0; i < kTabCount; ++i) {
+            visible += window.panel(i)->isVisibleTo(&window) ? 1 : 0;
+        }
+        return visible;
+    }
+
+    TempDir dir_;
+    RecordingDialogs dialogs_;
+    FakeKeySampler* keys_ = nullptr;
+    std::vector<std::filesystem::path> sounds_;
+};
+
+TEST_F(MainWindowTest, StartsOnFirstPanelWithDefaultsAndTheTwelveHotkeys) {
+    std::filesystem::create_directories(tool());
+    auto window = Open();
+
+    EXPECT_EQ(window->size(), QSize(425, 478));
+    EXPECT_EQ(window->currentTab(), 0);
+    EXPECT_EQ(VisiblePanels(*window), 1);
+    EXPECT_TRUE(window->panel(0)->isVisibleTo(window.get()));
+    QStringList items;
+    for (int i = 0; i < window->hotkeyBox()->count(); ++i) {
+        items << window->hotkeyBox()->itemText(i);
+    }
+    EXPECT_EQ(items.join(','), "F1,F2,F3,F4,F5,F6,F7,F8,F9,F10,F11,F12");
+    EXPECT_EQ(window->hotkeyBox()->currentText(), "F7");
+    EXPECT_EQ(window->gameFolderBox()->text(), "C:\\Program Files");
+    EXPECT_TRUE(window->categoryCheck(11)->isChecked());
+    EXPECT_FALSE(window->categoryCheck(12)->isChecked());
+    EXPECT_TRUE(window->optionButton(OptionArray::UniOption, 1)->isChecked());
+    EXPECT_EQ(window->selection(), catalog::PatchSelection::Defaults());
+}
+
+TEST_F(MainWindowTest, TabClicksShowExactlyOnePanelWithAlignedPanelsAndFixedTabHeads) {
+    std::filesystem::create_directories(tool());
+    auto window = Open();
+    for (int tab : {2, 2, 3, 0, 1}) {
+        Click(window->tabHead(tab));
+        EXPECT_EQ(window->currentTab(), tab);
+        EXPECT_EQ(VisiblePanels(*window), 1);
+        EXPECT_TRUE(window->panel(tab)->isVisibleTo(window.get()));
+    }
+    for (int i = 0; i < kTabCount; ++i) {
+        EXPECT_EQ(window->tabHead(i)->size(), QSize(82, 31));
+        EXPECT_EQ(window->panel(i)->x(), window->panel(0)->x());
+        EXPECT_EQ(window->panel(i)->width(), window->panel(0)->width());
+        EXPECT_EQ(window->panel(i)->y(), window->tabHeight() + 16);
+    }
+}
+
+TEST_F(MainWindowTest, TabHeadsUseTheActiveSkinsPicturesAndKeepOldOnesWhenMissing) {
+    QImage picture(82, 31, QImage::Format_RGB32);
+    picture.fill(Qt::blue);
+    std::filesystem::create_directories(tool() / "skin");
+    for (const char* name : {"skin1_selected.jpg", "skin1_unselect.jpg", "skin2_selected.jpg"}) {
+        picture.save(QString::fromStdString((tool() / "skin" / name).string()), "JPG");
+    }
+    auto window = Open();
+    EXPECT_TRUE(window->tabHead(0)->pictureFile().endsWith("skin/skin1_selected.jpg"));
+    EXPECT_TRUE(window->tabHead(1)->pictureFile().endsWith("skin/skin1_unselect.jpg"));
+    EXPECT_EQ(window->tabHead(1)->background(), QColor(0xE0, 0xE0, 0xE0));
+
+    window->hiddenTexts().skn = "skin2";
+    Click(window->tabHead(1));
+    EXPECT_TRUE(window->tabHead(1)->pictureFile().endsWith("skin/skin2_selected.jpg"));
+    // skin2_unselect.jpg is missing: the other heads keep the picture they had.
+    EXPECT_TRUE(window->tabHead(0)->pictureFile().endsWith("skin/skin1_selected.jpg"));
+}
+
+TEST_F(MainWindowTest, OptionButtonsFollowTheContainerRule) {
+    std::filesystem::create_directories(tool());
+    auto window = Open();
+    Click(window->tabHead(3));
+    Click(window->optionButton(OptionArray::UniOption1, 5));
+    EXPECT_TRUE(window->optionButton(OptionArray::UniOption1, 5)->isChecked());
+    EXPECT_FALSE(window->optionButton(OptionArray::UniOption1, 4)->isChecked());
+    EXPECT_TRUE(window->optionButton(OptionArray::UniOption1, 0)->isChecked());
+    EXPECT_TRUE(window->optionButton(OptionArray::UniOption1, 8)->isChecked());
+    // Clicking the chosen button again keeps it chosen.
+    Click(window->optionButton(OptionArray::UniOption1, 5));
+    EXPECT_EQ(window->selection().chosen(GroupId::Pitch), 5);
+}
+
+TEST_F(MainWindowTest, SettingsLoadIntoTheWidgetsAndSaveRoundTrips) {
+    WriteFile(tool() / "ThietLap.ini",
+              "[Thiet lap]\r\nDuongDan=D:\\Games\\FO2\r\nPhimTat=F10\r\n[Thay doi]\r\nCDV=1\r\n"
+              "Gdien=2\r\n[Bong]\r\nUCL 2011=True\r\n");
+    {
+        auto window = Open();
+        EXPECT_EQ(window->gameFolderBox()->text(), "D:\\Games\\FO2");
+        EXPECT_EQ(window->hotkeyBox()->currentText(), "F10");
+        EXPECT_TRUE(window->categoryCheck(12)->isChecked());
+        EXPECT_EQ(window->categoryCheck(3)->checkState(), Qt::PartiallyChecked);
+        EXPECT_TRUE(window->optionButton(OptionArray::UniOption, 3)->isChecked());
+
+        Click(window->categoryCheck(0));
+        Click(window->tabHead(2));
+        Click(window->optionButton(OptionArray::UniOption3, 6));
+        window->gameFolderBox()->setText("/home/player/FIFA Online 2");
+        window->hotkeyBox()->setCurrentText("F2");
+        Click(window->saveButton());
+        EXPECT_EQ(dialogs_.popups, QStringList{"Đã lưu thiết lập!|2"});
+    }
+    auto reopened = Open();
+    EXPECT_EQ(reopened->gameFolderBox()->text(), "/home/player/FIFA Online 2");
+    EXPECT_EQ(reopened->hotkeyBox()->currentText(), "F2");
+    EXPECT_FALSE(reopened->categoryCheck(0)->isChecked());
+    EXPECT_TRUE(reopened->optionButton(OptionArray::UniOption3, 6)->isChecked());
+    EXPECT_FALSE(reopened->optionButton(OptionArray::UniOption3, 0)->isChecked());
+    EXPECT_EQ(reopened->currentTab(), 0);
+}
+
+TEST_F(MainWindowTest, FailedSaveShowsAnErrorInsteadOfThePopup) {
+    std::filesystem::create_directories(tool() / "ThietLap.ini");  // a folder where the file goes
+    auto window = Open();
+    Click(window->saveButton());
+    EXPECT_TRUE(dialogs_.popups.isEmpty());
+    ASSERT_EQ(dialogs_.messages.size(), 1);
+    EXPECT_TRUE(dialogs_.messages[0].startsWith("Thông báo|Không lưu được thiết lập!"));
+}
+
+TEST_F(MainWindowTest, HotkeyTickAppliesThePatchesOnlyForAKeyThatIsNamedAndPressed) {
+    testing::MakeToolFolder(tool());
+    testing::MakeGameFolder(game());
+    auto window = Open();
+    window->gameFolderBox()->setText(QString::fromStdString(game().string()));
+
+    window->pollHotkey();  // F7 not pressed
+    EXPECT_TRUE(sounds_.empty());
+    keys_->pressed[0x76] = true;
+    window->hotkeyBox()->setCurrentText("f7");
+    window->pollHotkey();
+    EXPECT_TRUE(sounds_.empty());
+    EXPECT_EQ(keys_->samples[0x76], 1);
+
+    window->hotkeyBox()->setCurrentText("F7");
+    window->pollHotkey();  // pressed since the last sample
+    ASSERT_EQ(sounds_.size(), 1u);
+    EXPECT_EQ(ReadText(game() / "zdata/data2/ball/ball10.dds"), "europa ball");
+    window->pollHotkey();  // released meanwhile: no further run
+    EXPECT_EQ(sounds_.size(), 1u);
+    keys_->held[0x76] = true;
+    window->pollHotkey();
+    window->pollHotkey();
+    EXPECT_EQ(sounds_.size(), 3u);
+    EXPECT_TRUE(dialogs_.notices.isEmpty());
+}
+
+TEST_F(MainWindowTest, FailedStepsOfARunAreNamedInANotice) {
+    testing::MakeToolFolder(tool());
+    testing::MakeGameFolder(game(), /*withZData=*/false);
+    auto window = Open();
+    window->gameFolderBox()->setText(QString::fromStdString(game().string()));
+    window->applyPatchesNow();
+    ASSERT_EQ(dialogs_.notices.size(), 1);
+    EXPECT_TRUE(dialogs_.notices[0].contains(
+        "Thay đổi bóng: merge ExtrasFolder\\Ball\\Europa League 2011"));
+    EXPECT_EQ(sounds_.size(), 1u);
+}
+
+TEST_F(MainWindowTest, LauncherMissingShowsTheMessageAndKeepsTheWindow) {
+    std::filesystem::create_directories(game());
+    auto window = Open();
+    window->gameFolderBox()->setText(QString::fromStdString(game().string()));
+    QSignalSpy hidden(window.get(), &MainWindow::hideRequested);
+    Click(window->launchButton());
+    EXPECT_EQ(
+        dialogs_.messages,
+        QStringList{"Thông báo|Không tìm thấy Gameloader.exe hoặc đường dẫn không chính xác!"});
+    EXPECT_EQ(hidden.count(), 0);
+    EXPECT_TRUE(dialogs_.popups.isEmpty());
+}
+
+TEST_F(MainWindowTest, BrowseAndQuickLoadRememberTheirFolders) {
+    std::filesystem::create_directories(tool() / "data/data2/players/heads/textures");
+    WriteFile(dir_ / "faces/face1.dds", "face");
+    auto window = Open();
+
+    dialogs_.folders = {std::nullopt};
+    Click(window->browseButton());
+    EXPECT_EQ(window->gameFolderBox()->text(), "C:\\Program Files");
+    EXPECT_EQ(dialogs_.pickerTitles.back(), "Chon thu muc cai dat FIFA Online 2");
+
+    // Cancelled on first use: nothing was chosen yet.
+    dialogs_.folders = {std::nullopt};
+    Click(window->quickLoadButton());
+    EXPECT_EQ(dialogs_.messages, QStringList{"Thông báo|Bạn chưa chọn thư mục nào!"});
+    EXPECT_EQ(dialogs_.pickerTitles.back(), "Ho tro nap nhanh cac file Face va Ball");
+
+    dialogs_.folders = {QString::fromStdString((dir_ / "faces").string()), std::nullopt};
+    Click(window->quickLoadButton());
+    std::filesystem::remove(tool() / "data/data2/players/heads/textures/face1.dds");
+    Click(window->quickLoadButton());  // cancelled: the folder chosen before is loaded again
+    EXPECT_EQ(dialogs_.popups, QStringList({"Hoàn tất!|2", "Hoàn tất!|2"}));
+    EXPECT_TRUE(std::filesystem::exists(tool() / "data/data2/players/heads/textures/face1.dds"));
+}
+
+}  // namespace
+}  // namespace kickvane::shell
