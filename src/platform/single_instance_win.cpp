@@ -5,6 +5,7 @@
 #include <windows.h>
 
 #include <string_view>
+#include <utility>
 
 #include "platform/single_instance.h"
 
