@@ -1,0 +1,134 @@
+// The real program on a virtual display: the hotkey pressed while another window has the focus,
+// a second start, and the trigger command.
+#include <gtest/gtest.h>
+
+#include "support/temp_dir.h"
+#include "support/trees.h"
+#include "x_display.h"
+
+namespace kickvane::testing {
+namespace {
+
+const std::string kWindowTitle = "Kickvane v2.0";
+
+class WindowTest : public ::testing::Test {
+protected:
+    static void SetUpTestSuite() { display_ = XDisplay::Start().release(); }
+    static void TearDownTestSuite() {
+        delete display_;
+        display_ = nullptr;
+    }
+
+    void SetUp() override {
+        if (!display_) {
+            GTEST_SKIP() << "no Xvfb here";
+        }
+        ::setenv("DISPLAY", display_->name().c_str(), 1);
+        ::setenv("XDG_RUNTIME_DIR", (dir_ / "runtime").c_str(), 1);
+        fs::create_directories(dir_ / "runtime");
+        fs::permissions(dir_ / "runtime", fs::perms::owner_all, fs::perm_options::replace);
+        ::unsetenv("WAYLAND_DISPLAY");
+        MakeToolFolder(tool());
+        MakeGameFolder(game());
+    }
+
+    fs::path tool() const { return dir_ / "tool"; }
+    fs::path game() const { return dir_ / "game"; }
+    fs::path applied() const { return game() / "data2/cmn/base.dds"; }
+
+    void WriteSettings(const std::string& hotkey) {
+        WriteFile(tool() / "ThietLap.ini",
+                  "[Thiet lap]\r\nDuongDan=" + game().string() + "\r\nPhimTat=" + hotkey + "\r\n");
+    }
+
+    std::unique_ptr<ChildProcess> StartKickvane(const std::string& log = "kickvane.log") {
+        return std::make_unique<ChildProcess>(
+            std::vector<std::string>{KICKVANE_BINARY, "--tool-folder", tool().string()},
+            (dir_ / log).string());
+    }
+
+    static std::string FindWindow(const std::string& title) {
+        std::string ids = Capture("xdotool search --name '^" + title + "$' 2>/dev/null");
+        return ids.substr(0, ids.find('\n'));
+    }
+
+    static bool WindowShown(const std::string& title) {
+        return WaitFor([&] { return !FindWindow(title).empty(); });
+    }
+
+    // Another program's window takes the keyboard focus, as the game would.
+    std::unique_ptr<ChildProcess> FocusOtherWindow() {
+        auto other = std::make_unique<ChildProcess>(
+            std::vector<std::string>{"xmessage", "-title", "the game", "at the login screen"});
+        EXPECT_TRUE(WindowShown("the game"));
+        Capture("xdotool windowfocus --sync " + FindWindow("the game"));
+        return other;
+    }
+
+    static void SaveScreenshot(const std::string& window, const std::string& name) {
+        fs::create_directories(KICKVANE_ARTIFACTS);
+        Capture("import -window " + window + " '" + std::string(KICKVANE_ARTIFACTS) + "/" + name +
+                "'");
+    }
+
+    static XDisplay* display_;
+    TempDir dir_;
+};
+
+XDisplay* WindowTest::display_ = nullptr;
+
+TEST_F(WindowTest, HotkeyPressedInAnotherWindowAppliesThePatches) {
+    WriteSettings("F7");
+    auto kickvane = StartKickvane();
+    ASSERT_TRUE(WindowShown(kWindowTitle));
+    SaveScreenshot(FindWindow(kWindowTitle), "window-after-start.png");
+
+    auto focused = FocusOtherWindow();
+    Capture("xdotool key F7");
+    EXPECT_TRUE(WaitFor([&] { return fs::exists(applied()); }));
+    EXPECT_EQ(ReadText(game() / "zdata/data2/ball/ball10.dds"), "europa ball");
+    EXPECT_TRUE(kickvane->Running());
+}
+
+TEST_F(WindowTest, HotkeyTextThatNamesNoKeyTriggersNothing) {
+    WriteSettings("f7");
+    auto kickvane = StartKickvane();
+    ASSERT_TRUE(WindowShown(kWindowTitle));
+    auto focused = FocusOtherWindow();
+    for (const char* key : {"F7", "F1", "F12"}) {
+        Capture(std::string("xdotool key ") + key);
+    }
+    // Give the poll several ticks to react to a key it should ignore.
+    std::this_thread::sleep_for(std::chrono::milliseconds(800));
+    EXPECT_FALSE(fs::exists(applied()));
+    EXPECT_TRUE(kickvane->Running());
+}
+
+TEST_F(WindowTest, SecondStartIsRefusedAndLeavesTheFirstRunning) {
+    WriteSettings("F7");
+    const std::string before = ReadText(tool() / "ThietLap.ini");
+    auto first = StartKickvane();
+    ASSERT_TRUE(WindowShown(kWindowTitle));
+
+    auto second = StartKickvane("second.log");
+    ASSERT_TRUE(WindowShown("Thông báo"));
+    SaveScreenshot(FindWindow("Thông báo"), "second-start-refused.png");
+    Capture("xdotool windowfocus --sync " + FindWindow("Thông báo") + " key Return");
+    EXPECT_EQ(second->Wait(), 0);
+    EXPECT_TRUE(first->Running());
+    EXPECT_FALSE(FindWindow(kWindowTitle).empty());
+    EXPECT_EQ(ReadText(tool() / "ThietLap.ini"), before);
+}
+
+TEST_F(WindowTest, TriggerCommandRunsThePatchesInTheRunningCopy) {
+    WriteSettings("F7");
+    EXPECT_NE(ChildProcess({KICKVANE_BINARY, "trigger"}).Wait(), 0);  // nothing runs yet
+
+    auto kickvane = StartKickvane();
+    ASSERT_TRUE(WindowShown(kWindowTitle));
+    EXPECT_EQ(ChildProcess({KICKVANE_BINARY, "trigger"}).Wait(), 0);
+    EXPECT_TRUE(WaitFor([&] { return fs::exists(applied()); }));
+}
+
+}  // namespace
+}  // namespace kickvane::testing
