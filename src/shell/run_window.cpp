@@ -50,15 +50,25 @@ int RunWindow(int& argc, char** argv, const std::filesystem::path& toolFolder) {
     MainWindow window(toolFolder, std::move(services));
     QObject::connect(&window, &MainWindow::hideRequested, &window, &QWidget::showMinimized);
 
-    // Commands from later starts: "kickvane trigger" applies the sets as the hotkey does.
-    QSocketNotifier commands(instance->commandDescriptor(), QSocketNotifier::Read);
-    QObject::connect(&commands, &QSocketNotifier::activated, &window, [&] {
+    // Commands from later starts: "kickvane trigger" applies the sets as the hotkey does. Where
+    // the command channel has no descriptor to watch, it is asked on a timer instead.
+    auto takeCommands = [&] {
         while (const std::optional<std::string> command = instance->TakeCommand()) {
             if (*command == kTriggerCommand) {
                 window.applyPatchesNow();
             }
         }
-    });
+    };
+    std::unique_ptr<QSocketNotifier> commandNotifier;
+    QTimer commandTimer;
+    if (instance->commandDescriptor() >= 0) {
+        commandNotifier = std::make_unique<QSocketNotifier>(instance->commandDescriptor(),
+                                                            QSocketNotifier::Read);
+        QObject::connect(commandNotifier.get(), &QSocketNotifier::activated, &window, takeCommands);
+    } else {
+        QObject::connect(&commandTimer, &QTimer::timeout, &window, takeCommands);
+        commandTimer.start(200);
+    }
 
     CentreOnScreen(window);
     window.show();
