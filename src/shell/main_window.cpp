@@ -1,5 +1,8 @@
 #include "shell/main_window.h"
 
+#include <QApplication>
+#include <QCloseEvent>
+#include <QCursor>
 #include <QLabel>
 #include <QPainter>
 
@@ -23,6 +26,18 @@ const std::array<QString, kTabCount> kTabCaptions{QStringLiteral("Chung"), QStri
 // Colours of the entries in the light skin, the look at every start.
 const QColor kEntryBackground(0xE0, 0xE0, 0xE0);
 const QColor kLabelBackground(0xC0, 0xC0, 0xC0);
+
+QIcon ToolIcon(const std::filesystem::path& toolFolder) {
+    QIcon icon;
+    for (const char* size : {"16", "32", "64"}) {
+        const std::filesystem::path file = platform::ResolveCaseInsensitive(
+            toolFolder / "icons" / (std::string("kickvane-") + size + ".png"));
+        if (platform::IsRegularFile(file)) {
+            icon.addFile(QString::fromStdString(file.string()));
+        }
+    }
+    return icon;
+}
 
 QString FromUtf8(std::string_view text) {
     return QString::fromUtf8(text.data(), static_cast<qsizetype>(text.size()));
@@ -79,12 +94,27 @@ MainWindow::MainWindow(std::filesystem::path toolFolder, ShellServices services,
 
     buildTabs();
     buildButtons();
+    buildTrayMenu();
 
-    // Start-up, in order: first panel and tab set-up, then the hotkey poll, the hotkey list and
-    // the settings. A step that cannot be done leaves its part as designed; the window still opens.
+    // Start-up, in order: the fade-in, the icons, the first panel and tab set-up, the tray icon,
+    // the hotkey poll, the hotkey list and the settings. A step that cannot be done leaves its
+    // part as designed; the window still opens.
+    fadeTimer_.setInterval(FadeModel::kInterval);
+    connect(&fadeTimer_, &QTimer::timeout, this, &MainWindow::fadeTick);
+    startFade(240, 15);
+
+    const QIcon icon = ToolIcon(toolFolder_);
+    setWindowIcon(icon);
+
     currentTab_ = 0;
     initTabs();
     paintTabs();
+
+    tray_ = services_.makeTray ? services_.makeTray(icon, &trayMenu_)
+                               : std::make_unique<SystemTrayIcon>(icon, &trayMenu_);
+    connect(tray_.get(), &TrayIcon::menuRequested, this,
+            [this] { trayMenu_.popup(QCursor::pos()); });
+    tray_->Add();
 
     if (services_.keySampler) {
         poll_ = std::make_unique<engine::HotkeyPoll>(*services_.keySampler);
@@ -229,6 +259,49 @@ void MainWindow::buildButtons() {
     quickLoad_ = new QPushButton(QStringLiteral("Nạp nhanh"), this);
     quickLoad_->setGeometry(334, 442, 84, 30);
     connect(quickLoad_, &QPushButton::clicked, this, &MainWindow::quickLoad);
+
+    // The small command buttons under the tab heads.
+    const auto small = [this](const QString& caption, int top) {
+        auto* button = new QPushButton(caption, this);
+        button->setGeometry(kTabLeft, top, kTabHeadWidth, 26);
+        return button;
+    };
+    runHidden_ = small(QStringLiteral("Chạy ẩn"), 262);
+    connect(runHidden_, &QPushButton::clicked, this, &MainWindow::runHidden);
+    info_ = small(QStringLiteral("Thông tin"), 292);
+    connect(info_, &QPushButton::clicked, this, &MainWindow::showAbout);
+    help_ = small(QStringLiteral("Hướng dẫn"), 322);
+    connect(help_, &QPushButton::clicked, this, &MainWindow::showHelp);
+    translucent_ = small(QStringLiteral("Trans"), 352);
+    connect(translucent_, &QPushButton::clicked, this, [this] { makeTranslucent(160); });
+
+    // The header: the update check and the two skins.
+    checkUpdate_ = new QPushButton(QStringLiteral("Kiểm tra cập nhật"), this);
+    checkUpdate_->setGeometry(176, 10, 118, 26);
+    download_ = new QPushButton(QStringLiteral("Tải về"), this);
+    download_->setGeometry(176, 10, 118, 26);
+    download_->hide();
+    skin1_ = new QPushButton(QStringLiteral("skin 1"), this);
+    skin1_->setGeometry(302, 10, 56, 26);
+    connect(skin1_, &QPushButton::clicked, this, [this] { applySkin(LightSkin()); });
+    skin2_ = new QPushButton(QStringLiteral("skin 2"), this);
+    skin2_->setGeometry(362, 10, 56, 26);
+    connect(skin2_, &QPushButton::clicked, this, [this] { applySkin(DarkSkin()); });
+
+    connect(this, &MainWindow::labelClicked, this, &MainWindow::showPreview);
+}
+
+void MainWindow::buildTrayMenu() {
+    // Captions are kept as "[utf8]" and the text; the menu shows the text.
+    const auto add = [this](const char* stored, void (MainWindow::*action)()) {
+        const QString caption = QString::fromUtf8(stored).remove(0, 6);
+        connect(trayMenu_.addAction(caption), &QAction::triggered, this, action);
+    };
+    add("[utf8]Khởi động FIFA", &MainWindow::launchGameFromTray);
+    add("[utf8]Hiện chương trình", &MainWindow::showFromTray);
+    add("[utf8]Nạp nhanh", &MainWindow::quickLoad);
+    add("[utf8]Thông tin", &MainWindow::showAbout);
+    add("[utf8]Thoát", &MainWindow::exitFromTray);
 }
 
 void MainWindow::initTabs() {
@@ -387,7 +460,7 @@ void MainWindow::launchGame() {
         engine::LaunchResult::Started) {
         return;
     }
-    emit hideRequested();
+    hideToTray();
     services_.dialogs->ShowPopup(hidden_.tAlert, 2);
 }
 
@@ -414,6 +487,150 @@ void MainWindow::quickLoad() {
             this, NoticeTitle(),
             QStringLiteral("Một số file không chép được:\n") + lines.join(QLatin1Char('\n')));
     }
+}
+
+SkinLook LightSkin() {
+    return {QStringLiteral("skin1"), kEntryBackground, Qt::black, kLabelBackground};
+}
+
+SkinLook DarkSkin() {
+    // The labels take the system's menu text colour as their background.
+    return {QStringLiteral("skin2"), QColor(0x40, 0x40, 0x40), Qt::white,
+            QApplication::palette().color(QPalette::Active, QPalette::WindowText)};
+}
+
+QColor MainWindow::labelTextColour() const {
+    return categoryLabels_[0]->palette().color(QPalette::WindowText);
+}
+
+void MainWindow::closeEvent(QCloseEvent* event) {
+    // Closing the window ends the tool; its tray icon goes with it at once.
+    tray_->Remove();
+    QWidget::closeEvent(event);
+    emit closed();
+}
+
+void MainWindow::startFade(int target, int step) {
+    fade_.Start(target, step);
+    fadeTimer_.start();
+}
+
+void MainWindow::fadeTick() {
+    const FadeModel::Tick tick = fade_.Step();
+    setWindowOpacity(tick.alpha / 255.0);
+    if (tick.ended) {
+        fadeTimer_.stop();
+        QApplication::beep();
+    }
+}
+
+TranslucentResult MainWindow::makeTranslucent(int alpha) {
+    if (alpha < 0 || alpha > 255) {
+        return TranslucentResult::OutOfRange;
+    }
+    setWindowOpacity(alpha / 255.0);
+    return TranslucentResult::Applied;
+}
+
+void MainWindow::applySkin(const SkinLook& look) {
+    LoadPicture(background_, QString::fromStdString(
+                                 platform::ResolveCaseInsensitive(
+                                     toolFolder_ / "skin" / (look.name + "_bg.jpg").toStdString())
+                                     .string()));
+    const QString panelPicture =
+        QString::fromStdString(platform::ResolveCaseInsensitive(
+                                   toolFolder_ / "skin" / (look.name + "_panel.jpg").toStdString())
+                                   .string());
+    for (int i = 0; i < kTabCount; ++i) {
+        PictureBox* panel = panels_[static_cast<size_t>(i)];
+        panel->setBackground(panels_[0]->background());
+        panel->setPictureFile(panelPicture);
+        panel->move(i > 0 ? panels_[0]->x() : panel->x(), tabHeight_ + 16);
+        if (i > 0) {
+            panel->resize(panels_[0]->width(), panel->height());
+        }
+    }
+    for (size_t i = 0; i < checks_.size(); ++i) {
+        Paint(checks_[i], look.entryBackground);
+        Paint(categoryLabels_[i], look.labelBackground, look.labelText);
+    }
+    for (const OptionWidgets& option : options_) {
+        Paint(option.button, look.entryBackground);
+        Paint(option.label, look.labelBackground, look.labelText);
+    }
+    for (PictureBox* frame : groupFrames_) {
+        frame->setBackground(look.entryBackground);
+        for (QLabel* heading : frame->findChildren<QLabel*>(Qt::FindDirectChildrenOnly)) {
+            if (!qobject_cast<ClickableLabel*>(heading)) {
+                Paint(heading, look.entryBackground, look.labelText);
+            }
+        }
+    }
+    hidden_.skn = look.name;
+    paintTabs();
+    update();
+    services_.dialogs->ShowPopup(hidden_.skintxt, 1);
+}
+
+void MainWindow::showPreview(catalog::LabelArray labels, int index) {
+    const std::filesystem::path picture = PreviewPicture(toolFolder_, labels, index);
+    if (picture.empty()) {
+        return;
+    }
+    if (!preview_) {
+        preview_ = new PreviewWindow(this);
+    }
+    preview_->show();
+    preview_->raise();
+    preview_->ShowPicture(picture);
+}
+
+void MainWindow::hideToTray() {
+    // Without a tray host the window could not come back from hiding; it minimises instead.
+    if (tray_->Shown()) {
+        hide();
+    } else {
+        showMinimized();
+    }
+}
+
+void MainWindow::runHidden() {
+    startFade(150, -15);
+    hideToTray();
+    services_.dialogs->ShowPopup(hidden_.tAlert, 2);
+}
+
+void MainWindow::showFromTray() {
+    showNormal();
+    raise();
+    activateWindow();
+    startFade(255, 15);
+}
+
+void MainWindow::launchGameFromTray() {
+    services_.launchGame(gameFolder_->text().toStdString(), ui_);
+}
+
+QWidget* MainWindow::showSideWindow(QPointer<QWidget>& window, QWidget* (*create)(QWidget*)) {
+    if (!window) {
+        window = create(this);
+    }
+    window->show();
+    window->raise();
+    return window;
+}
+
+void MainWindow::showAbout() {
+    showSideWindow(about_, CreateAboutWindow);
+}
+
+void MainWindow::showHelp() {
+    showSideWindow(helpWindow_, CreateHelpWindow);
+}
+
+void MainWindow::exitFromTray() {
+    tray_->Remove();
+    emit exitRequested();
 }
 
 }  // namespace kickvane::shell

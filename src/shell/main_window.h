@@ -3,6 +3,8 @@
 #include <QCheckBox>
 #include <QComboBox>
 #include <QLineEdit>
+#include <QMenu>
+#include <QPointer>
 #include <QPushButton>
 #include <QRadioButton>
 #include <QTimer>
@@ -17,6 +19,9 @@
 #include "engine/hotkey_poll.h"
 #include "engine/launcher.h"
 #include "shell/dialogs.h"
+#include "shell/fade_model.h"
+#include "shell/side_windows.h"
+#include "shell/tray.h"
 #include "shell/widgets.h"
 #include "shell/window_ui.h"
 
@@ -49,7 +54,19 @@ struct ShellServices {
     SoundPlayer playSound;
     std::function<engine::LaunchResult(std::string_view, engine::EngineUi&)> launchGame =
         engine::LaunchGame;
+    // Makes the tray icon with the window's tray menu; null: the desktop's tray.
+    std::function<std::unique_ptr<TrayIcon>(const QIcon&, QMenu*)> makeTray;
 };
+
+// The look of one skin: its picture prefix and the colours of the entries.
+struct SkinLook {
+    QString name;            // "skin1" or "skin2", the prefix of its pictures
+    QColor entryBackground;  // tick boxes, option buttons, the framed groups
+    QColor labelText;
+    QColor labelBackground;
+};
+SkinLook LightSkin();
+SkinLook DarkSkin();
 
 // The main window: four panels under tab heads with the catalog's check boxes and option buttons,
 // the game folder, the hotkey and the command buttons. It polls the hotkey every 100 ms and
@@ -79,6 +96,18 @@ public:
     QPushButton* launchButton() const { return launch_; }
     QPushButton* quickLoadButton() const { return quickLoad_; }
     QPushButton* browseButton() const { return browse_; }
+    QPushButton* runHiddenButton() const { return runHidden_; }
+    QPushButton* translucentButton() const { return translucent_; }
+    QPushButton* skinButton(int skin) const { return skin == 1 ? skin1_ : skin2_; }
+    QPushButton* infoButton() const { return info_; }
+    QPushButton* helpButton() const { return help_; }
+    QPushButton* checkUpdateButton() const { return checkUpdate_; }
+    QPushButton* downloadButton() const { return download_; }
+    QMenu* trayMenu() { return &trayMenu_; }
+    TrayIcon* tray() const { return tray_.get(); }
+    PreviewWindow* previewWindow() const { return preview_; }
+    const FadeModel& fade() const { return fade_; }
+    QColor labelTextColour() const;
 
     // The settings as the widgets hold them now.
     catalog::Settings currentSettings() const;
@@ -97,14 +126,35 @@ public:
     // Draws the tab heads and shows the current panel, with the active skin's pictures.
     void paintTabs();
 
+    // Starts a fade of the window's opacity towards `target` by `step` every 20 ms.
+    void startFade(int target, int step);
+    // Sets the window's opacity at once; the fade goes on from where it stood.
+    TranslucentResult makeTranslucent(int alpha);
+    void fadeTick();
+
+    void applySkin(const SkinLook& look);
+    void showPreview(catalog::LabelArray labels, int index);
+    // "Chạy ẩn": fades towards 150, hides to the tray and says so.
+    void runHidden();
+    // "Hiện chương trình": shows the window and fades it in.
+    void showFromTray();
+    void launchGameFromTray();
+    void showAbout();
+    void showHelp();
+    // "Thoát": the tray icon goes first, then the program ends.
+    void exitFromTray();
+
 signals:
     // A catalog label was clicked: label array and index, for the preview.
     void labelClicked(catalog::LabelArray labels, int index);
-    // The window should go out of sight (the launcher started).
-    void hideRequested();
+    // The user chose to end the program from the tray menu.
+    void exitRequested();
+    // The user closed the window, which ends the program.
+    void closed();
 
 protected:
     void paintEvent(QPaintEvent* event) override;
+    void closeEvent(QCloseEvent* event) override;
 
 private:
     void buildTabs();
@@ -112,6 +162,9 @@ private:
     void buildGroupPanel(QWidget* panel, catalog::GroupId group, int top);
     void buildVariantFrames(QWidget* panel);
     void buildButtons();
+    void buildTrayMenu();
+    void hideToTray();
+    QWidget* showSideWindow(QPointer<QWidget>& window, QWidget* (*create)(QWidget*));
     void initTabs();
     void loadSettings();
     void showSelection();
@@ -145,7 +198,23 @@ private:
     QPushButton* save_ = nullptr;
     QPushButton* launch_ = nullptr;
     QPushButton* quickLoad_ = nullptr;
+    QPushButton* runHidden_ = nullptr;
+    QPushButton* translucent_ = nullptr;
+    QPushButton* skin1_ = nullptr;
+    QPushButton* skin2_ = nullptr;
+    QPushButton* info_ = nullptr;
+    QPushButton* help_ = nullptr;
+    QPushButton* checkUpdate_ = nullptr;
+    QPushButton* download_ = nullptr;
     QPixmap background_;
+
+    FadeModel fade_;
+    QTimer fadeTimer_;
+    QMenu trayMenu_;
+    std::unique_ptr<TrayIcon> tray_;
+    QPointer<PreviewWindow> preview_;
+    QPointer<QWidget> about_;
+    QPointer<QWidget> helpWindow_;
 
     std::unique_ptr<engine::HotkeyPoll> poll_;
     QTimer hotkeyTimer_;

@@ -48,7 +48,12 @@ int RunWindow(int& argc, char** argv, const std::filesystem::path& toolFolder) {
     const bool globalKeys = services.keySampler != nullptr;
 
     MainWindow window(toolFolder, std::move(services));
-    QObject::connect(&window, &MainWindow::hideRequested, &window, &QWidget::showMinimized);
+    // The tool lives on in the tray while its window is hidden; closing the window or "Thoát"
+    // in the tray menu ends it.
+    QApplication::setQuitOnLastWindowClosed(false);
+    QObject::connect(&window, &MainWindow::exitRequested, &app, &QApplication::quit,
+                     Qt::QueuedConnection);
+    QObject::connect(&window, &MainWindow::closed, &app, &QApplication::quit, Qt::QueuedConnection);
 
     // Commands from later starts: "kickvane trigger" applies the sets as the hotkey does. Where
     // the command channel has no descriptor to watch, it is asked on a timer instead.
@@ -62,8 +67,8 @@ int RunWindow(int& argc, char** argv, const std::filesystem::path& toolFolder) {
     std::unique_ptr<QSocketNotifier> commandNotifier;
     QTimer commandTimer;
     if (instance->commandDescriptor() >= 0) {
-        commandNotifier = std::make_unique<QSocketNotifier>(instance->commandDescriptor(),
-                                                            QSocketNotifier::Read);
+        commandNotifier =
+            std::make_unique<QSocketNotifier>(instance->commandDescriptor(), QSocketNotifier::Read);
         QObject::connect(commandNotifier.get(), &QSocketNotifier::activated, &window, takeCommands);
     } else {
         QObject::connect(&commandTimer, &QTimer::timeout, &window, takeCommands);

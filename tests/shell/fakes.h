@@ -6,6 +6,7 @@
 
 #include "platform/keystate.h"
 #include "shell/dialogs.h"
+#include "shell/tray.h"
 
 namespace kickvane::testing {
 
@@ -49,6 +50,21 @@ public:
     std::map<int, int> samples;
     std::map<int, bool> held;
     std::map<int, bool> pressed;
+};
+
+// A tray that records whether its icon is there; `hostRunning` says whether a tray host shows it.
+class FakeTray final : public shell::TrayIcon {
+public:
+    void Add() override {
+        added = true;
+        ++adds;
+    }
+    void Remove() override { added = false; }
+    bool Shown() const override { return added && hostRunning; }
+
+    bool added = false;
+    bool hostRunning = true;
+    int adds = 0;
 };
 
 }  // namespace kickvane::testing

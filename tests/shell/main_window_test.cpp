@@ -29,6 +29,11 @@ protected:
         keys_ = keys.get();
         services.keySampler = std::move(keys);
         services.playSound = [this](const std::filesystem::path& wav) { sounds_.push_back(wav); };
+        services.makeTray = [this](const QIcon&, QMenu*) {
+            auto tray = std::make_unique<testing::FakeTray>();
+            tray_ = tray.get();
+            return tray;
+        };
         return std::make_unique<MainWindow>(tool(), std::move(services));
     }
 
@@ -48,6 +53,7 @@ protected:
     TempDir dir_;
     RecordingDialogs dialogs_;
     FakeKeySampler* keys_ = nullptr;
+    testing::FakeTray* tray_ = nullptr;
     std::vector<std::filesystem::path> sounds_;
 };
 
@@ -203,12 +209,12 @@ TEST_F(MainWindowTest, LauncherMissingShowsTheMessageAndKeepsTheWindow) {
     std::filesystem::create_directories(game());
     auto window = Open();
     window->gameFolderBox()->setText(QString::fromStdString(game().string()));
-    QSignalSpy hidden(window.get(), &MainWindow::hideRequested);
+    window->show();
     Click(window->launchButton());
     EXPECT_EQ(
         dialogs_.messages,
         QStringList{"Thông báo|Không tìm thấy Gameloader.exe hoặc đường dẫn không chính xác!"});
-    EXPECT_EQ(hidden.count(), 0);
+    EXPECT_TRUE(window->isVisible());
     EXPECT_TRUE(dialogs_.popups.isEmpty());
 }
 

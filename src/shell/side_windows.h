@@ -1,0 +1,39 @@
+#pragma once
+
+#include <QLabel>
+#include <QWidget>
+#include <filesystem>
+
+#include "catalog/catalog.h"
+
+// The small windows beside the main window: the preview picture of an entry, the information
+// window and the help window.
+namespace kickvane::shell {
+
+// The preview picture of a catalog label: "img\t<tab>_img_<index>.jpg" in the tool folder, or
+// an empty path for a label that has no preview.
+std::filesystem::path PreviewPicture(const std::filesystem::path& toolFolder,
+                                     catalog::LabelArray labels, int index);
+
+// "Xem truoc": one picture scaled to the window. A picture that cannot be loaded leaves the one
+// shown before (or a short note when there was none).
+class PreviewWindow final : public QWidget {
+    Q_OBJECT
+public:
+    explicit PreviewWindow(QWidget* owner);
+    void ShowPicture(const std::filesystem::path& file);
+    const QString& pictureFile() const { return pictureFile_; }
+
+private:
+    QLabel* picture_;
+    QString pictureFile_;
+};
+
+// "Thong tin": the tool's name and version.
+QWidget* CreateAboutWindow(QWidget* owner);
+
+// "Huong dan": the user guide.
+QWidget* CreateHelpWindow(QWidget* owner);
+QString HelpText();
+
+}  // namespace kickvane::shell

@@ -1,0 +1,248 @@
+// The window's shell: fade, tray icon and menu, small buttons, skins and previews.
+#include <gtest/gtest.h>
+
+#include <QDir>
+#include <QSignalSpy>
+#include <QTest>
+
+#include "fakes.h"
+#include "shell/main_window.h"
+#include "support/temp_dir.h"
+
+namespace kickvane::shell {
+namespace {
+
+using testing::FakeTray;
+using testing::RecordingDialogs;
+using testing::TempDir;
+using testing::WriteFile;
+
+class ShellPartsTest : public ::testing::Test {
+protected:
+    std::unique_ptr<MainWindow> Open(std::filesystem::path folder = {}) {
+        ShellServices services;
+        services.dialogs = &dialogs_;
+        services.makeTray = [this](const QIcon&, QMenu*) {
+            auto tray = std::make_unique<FakeTray>();
+            tray->hostRunning = hostRunning_;
+            tray_ = tray.get();
+            return tray;
+        };
+        services.launchGame = [this](std::string_view, engine::EngineUi&) {
+            ++launches_;
+            return engine::LaunchResult::Started;
+        };
+        auto window = std::make_unique<MainWindow>(folder.empty() ? dir_.path() : folder,
+                                                   std::move(services));
+        window->show();
+        return window;
+    }
+
+    void Click(QWidget* widget) { QTest::mouseClick(widget, Qt::LeftButton, {}, QPoint(5, 5)); }
+
+    QAction* TrayEntry(MainWindow& window, const QString& text) {
+        for (QAction* action : window.trayMenu()->actions()) {
+            if (action->text() == text) {
+                return action;
+            }
+        }
+        return nullptr;
+    }
+
+    static void FinishFade(MainWindow& window) {
+        for (int i = 0; i < 100 && window.fade().running(); ++i) {
+            window.fadeTick();
+        }
+    }
+
+    static void SavePicture(QWidget& widget, const QString& name) {
+        QDir().mkpath(QStringLiteral(KICKVANE_ARTIFACTS));
+        widget.grab().save(QStringLiteral(KICKVANE_ARTIFACTS "/") + name);
+    }
+
+    static std::filesystem::path WritePicture(const std::filesystem::path& file, QColor colour) {
+        std::filesystem::create_directories(file.parent_path());
+        QImage image(40, 20, QImage::Format_RGB32);
+        image.fill(colour);
+        image.save(QString::fromStdString(file.string()), "JPG");
+        return file;
+    }
+
+    TempDir dir_;
+    RecordingDialogs dialogs_;
+    FakeTray* tray_ = nullptr;
+    bool hostRunning_ = true;
+    int launches_ = 0;
+};
+
+TEST_F(ShellPartsTest, StartUpFadesInToTwoFortyAndTranslucencyKeepsTheFadesPlace) {
+    auto window = Open();
+    EXPECT_TRUE(window->fade().running());
+    FinishFade(*window);
+    EXPECT_EQ(window->fade().alpha(), 240);
+
+    EXPECT_EQ(window->makeTranslucent(256), TranslucentResult::OutOfRange);
+    EXPECT_EQ(window->makeTranslucent(-1), TranslucentResult::OutOfRange);
+    Click(window->translucentButton());
+    EXPECT_EQ(window->fade().alpha(), 240);  // "Trans" does not move the fade
+    TrayEntry(*window, "Hiện chương trình")->trigger();
+    window->fadeTick();
+    EXPECT_EQ(window->fade().alpha(), 255);  // from 240, not from 160
+}
+
+TEST_F(ShellPartsTest, TrayMenuHasItsFiveEntriesAndTheirActions) {
+    auto window = Open();
+    QStringList entries;
+    for (QAction* action : window->trayMenu()->actions()) {
+        entries << action->text();
+    }
+    EXPECT_EQ(entries.join('|'), "Khởi động FIFA|Hiện chương trình|Nạp nhanh|Thông tin|Thoát");
+    EXPECT_TRUE(tray_->added);
+
+    // "Chạy ẩn": fade towards 150, out of sight, popup; the icon stays.
+    FinishFade(*window);
+    Click(window->runHiddenButton());
+    EXPECT_FALSE(window->isVisible());
+    EXPECT_TRUE(tray_->added);
+    EXPECT_EQ(dialogs_.popups, QStringList{"Ẩn xuống khay hệ thống!|2"});
+    FinishFade(*window);
+    EXPECT_EQ(window->fade().alpha(), 150);
+
+    // Starting the game from the tray leaves the window as it is and shows no popup.
+    TrayEntry(*window, "Khởi động FIFA")->trigger();
+    EXPECT_EQ(launches_, 1);
+    EXPECT_FALSE(window->isVisible());
+    EXPECT_EQ(dialogs_.popups.size(), 1);
+
+    TrayEntry(*window, "Hiện chương trình")->trigger();
+    EXPECT_TRUE(window->isVisible());
+    TrayEntry(*window, "Khởi động FIFA")->trigger();
+    EXPECT_TRUE(window->isVisible());
+
+    // The launcher button hides the window to the tray and says so.
+    Click(window->launchButton());
+    EXPECT_FALSE(window->isVisible());
+    EXPECT_EQ(dialogs_.popups.last(), "Ẩn xuống khay hệ thống!|2");
+
+    TrayEntry(*window, "Thông tin")->trigger();
+    QWidget* about = nullptr;
+    for (QWidget* widget : QApplication::topLevelWidgets()) {
+        if (widget->windowTitle() == "Thong tin" && widget->isVisible()) {
+            about = widget;
+        }
+    }
+    ASSERT_NE(about, nullptr);
+    EXPECT_EQ(about->parentWidget(), window.get());
+
+    QSignalSpy exit(window.get(), &MainWindow::exitRequested);
+    TrayEntry(*window, "Thoát")->trigger();
+    EXPECT_FALSE(tray_->added);
+    EXPECT_EQ(exit.count(), 1);
+}
+
+TEST_F(ShellPartsTest, WithoutATrayHostHidingMinimisesSoTheWindowStaysReachable) {
+    hostRunning_ = false;
+    auto window = Open();
+    Click(window->runHiddenButton());
+    EXPECT_TRUE(window->isVisible());
+    EXPECT_TRUE(window->isMinimized());
+}
+
+TEST_F(ShellPartsTest, ClosingTheWindowRemovesTheTrayIcon) {
+    auto window = Open();
+    QSignalSpy closed(window.get(), &MainWindow::closed);
+    window->close();
+    EXPECT_FALSE(tray_->added);
+    EXPECT_EQ(closed.count(), 1);
+}
+
+TEST_F(ShellPartsTest, SkinsRecolourTheEntriesAndUseTheirPicturesKeepingTheTab) {
+    for (const char* name : {"skin1_selected", "skin1_unselect", "skin1_panel", "skin2_selected",
+                             "skin2_unselect", "skin2_bg"}) {
+        WritePicture(dir_ / "skin" / (std::string(name) + ".jpg"), Qt::darkGray);
+    }
+    auto window = Open();
+    Click(window->tabHead(2));
+    Click(window->skinButton(2));
+    EXPECT_EQ(window->hiddenTexts().skn, "skin2");
+    EXPECT_EQ(window->currentTab(), 2);
+    EXPECT_EQ(window->labelTextColour(), QColor(Qt::white));
+    EXPECT_EQ(window->optionLabel(catalog::OptionArray::UniOption1, 10)
+                  ->palette()
+                  .color(QPalette::WindowText),
+              QColor(Qt::white));
+    EXPECT_EQ(window->categoryCheck(0)->palette().color(QPalette::Window),
+              QColor(0x40, 0x40, 0x40));
+    EXPECT_TRUE(window->tabHead(2)->pictureFile().endsWith("skin2_selected.jpg"));
+    EXPECT_TRUE(window->tabHead(0)->pictureFile().endsWith("skin2_unselect.jpg"));
+    EXPECT_EQ(window->tabHead(0)->background(), QColor(0xE0, 0xE0, 0xE0));
+    // skin2_panel.jpg is missing: the panels keep skin 1's picture.
+    EXPECT_TRUE(window->panel(2)->pictureFile().endsWith("skin1_panel.jpg"));
+    EXPECT_EQ(dialogs_.popups, QStringList{"Đã thay đổi giao diện!|1"});
+
+    Click(window->tabHead(1));
+    EXPECT_TRUE(window->tabHead(1)->pictureFile().endsWith("skin2_selected.jpg"));
+    Click(window->skinButton(1));
+    EXPECT_EQ(window->labelTextColour(), QColor(Qt::black));
+    EXPECT_EQ(window->hiddenTexts().skn, "skin1");
+    EXPECT_EQ(dialogs_.popups.size(), 2);
+}
+
+TEST_F(ShellPartsTest, LabelClicksShowTheirPreviewInOneSharedWindow) {
+    WritePicture(dir_ / "img/t2_img_3.jpg", Qt::red);
+    WritePicture(dir_ / "img/t4_img_10.jpg", Qt::green);
+    WritePicture(dir_ / "img/t1_img_12.jpg", Qt::blue);
+    auto window = Open();
+
+    Click(window->categoryLabel(12));
+    ASSERT_NE(window->previewWindow(), nullptr);
+    EXPECT_TRUE(window->previewWindow()->pictureFile().endsWith("img/t1_img_12.jpg"));
+    PreviewWindow* preview = window->previewWindow();
+    Click(window->tabHead(1));
+    Click(window->optionLabel(catalog::OptionArray::UniOption, 3));
+    EXPECT_EQ(window->previewWindow(), preview);
+    EXPECT_TRUE(preview->pictureFile().endsWith("img/t2_img_3.jpg"));
+    EXPECT_EQ(preview->windowTitle(), "Xem truoc");
+
+    Click(window->tabHead(3));
+    Click(window->optionLabel(catalog::OptionArray::UniOption1, 10));
+    EXPECT_TRUE(preview->pictureFile().endsWith("img/t4_img_10.jpg"));
+    // No t4_img_9.jpg: the window keeps the picture it shows.
+    Click(window->optionLabel(catalog::OptionArray::UniOption1, 9));
+    EXPECT_TRUE(preview->pictureFile().endsWith("img/t4_img_10.jpg"));
+    EXPECT_TRUE(preview->isVisible());
+
+    EXPECT_EQ(PreviewPicture(dir_.path(), catalog::LabelArray::UniLabel3, 9).filename(),
+              "t4_img_9.jpg");
+    EXPECT_TRUE(PreviewPicture(dir_.path(), catalog::LabelArray::UniLabel1, 4).empty());
+}
+
+TEST_F(ShellPartsTest, HelpWindowShowsTheGuideVerbatim) {
+    auto window = Open();
+    Click(window->helpButton());
+    const QString help = HelpText();
+    EXPECT_TRUE(help.startsWith("Hướng dẫn sử dụng:\r\n 1. Tại thẻ đầu tiên"));
+    EXPECT_TRUE(help.contains("\r\n\r\nHướng dẫn sử dụng công cụ Nạp nhanh:\r\n"));
+    EXPECT_TRUE(help.endsWith("lựa chọn Bóng phải để ở mặc định"));
+}
+
+// Pictures of the finished window for people to look at, from the tool folder the build laid out.
+TEST_F(ShellPartsTest, ScreenshotsOfBothSkinsAndAPreview) {
+    const std::filesystem::path tool = KICKVANE_TOOL_DIR;
+    if (!std::filesystem::exists(tool / "skin/skin2_bg.jpg")) {
+        GTEST_SKIP() << "the artwork is not built";
+    }
+    auto window = Open(tool);
+    FinishFade(*window);
+    SavePicture(*window, "window-skin1.png");
+    window->applySkin(DarkSkin());
+    SavePicture(*window, "window-skin2.png");
+    Click(window->tabHead(1));
+    Click(window->optionLabel(catalog::OptionArray::UniOption, 3));
+    ASSERT_NE(window->previewWindow(), nullptr);
+    SavePicture(*window->previewWindow(), "preview-ball-3.png");
+    EXPECT_FALSE(window->previewWindow()->pictureFile().isEmpty());
+}
+
+}  // namespace
+}  // namespace kickvane::shell
