@@ -36,6 +36,19 @@ QIcon ToolIcon(const std::filesystem::path& toolFolder) {
             icon.addFile(QString::fromStdString(file.string()));
         }
     }
+    if (icon.isNull()) {
+        // Without its icon files the tool still needs an icon, or the tray would show nothing.
+        QPixmap drawn(32, 32);
+        drawn.fill(Qt::transparent);
+        QPainter painter(&drawn);
+        painter.setRenderHint(QPainter::Antialiasing);
+        painter.setBrush(QColor(0x2E, 0x8B, 0x3E));
+        painter.setPen(Qt::NoPen);
+        painter.drawEllipse(1, 1, 30, 30);
+        painter.setBrush(Qt::white);
+        painter.drawEllipse(8, 8, 16, 16);
+        icon.addPixmap(drawn);
+    }
     return icon;
 }
 

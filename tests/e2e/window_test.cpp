@@ -2,6 +2,8 @@
 // a second start, and the trigger command.
 #include <gtest/gtest.h>
 
+#include <sstream>
+
 #include "support/temp_dir.h"
 #include "support/trees.h"
 #include "x_display.h"
@@ -128,6 +130,78 @@ TEST_F(WindowTest, TriggerCommandRunsThePatchesInTheRunningCopy) {
     ASSERT_TRUE(WindowShown(kWindowTitle));
     EXPECT_EQ(ChildProcess({KICKVANE_BINARY, "trigger"}).Wait(), 0);
     EXPECT_TRUE(WaitFor([&] { return fs::exists(applied()); }));
+}
+
+// The tray icon of the running window: its 22-pixel window of class "kickvane", docked in a tray.
+std::string FindTrayIcon() {
+    std::istringstream ids(Capture("xdotool search --classname '^kickvane$' 2>/dev/null"));
+    for (std::string id; std::getline(ids, id);) {
+        if (Capture("xdotool getwindowgeometry " + id).find("Geometry: 22x22") !=
+            std::string::npos) {
+            return id;
+        }
+    }
+    return {};
+}
+
+struct WindowSize {
+    int width = 0;
+    int height = 0;
+};
+
+WindowSize SizeOf(const std::string& window) {
+    WindowSize size;
+    const std::string geometry = Capture("xdotool getwindowgeometry " + window);
+    std::sscanf(geometry.substr(geometry.find("Geometry: ") + 10).c_str(), "%dx%d", &size.width,
+                &size.height);
+    return size;
+}
+
+// The open tray menu: a visible window of the tool with its five entries stacked.
+std::string FindTrayMenu() {
+    std::istringstream ids(
+        Capture("xdotool search --onlyvisible --classname '^kickvane$' 2>/dev/null"));
+    for (std::string id; std::getline(ids, id);) {
+        const WindowSize size = SizeOf(id);
+        if (size.height > 60 && size.height < 300 && size.width < 400 &&
+            Capture("xdotool getwindowname " + id).find("Kickvane v2.0") == std::string::npos) {
+            return id;
+        }
+    }
+    return {};
+}
+
+bool WindowVisible(const std::string& title) {
+    return !Capture("xdotool search --onlyvisible --name '^" + title + "$' 2>/dev/null").empty();
+}
+
+TEST_F(WindowTest, TrayIconAppearsWhenATrayStartsAndBringsTheHiddenWindowBack) {
+    if (Capture("command -v trayer").empty()) {
+        GTEST_SKIP() << "no tray host here";
+    }
+    WriteSettings("F7");
+    auto kickvane = StartKickvane();
+    ASSERT_TRUE(WindowShown(kWindowTitle)) << ReadText(dir_ / "kickvane.log");
+    // The tray host starts after the tool, as it may when the desktop comes up.
+    ChildProcess trayer(
+        {"trayer", "--edge", "top", "--align", "right", "--width", "10", "--height", "24"});
+    ASSERT_TRUE(WaitFor([] { return !FindTrayIcon().empty(); })) << Capture("xwininfo -root -tree");
+
+    // "Chạy ẩn" under the tab heads hides the window; the hotkey still works meanwhile.
+    Capture("xdotool mousemove --window " + FindWindow(kWindowTitle) + " 50 275 click 1");
+    ASSERT_TRUE(WaitFor([] { return !WindowVisible(kWindowTitle); }));
+    Capture("xdotool key F7");
+    EXPECT_TRUE(WaitFor([&] { return fs::exists(applied()); }));
+
+    // The tray menu's second entry, "Hiện chương trình", brings it back.
+    Capture("xdotool mousemove --window " + FindTrayIcon() + " 10 10 click 3");
+    std::string menu;
+    ASSERT_TRUE(WaitFor([&] { return !(menu = FindTrayMenu()).empty(); }));
+    const WindowSize size = SizeOf(menu);
+    Capture("xdotool mousemove --window " + menu + " " + std::to_string(size.width / 2) + " " +
+            std::to_string(size.height * 3 / 10) + " click 1");
+    EXPECT_TRUE(WaitFor([] { return WindowVisible(kWindowTitle); }));
+    EXPECT_TRUE(kickvane->Running());
 }
 
 }  // namespace
