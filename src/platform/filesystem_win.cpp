@@ -1,0 +1,101 @@
+// File system backend for Windows, where names are case-insensitive already and the game's
+// folders are native paths.
+#include <windows.h>
+
+#include <fstream>
+#include <random>
+
+#include "platform/filesystem.h"
+
+namespace kickvane::platform {
+
+namespace {
+
+std::string LastErrorText() {
+    return std::error_code(static_cast<int>(::GetLastError()), std::system_category()).message();
+}
+
+// A fresh name beside `target` for the data of a replacement.
+fs::path TemporaryBeside(const fs::path& target) {
+    std::random_device random;
+    return target.parent_path() /
+           (L"." + target.filename().wstring() + L".kv-" + std::to_wstring(random()));
+}
+
+Status MoveOver(const fs::path& from, const fs::path& to) {
+    if (!::MoveFileExW(from.c_str(), to.c_str(), MOVEFILE_REPLACE_EXISTING | MOVEFILE_WRITE_THROUGH)) {
+        const std::string error = LastErrorText();
+        std::error_code ignored;
+        fs::remove(from, ignored);
+        return Status::Fail("cannot replace " + to.string() + ": " + error);
+    }
+    return Status::Ok();
+}
+
+}  // namespace
+
+fs::path ResolveCaseInsensitive(const fs::path& path) { return path; }
+
+Status MakeDirectory(const fs::path& path) {
+    if (!::CreateDirectoryW(path.c_str(), nullptr)) {
+        return Status::Fail("cannot create folder " + path.string() + ": " + LastErrorText());
+    }
+    return Status::Ok();
+}
+
+bool IsUpToDateCopy(const fs::path& source, const fs::path& target) {
+    std::error_code ec;
+    const auto sourceSize = fs::file_size(source, ec);
+    if (ec || !fs::is_regular_file(target, ec)) {
+        return false;
+    }
+    const auto targetSize = fs::file_size(target, ec);
+    return !ec && sourceSize == targetSize &&
+           fs::last_write_time(source, ec) == fs::last_write_time(target, ec) && !ec;
+}
+
+Status ReplaceFile(const fs::path& source, const fs::path& target) {
+    std::error_code ec;
+    if (!fs::is_regular_file(source, ec)) {
+        return Status::Fail("not a file: " + source.string());
+    }
+    const fs::path temporary = TemporaryBeside(target);
+    if (!::CopyFileW(source.c_str(), temporary.c_str(), TRUE)) {
+        const std::string error = LastErrorText();
+        fs::remove(temporary, ec);
+        return Status::Fail("cannot copy to " + target.string() + ": " + error);
+    }
+    // CopyFileW keeps the source's modification time, which the quick check relies on.
+    return MoveOver(temporary, target);
+}
+
+Status WriteFileAtomically(const fs::path& path, std::string_view content) {
+    const fs::path temporary = TemporaryBeside(path);
+    {
+        std::ofstream out(temporary, std::ios::binary | std::ios::trunc);
+        out.write(content.data(), static_cast<std::streamsize>(content.size()));
+        out.flush();
+        if (!out) {
+            std::error_code ignored;
+            fs::remove(temporary, ignored);
+            return Status::Fail("cannot write " + path.string());
+        }
+    }
+    return MoveOver(temporary, path);
+}
+
+fs::path ProgramFolder() {
+    std::wstring buffer(MAX_PATH, L'\0');
+    for (;;) {
+        const DWORD length = ::GetModuleFileNameW(nullptr, buffer.data(), static_cast<DWORD>(buffer.size()));
+        if (length < buffer.size()) {
+            buffer.resize(length);
+            return fs::path(buffer).parent_path();
+        }
+        buffer.resize(buffer.size() * 2);
+    }
+}
+
+fs::path NativePathFromUserText(std::string_view text) { return fs::u8path(text); }
+
+}  // namespace kickvane::platform
