@@ -96,6 +96,8 @@ fs::path ProgramFolder() {
     }
 }
 
-fs::path NativePathFromUserText(std::string_view text) { return fs::u8path(text); }
+fs::path NativePathFromUserText(std::string_view text) {
+    return fs::path(std::u8string(text.begin(), text.end()));
+}
 
 }  // namespace kickvane::platform
