@@ -940,11 +940,23 @@ void SceneKits(QPainter& p) {
     DrawShirt(p, QPointF(175, 160), QColor(0xC8, 0x1E, 0x2A), Qt::white, 10, Qt::white);
     DrawShirt(p, QPointF(421, 160), QColor(0xF4, 0xF4, 0xF4), QColor(0x1A, 0x2A, 0x55), 7,
               QColor(0x1A, 0x2A, 0x55));
-    p.setPen(Qt::NoPen);
-    p.setBrush(Qt::white);
-    p.drawRoundedRect(QRectF(140, 268, 70, 44), 6, 6);
-    p.setBrush(QColor(0x1A, 0x2A, 0x55));
-    p.drawRoundedRect(QRectF(386, 268, 70, 44), 6, 6);
+    // Shorts under each shirt.
+    const std::array<std::pair<double, QColor>, 2> shorts{
+        {{175.0, Qt::white}, {421.0, QColor(0x1A, 0x2A, 0x55)}}};
+    for (const auto& [x, colour] : shorts) {
+        QPainterPath path;
+        path.moveTo(x - 40, 266);
+        path.lineTo(x + 40, 266);
+        path.lineTo(x + 46, 316);
+        path.lineTo(x + 6, 316);
+        path.lineTo(x, 296);
+        path.lineTo(x - 6, 316);
+        path.lineTo(x - 46, 316);
+        path.closeSubpath();
+        p.setPen(QPen(colour.darker(140), 2));
+        p.setBrush(colour);
+        p.drawPath(path);
+    }
 }
 
 void SceneNet(QPainter& p) {

@@ -189,25 +189,28 @@ QImage Icon(int size) {
         DrawEmblem(p, QRectF(0, 0, size, size));
         return image;
     }
+    // At 16 pixels: a bold roundel, a white ball and a few dark patches; seams would only blur.
     const QPointF c(size / 2.0, size / 2.0);
     p.setPen(Qt::NoPen);
     p.setBrush(QColor(0x1F, 0x8A, 0x4F));
     p.drawEllipse(c, size / 2.0, size / 2.0);
-    p.setBrush(Qt::white);
-    p.drawEllipse(c, size * 0.34, size * 0.34);
-    p.setBrush(QColor(0x1A, 0x1A, 0x1A));
+    QPainterPath ball;
+    ball.addEllipse(c, size * 0.36, size * 0.36);
+    p.fillPath(ball, Qt::white);
+    p.setClipPath(ball);
+    const QColor patch(0x1A, 0x1A, 0x1A);
     QPolygonF pentagon;
     for (int i = 0; i < 5; ++i) {
         const double a = -std::numbers::pi / 2 + i * 2 * std::numbers::pi / 5;
-        pentagon << c + QPointF(std::cos(a), std::sin(a)) * (size * 0.13);
+        pentagon << c + QPointF(std::cos(a), std::sin(a)) * (size * 0.14);
+        p.setBrush(patch);
+        p.drawEllipse(
+            c + QPointF(std::cos(a + std::numbers::pi / 5), std::sin(a + std::numbers::pi / 5)) *
+                    (size * 0.38),
+            size * 0.1, size * 0.1);
     }
+    p.setBrush(patch);
     p.drawPolygon(pentagon);
-    p.setPen(QPen(QColor(0x1A, 0x1A, 0x1A), 1));
-    for (int i = 0; i < 5; ++i) {
-        const double a = -std::numbers::pi / 2 + i * 2 * std::numbers::pi / 5;
-        p.drawLine(c + QPointF(std::cos(a), std::sin(a)) * (size * 0.13),
-                   c + QPointF(std::cos(a), std::sin(a)) * (size * 0.33));
-    }
     return image;
 }
 
