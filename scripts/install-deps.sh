@@ -8,7 +8,7 @@ packages=(
   cmake ninja-build g++ pkg-config clang-format
   # libraries
   qt6-base-dev libqt6network6 libgl-dev
-  libx11-dev libxi-dev libcanberra-dev
+  libx11-dev libxi-dev libxtst-dev libcanberra-dev
   libgtest-dev libgmock-dev
   # run and test: virtual X server, key presses, a tray host, screenshots
   xvfb xauth xdotool x11-utils trayer imagemagick
