@@ -1,0 +1,493 @@
+#include "shell/update_check.h"
+
+#include <QNetworkAccessManager>
+#include <QNetworkReply>
+#include <QNetworkRequest>
+#include <QPushButton>
+#include <QWidget>
+#include <utility>
+
+#include "catalog/ini.h"
+#include "catalog/settings.h"
+#include "shell/message_box.h"
+#include "text/vni.h"
+
+#ifndef KICKVANE_UPDATE_HOST
+#define KICKVANE_UPDATE_HOST "http://kickvane.example.net/"
+#endif
+
+namespace kickvane::shell {
+
+namespace {
+
+// Strict UTF-8: no overlong forms, no surrogates, nothing above U+10FFFF.
+bool IsValidUtf8(std::string_view text) {
+    size_t i = 0;
+    while (i < text.size()) {
+        const auto lead = static_cast<unsigned char>(text[i]);
+        size_t length = 1;
+        char32_t code = lead;
+        char32_t smallest = 0;
+        if (lead >= 0x80) {
+            if ((lead & 0xE0) == 0xC0) {
+                length = 2;
+                code = lead & 0x1F;
+                smallest = 0x80;
+            } else if ((lead & 0xF0) == 0xE0) {
+                length = 3;
+                code = lead & 0x0F;
+                smallest = 0x800;
+            } else if ((lead & 0xF8) == 0xF0) {
+                length = 4;
+                code = lead & 0x07;
+                smallest = 0x10000;
+            } else {
+                return false;
+            }
+            if (text.size() - i < length) {
+                return false;
+            }
+            for (size_t k = 1; k < length; ++k) {
+                const auto next = static_cast<unsigned char>(text[i + k]);
+                if ((next & 0xC0) != 0x80) {
+                    return false;
+                }
+                code = (code << 6) | (next & 0x3F);
+            }
+            if (code < smallest || code > 0x10FFFF || (code >= 0xD800 && code <= 0xDFFF)) {
+                return false;
+            }
+        }
+        i += length;
+    }
+    return true;
+}
+
+// Windows-1252 at 0x80-0x9F; the five unassigned bytes keep their value as C1 controls.
+// 0xA0-0xFF equal Latin-1.
+constexpr std::array<char16_t, 32> kCp1252High = {
+    0x20AC, 0x0081, 0x201A, 0x0192, 0x201E, 0x2026, 0x2020, 0x2021, 0x02C6, 0x2030, 0x0160,
+    0x2039, 0x0152, 0x008D, 0x017D, 0x008F, 0x0090, 0x2018, 0x2019, 0x201C, 0x201D, 0x2022,
+    0x2013, 0x2014, 0x02DC, 0x2122, 0x0161, 0x203A, 0x0153, 0x009D, 0x017E, 0x0178,
+};
+
+std::string DecodeToUtf8(std::string_view bytes) {
+    if (IsValidUtf8(bytes)) {
+        return std::string(bytes);
+    }
+    std::string out;
+    out.reserve(bytes.size() * 2);
+    for (const char c : bytes) {
+        const auto byte = static_cast<unsigned char>(c);
+        const char32_t code = byte >= 0x80 && byte < 0xA0 ? kCp1252High[byte - 0x80] : byte;
+        if (code < 0x80) {
+            out += static_cast<char>(code);
+        } else if (code < 0x800) {
+            out += static_cast<char>(0xC0 | (code >> 6));
+            out += static_cast<char>(0x80 | (code & 0x3F));
+        } else {
+            out += static_cast<char>(0xE0 | (code >> 12));
+            out += static_cast<char>(0x80 | ((code >> 6) & 0x3F));
+            out += static_cast<char>(0x80 | (code & 0x3F));
+        }
+    }
+    return out;
+}
+
+bool IsLinkBlank(char c) {
+    return c == ' ' || c == '\t' || c == '\r' || c == '\n' || c == '\v' || c == '\f';
+}
+
+char AsciiLower(char c) {
+    return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
+}
+
+bool IsWebScheme(const QString& scheme) {
+    return scheme.compare(u"http", Qt::CaseInsensitive) == 0 ||
+           scheme.compare(u"https", Qt::CaseInsensitive) == 0;
+}
+
+int DefaultPort(const QString& scheme) {
+    return scheme.compare(u"https", Qt::CaseInsensitive) == 0 ? 443 : 80;
+}
+
+QString Vni(std::string_view text) {
+    return QString::fromStdString(text::VniToUnicodeUtf8(text));
+}
+
+const QString kTimedOut = QStringLiteral("máy chủ không trả lời kịp");
+const QString kTooLarge = QStringLiteral("câu trả lời của máy chủ quá lớn");
+const QString kRedirectRefused = QStringLiteral("máy chủ chuyển sang một địa chỉ không được phép");
+const QString kTooManyRedirects = QStringLiteral("máy chủ chuyển hướng quá nhiều lần");
+const QString kBadHost = QStringLiteral("địa chỉ máy chủ cập nhật không hợp lệ");
+
+}  // namespace
+
+std::string ReadFetchedText(std::string_view bytes) {
+    const std::string decoded = DecodeToUtf8(bytes);
+    std::string text;
+    text.reserve(decoded.size() + 2);
+    size_t start = 0;
+    for (size_t i = 0; i < decoded.size(); ++i) {
+        if (decoded[i] != '\r') {
+            continue;
+        }
+        text.append(decoded, start, i - start);
+        text += "\r\n";
+        if (i + 1 < decoded.size() && decoded[i + 1] == '\n') {
+            ++i;
+        }
+        start = i + 1;
+    }
+    if (start < decoded.size()) {
+        text.append(decoded, start);
+        text += "\r\n";
+    }
+    return text;
+}
+
+bool IsCurrentVersion(std::string_view text) {
+    return text.size() == kToolVersion.size() + 2 && text.starts_with(kToolVersion) &&
+           text.ends_with("\r\n");
+}
+
+std::optional<std::string> DownloadLink(std::string_view text) {
+    while (!text.empty() && IsLinkBlank(text.front())) {
+        text.remove_prefix(1);
+    }
+    while (!text.empty() && IsLinkBlank(text.back())) {
+        text.remove_suffix(1);
+    }
+    // Control characters inside mean several lines or a forged address; neither is one link.
+    for (const char c : text) {
+        const auto byte = static_cast<unsigned char>(c);
+        if (byte < 0x20 || byte == 0x7F) {
+            return std::nullopt;
+        }
+    }
+    const size_t separator = text.find("://");
+    if (separator == std::string_view::npos) {
+        return std::nullopt;
+    }
+    std::string scheme;
+    for (const char c : text.substr(0, separator)) {
+        scheme += AsciiLower(c);
+    }
+    if (scheme != "http" && scheme != "https") {
+        return std::nullopt;
+    }
+    std::string_view authority = text.substr(separator + 3);
+    authority = authority.substr(0, authority.find_first_of("/?#"));
+    if (authority.find_first_of("\\ ") != std::string_view::npos) {
+        return std::nullopt;
+    }
+    if (const size_t at = authority.rfind('@'); at != std::string_view::npos) {
+        authority.remove_prefix(at + 1);
+    }
+    size_t hostLength = authority.find(':');
+    if (!authority.empty() && authority.front() == '[') {
+        const size_t close = authority.find(']');
+        hostLength = close == std::string_view::npos || close < 2 ? 0 : close + 1;
+    }
+    if (authority.substr(0, hostLength).empty()) {
+        return std::nullopt;
+    }
+    return std::string(text);
+}
+
+UpdateCheck::UpdateCheck(Options options, QObject* parent)
+    : QObject(parent), options_(std::move(options)), network_(new QNetworkAccessManager(this)) {
+    for (const File file : {File::Version, File::Link}) {
+        Transfer& t = transfer(file);
+        t.deadline.setSingleShot(true);
+        connect(&t.deadline, &QTimer::timeout, this,
+                [this, file] { fail(file, transfer(file).earlyFailure.value_or(kTimedOut)); });
+    }
+}
+
+UpdateCheck::~UpdateCheck() {
+    release(File::Version);
+    release(File::Link);
+}
+
+QUrl UpdateCheck::DefaultHost() {
+    const QString fromEnvironment = qEnvironmentVariable("KICKVANE_UPDATE_HOST").trimmed();
+    return QUrl(fromEnvironment.isEmpty() ? QString::fromUtf8(KICKVANE_UPDATE_HOST)
+                                          : fromEnvironment);
+}
+
+UpdateCheck::Options UpdateCheck::DefaultOptions() {
+    Options options;
+    options.host = DefaultHost();
+    return options;
+}
+
+bool UpdateCheck::AllowsRedirect(const QUrl& origin, const QUrl& current, const QUrl& target) {
+    if (!target.isValid() || !IsWebScheme(target.scheme()) || target.host().isEmpty() ||
+        target.host().compare(origin.host(), Qt::CaseInsensitive) != 0) {
+        return false;
+    }
+    const bool toHttps = target.scheme().compare(u"https", Qt::CaseInsensitive) == 0;
+    if (current.scheme().compare(u"https", Qt::CaseInsensitive) == 0 && !toHttps) {
+        return false;  // never back to plain http
+    }
+    if (target.scheme().compare(origin.scheme(), Qt::CaseInsensitive) == 0) {
+        return target.port(DefaultPort(target.scheme())) ==
+               origin.port(DefaultPort(origin.scheme()));
+    }
+    // From http to https on the same host: the secure service sits on its usual port.
+    return toHttps && target.port(443) == 443;
+}
+
+QUrl UpdateCheck::address(File file) const {
+    QUrl url;
+    url.setScheme(options_.host.scheme());
+    url.setAuthority(options_.host.authority());
+    url.setPath(file == File::Version ? QStringLiteral("/v") : QStringLiteral("/vlink"));
+    return url;
+}
+
+bool UpdateCheck::isFetching(File file) const {
+    return transfer(file).deadline.isActive();
+}
+
+void UpdateCheck::fetch(File file) {
+    release(file);
+    Transfer& t = transfer(file);
+    const QUrl url = address(file);
+    t.deadline.start(options_.timeout);
+    if (!url.isValid() || !IsWebScheme(url.scheme()) || url.host().isEmpty()) {
+        // Reported from the event loop like every other outcome.
+        t.earlyFailure = kBadHost;
+        t.deadline.start(0);
+        return;
+    }
+    request(file, url);
+}
+
+void UpdateCheck::request(File file, const QUrl& url) {
+    QNetworkRequest request(url);
+    // A stale answer must never pass for a fresh one, and nothing is kept on disk.
+    request.setAttribute(QNetworkRequest::CacheLoadControlAttribute,
+                         QNetworkRequest::AlwaysNetwork);
+    request.setAttribute(QNetworkRequest::CacheSaveControlAttribute, false);
+    // Redirects are followed here, not by Qt, so that each one is checked and counted.
+    request.setAttribute(QNetworkRequest::RedirectPolicyAttribute,
+                         QNetworkRequest::ManualRedirectPolicy);
+
+    Transfer& t = transfer(file);
+    QNetworkReply* reply = network_->get(request);
+    t.reply = reply;
+    t.current = url;
+    t.body.clear();
+    connect(reply, &QNetworkReply::metaDataChanged, this,
+            [this, file, reply] { onMetaData(file, reply); });
+    connect(reply, &QNetworkReply::readyRead, this, [this, file, reply] { onData(file, reply); });
+    connect(reply, &QNetworkReply::finished, this,
+            [this, file, reply] { onFinished(file, reply); });
+}
+
+void UpdateCheck::onMetaData(File file, QNetworkReply* reply) {
+    if (transfer(file).reply != reply) {
+        return;
+    }
+    const int status = reply->attribute(QNetworkRequest::HttpStatusCodeAttribute).toInt();
+    const QVariant length = reply->header(QNetworkRequest::ContentLengthHeader);
+    if (status >= 200 && status < 300 && length.isValid() &&
+        length.toLongLong() > options_.maxBytes) {
+        fail(file, kTooLarge);
+    }
+}
+
+void UpdateCheck::onData(File file, QNetworkReply* reply) {
+    Transfer& t = transfer(file);
+    if (t.reply != reply) {
+        return;
+    }
+    t.body += reply->readAll();
+    if (t.body.size() > options_.maxBytes) {
+        fail(file, kTooLarge);
+    }
+}
+
+void UpdateCheck::follow(File file, const QUrl& target) {
+    Transfer& t = transfer(file);
+    const QUrl next = t.current.resolved(target);
+    if (++t.redirects > kMaxRedirects) {
+        fail(file, kTooManyRedirects);
+    } else if (!AllowsRedirect(address(file), t.current, next)) {
+        fail(file, kRedirectRefused);
+    } else {
+        drop(t);
+        request(file, next);
+    }
+}
+
+void UpdateCheck::onFinished(File file, QNetworkReply* reply) {
+    Transfer& t = transfer(file);
+    if (t.reply != reply) {
+        return;
+    }
+    t.body += reply->readAll();
+    if (t.body.size() > options_.maxBytes) {
+        fail(file, kTooLarge);
+        return;
+    }
+    const QVariant status = reply->attribute(QNetworkRequest::HttpStatusCodeAttribute);
+    const int code = status.toInt();
+    const QVariant target = reply->attribute(QNetworkRequest::RedirectionTargetAttribute);
+    if (code >= 300 && code < 400 && target.isValid()) {
+        follow(file, target.toUrl());
+    } else if (status.isValid() && (code < 200 || code >= 300)) {
+        fail(file, QStringLiteral("máy chủ trả lời mã HTTP %1").arg(code));
+    } else if (reply->error() != QNetworkReply::NoError) {
+        fail(file, QStringLiteral("lỗi mạng (%1)").arg(reply->errorString()));
+    } else if (!status.isValid()) {
+        fail(file, QStringLiteral("máy chủ không trả lời theo HTTP"));
+    } else {
+        succeed(file);
+    }
+}
+
+void UpdateCheck::release(File file) {
+    Transfer& t = transfer(file);
+    t.deadline.stop();
+    t.earlyFailure.reset();
+    t.body.clear();
+    t.redirects = 0;
+    drop(t);
+}
+
+void UpdateCheck::drop(Transfer& t) {
+    if (QNetworkReply* reply = t.reply) {
+        t.reply = nullptr;
+        reply->disconnect(this);
+        reply->abort();
+        reply->deleteLater();
+    }
+}
+
+void UpdateCheck::succeed(File file) {
+    const QByteArray body = std::move(transfer(file).body);
+    release(file);
+    const QString text = QString::fromStdString(
+        ReadFetchedText(std::string_view(body.constData(), static_cast<size_t>(body.size()))));
+    if (file == File::Version) {
+        emit versionFetched(text);
+    } else {
+        emit linkFetched(text);
+    }
+}
+
+void UpdateCheck::fail(File file, const QString& reason) {
+    release(file);
+    if (file == File::Version) {
+        emit versionFailed(reason);
+    } else {
+        emit linkFailed(reason);
+    }
+}
+
+UpdateFlow::UpdateFlow(UpdateCheck::Options options, std::filesystem::path toolFolder,
+                       Dialogs& dialogs, QWidget* owner, QPushButton* checkButton,
+                       QPushButton* downloadButton, QString* pban, QString* vlk, UrlOpener openUrl,
+                       QObject* parent)
+    : QObject(parent),
+      updates_(std::move(options)),
+      toolFolder_(std::move(toolFolder)),
+      dialogs_(dialogs),
+      owner_(owner),
+      checkButton_(checkButton),
+      downloadButton_(downloadButton),
+      pban_(pban),
+      vlk_(vlk),
+      openUrl_(std::move(openUrl)) {
+    connect(&updates_, &UpdateCheck::versionFetched, this, &UpdateFlow::onVersion);
+    connect(&updates_, &UpdateCheck::versionFailed, this, &UpdateFlow::onVersionFailed);
+    connect(&updates_, &UpdateCheck::linkFetched, this, [this](const QString& text) {
+        *vlk_ = text;
+        link_ = LinkState::Fetched;
+        emit linkFinished();
+    });
+    connect(&updates_, &UpdateCheck::linkFailed, this, [this](const QString& reason) {
+        link_ = LinkState::Failed;
+        linkFailure_ = reason;
+        emit linkFinished();
+    });
+}
+
+void UpdateFlow::check() {
+    if (checking_) {
+        return;
+    }
+    checking_ = true;
+    if (checkButton_) {
+        checkButton_->setEnabled(false);
+    }
+    updates_.fetchVersion();
+}
+
+void UpdateFlow::onVersion(const QString& text) {
+    checking_ = false;
+    *pban_ = text;
+    const std::string version = text.toStdString();
+    if (checkButton_) {
+        checkButton_->setEnabled(true);
+    }
+    if (IsCurrentVersion(version)) {
+        showMessage(Vni("Chu7a co1 phie6n ba3n mo71i"), Dialogs::Icon::Information);
+        emit checkFinished();
+        return;
+    }
+
+    link_ = LinkState::Pending;
+    updates_.fetchLink();
+    if (checkButton_) {
+        checkButton_->hide();  // until the tool closes
+    }
+    // The writer drops the text's line breaks. Nothing reads the key back, so a failed write
+    // must not keep the user from hearing about the new version.
+    (void)catalog::WriteIni(catalog::SettingsFile(toolFolder_), "KiemTra", "PhienBan", version);
+    if (downloadButton_) {
+        downloadButton_->show();
+    }
+    showMessage(Vni("D9a4 co1 phie6n ba3n mo71i! " + version), Dialogs::Icon::Information);
+    emit checkFinished();
+}
+
+void UpdateFlow::onVersionFailed(const QString& reason) {
+    checking_ = false;
+    if (checkButton_) {
+        checkButton_->setEnabled(true);
+    }
+    showMessage(QStringLiteral("Không kiểm tra được phiên bản mới: %1").arg(reason),
+                Dialogs::Icon::Warning);
+    emit checkFinished();
+}
+
+void UpdateFlow::download() {
+    const std::optional<std::string> link = DownloadLink(vlk_->toStdString());
+    const QUrl url = link ? QUrl(QString::fromStdString(*link), QUrl::TolerantMode) : QUrl();
+    if (!url.isValid() || !IsWebScheme(url.scheme()) || url.host().isEmpty()) {
+        if (link_ == LinkState::Pending) {
+            showMessage(
+                QStringLiteral("Chưa nhận được đường dẫn tải về, xin thử lại sau giây lát."),
+                Dialogs::Icon::Information);
+        } else if (link_ == LinkState::Failed) {
+            showMessage(QStringLiteral("Không lấy được đường dẫn tải về: %1").arg(linkFailure_),
+                        Dialogs::Icon::Warning);
+        } else {
+            showMessage(QStringLiteral("Đường dẫn tải về không hợp lệ."), Dialogs::Icon::Warning);
+        }
+        return;
+    }
+    if (!openUrl_ || !openUrl_(url)) {
+        showMessage(QStringLiteral("Không mở được đường dẫn tải về."), Dialogs::Icon::Warning);
+    }
+}
+
+void UpdateFlow::showMessage(const QString& text, Dialogs::Icon icon) {
+    dialogs_.ShowMessage(owner_.data(), NoticeTitle(), text, icon);
+}
+
+}  // namespace kickvane::shell
