@@ -294,6 +294,11 @@ void MainWindow::buildButtons() {
     download_ = new QPushButton(QStringLiteral("Tải về"), this);
     download_->setGeometry(176, 10, 118, 26);
     download_->hide();
+    updateFlow_ =
+        std::make_unique<UpdateFlow>(services_.updates, toolFolder_, *services_.dialogs, this,
+                                     checkUpdate_, download_, &hidden_.pban, &hidden_.vlk);
+    connect(checkUpdate_, &QPushButton::clicked, updateFlow_.get(), &UpdateFlow::check);
+    connect(download_, &QPushButton::clicked, updateFlow_.get(), &UpdateFlow::download);
     skin1_ = new QPushButton(QStringLiteral("skin 1"), this);
     skin1_->setGeometry(302, 10, 56, 26);
     connect(skin1_, &QPushButton::clicked, this, [this] { applySkin(LightSkin()); });
@@ -573,9 +578,15 @@ void MainWindow::applySkin(const SkinLook& look) {
     }
     for (PictureBox* frame : groupFrames_) {
         frame->setBackground(look.entryBackground);
-        for (QLabel* heading : frame->findChildren<QLabel*>(Qt::FindDirectChildrenOnly)) {
+    }
+    // Headings on the panels and in the frames follow the labels' text colour, so they stay
+    // readable on the dark panels of skin 2.
+    for (PictureBox* panel : panels_) {
+        for (QLabel* heading : panel->findChildren<QLabel*>()) {
             if (!qobject_cast<ClickableLabel*>(heading)) {
-                Paint(heading, look.entryBackground, look.labelText);
+                QPalette palette = heading->palette();
+                palette.setColor(QPalette::WindowText, look.labelText);
+                heading->setPalette(palette);
             }
         }
     }

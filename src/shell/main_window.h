@@ -22,6 +22,7 @@
 #include "shell/fade_model.h"
 #include "shell/side_windows.h"
 #include "shell/tray.h"
+#include "shell/update_check.h"
 #include "shell/widgets.h"
 #include "shell/window_ui.h"
 
@@ -54,6 +55,8 @@ struct ShellServices {
     SoundPlayer playSound;
     std::function<engine::LaunchResult(std::string_view, engine::EngineUi&)> launchGame =
         engine::LaunchGame;
+    // Where the update check asks; tests point it at a server of their own.
+    UpdateCheck::Options updates = UpdateCheck::DefaultOptions();
     // Makes the tray icon with the window's tray menu; null: the desktop's tray.
     std::function<std::unique_ptr<TrayIcon>(const QIcon&, QMenu*)> makeTray;
 };
@@ -103,6 +106,7 @@ public:
     QPushButton* helpButton() const { return help_; }
     QPushButton* checkUpdateButton() const { return checkUpdate_; }
     QPushButton* downloadButton() const { return download_; }
+    UpdateFlow* updateFlow() const { return updateFlow_.get(); }
     QMenu* trayMenu() { return &trayMenu_; }
     TrayIcon* tray() const { return tray_.get(); }
     PreviewWindow* previewWindow() const { return preview_; }
@@ -212,6 +216,7 @@ private:
     QTimer fadeTimer_;
     QMenu trayMenu_;
     std::unique_ptr<TrayIcon> tray_;
+    std::unique_ptr<UpdateFlow> updateFlow_;
     QPointer<PreviewWindow> preview_;
     QPointer<QWidget> about_;
     QPointer<QWidget> helpWindow_;

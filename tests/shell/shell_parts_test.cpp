@@ -32,6 +32,7 @@ protected:
             ++launches_;
             return engine::LaunchResult::Started;
         };
+        services.updates.host = QUrl(QStringLiteral("http://127.0.0.1:9/"));  // nothing listens
         auto window = std::make_unique<MainWindow>(folder.empty() ? dir_.path() : folder,
                                                    std::move(services));
         window->show();
@@ -215,6 +216,18 @@ TEST_F(ShellPartsTest, LabelClicksShowTheirPreviewInOneSharedWindow) {
     EXPECT_EQ(PreviewPicture(dir_.path(), catalog::LabelArray::UniLabel3, 9).filename(),
               "t4_img_9.jpg");
     EXPECT_TRUE(PreviewPicture(dir_.path(), catalog::LabelArray::UniLabel1, 4).empty());
+}
+
+TEST_F(ShellPartsTest, CheckButtonRunsTheUpdateCheckAndReportsAnUnreachableHost) {
+    auto window = Open();
+    QSignalSpy finished(window->updateFlow(), &UpdateFlow::checkFinished);
+    Click(window->checkUpdateButton());
+    ASSERT_TRUE(finished.wait(15000));
+    ASSERT_EQ(dialogs_.messages.size(), 1);
+    EXPECT_TRUE(dialogs_.messages[0].contains("Không kiểm tra được phiên bản mới"));
+    EXPECT_TRUE(window->checkUpdateButton()->isVisible());
+    EXPECT_TRUE(window->checkUpdateButton()->isEnabled());
+    EXPECT_FALSE(window->downloadButton()->isVisible());
 }
 
 TEST_F(ShellPartsTest, HelpWindowShowsTheGuideVerbatim) {
