@@ -68,6 +68,7 @@ bool SelectRawKeyEvents(Display* display, int* opcode) {
 
     std::array<unsigned char, XIMaskLen(XI_LASTEVENT)> bits{};
     XISetMask(bits.data(), XI_RawKeyPress);
+    XISetMask(bits.data(), XI_RawKeyRelease);
     XIEventMask mask{};
     mask.deviceid = XIAllMasterDevices;
     mask.mask_len = static_cast<int>(bits.size());
@@ -97,20 +98,27 @@ public:
             return {};  // The keyboard map has no such key.
         }
 
-        std::array<char, 32> keymap{};
-        XQueryKeymap(display_, keymap.data());
         DrainEvents();
+        // Raw presses and releases keep the key's state without asking the server, so an idle
+        // tick costs no round trip. The server is asked only when the key looks held (to be sure
+        // a release was not missed) or when there are no raw events.
+        if (opcode_ < 0 || down_[keycode]) {
+            std::array<char, 32> keymap{};
+            XQueryKeymap(display_, keymap.data());
+            DrainEvents();
+            const auto byte = static_cast<unsigned char>(keymap[keycode / 8]);
+            down_[keycode] = (byte & (1u << (keycode % 8))) != 0;
+        }
 
         KeySample sample;
-        const auto byte = static_cast<unsigned char>(keymap[keycode / 8]);
-        sample.down = (byte & (1u << (keycode % 8))) != 0;
+        sample.down = down_[keycode];
         sample.pressedSinceLast = pressed_[keycode];
         pressed_[keycode] = false;
         return sample;
     }
 
 private:
-    // Reads every event that has arrived, without waiting, and notes the keys that went down.
+    // Reads every event that has arrived, without waiting, and notes the keys that went down or up.
     void DrainEvents() {
         while (XPending(display_) > 0) {
             XEvent event;
@@ -120,10 +128,14 @@ private:
                 !XGetEventData(display_, cookie)) {
                 continue;
             }
-            if (cookie->evtype == XI_RawKeyPress) {
-                const auto* raw = static_cast<const XIRawEvent*>(cookie->data);
-                if (raw->detail >= 0 && raw->detail < static_cast<int>(pressed_.size())) {
-                    pressed_[static_cast<size_t>(raw->detail)] = true;
+            const auto* raw = static_cast<const XIRawEvent*>(cookie->data);
+            if (raw->detail >= 0 && raw->detail < static_cast<int>(pressed_.size())) {
+                const auto keycode = static_cast<size_t>(raw->detail);
+                if (cookie->evtype == XI_RawKeyPress) {
+                    pressed_[keycode] = true;
+                    down_[keycode] = true;
+                } else if (cookie->evtype == XI_RawKeyRelease) {
+                    down_[keycode] = false;
                 }
             }
             XFreeEventData(display_, cookie);
@@ -133,6 +145,7 @@ private:
     Display* display_;
     int opcode_;
     std::array<bool, 256> pressed_{};  // per keycode: went down since its last sample
+    std::array<bool, 256> down_{};     // per keycode: held, as the raw events tell
 };
 
 }  // namespace
