@@ -7,6 +7,7 @@
 #include <utility>
 
 #include "platform/filesystem.h"
+#include "text/utf.h"
 
 namespace kickvane::catalog {
 
@@ -30,90 +31,6 @@ std::string_view TrimBlanks(std::string_view text) {
     return text;
 }
 
-// Strict UTF-8: no overlong forms, no surrogates, nothing above U+10FFFF.
-bool IsValidUtf8(std::string_view text) {
-    size_t i = 0;
-    while (i < text.size()) {
-        const auto lead = static_cast<unsigned char>(text[i]);
-        if (lead < 0x80) {
-            ++i;
-            continue;
-        }
-        size_t length = 0;
-        char32_t code = 0;
-        char32_t smallest = 0;
-        if ((lead & 0xE0) == 0xC0) {
-            length = 2;
-            code = lead & 0x1F;
-            smallest = 0x80;
-        } else if ((lead & 0xF0) == 0xE0) {
-            length = 3;
-            code = lead & 0x0F;
-            smallest = 0x800;
-        } else if ((lead & 0xF8) == 0xF0) {
-            length = 4;
-            code = lead & 0x07;
-            smallest = 0x10000;
-        } else {
-            return false;
-        }
-        if (text.size() - i < length) {
-            return false;
-        }
-        for (size_t k = 1; k < length; ++k) {
-            const auto next = static_cast<unsigned char>(text[i + k]);
-            if ((next & 0xC0) != 0x80) {
-                return false;
-            }
-            code = (code << 6) | (next & 0x3F);
-        }
-        if (code < smallest || code > 0x10FFFF || (code >= 0xD800 && code <= 0xDFFF)) {
-            return false;
-        }
-        i += length;
-    }
-    return true;
-}
-
-void AppendUtf8(std::string& out, char32_t code) {
-    if (code < 0x80) {
-        out += static_cast<char>(code);
-    } else if (code < 0x800) {
-        out += static_cast<char>(0xC0 | (code >> 6));
-        out += static_cast<char>(0x80 | (code & 0x3F));
-    } else {
-        out += static_cast<char>(0xE0 | (code >> 12));
-        out += static_cast<char>(0x80 | ((code >> 6) & 0x3F));
-        out += static_cast<char>(0x80 | (code & 0x3F));
-    }
-}
-
-// Windows-1252 at 0x80-0x9F; the five unassigned bytes keep their value as C1 controls.
-// 0xA0-0xFF equal Latin-1 and need no table.
-constexpr std::array<char16_t, 32> kCp1252High = {
-    0x20AC, 0x0081, 0x201A, 0x0192, 0x201E, 0x2026, 0x2020, 0x2021, 0x02C6, 0x2030, 0x0160,
-    0x2039, 0x0152, 0x008D, 0x017D, 0x008F, 0x0090, 0x2018, 0x2019, 0x201C, 0x201D, 0x2022,
-    0x2013, 0x2014, 0x02DC, 0x2122, 0x0161, 0x203A, 0x0153, 0x009D, 0x017E, 0x0178,
-};
-
-// Text that is valid UTF-8 as it is; any other text decoded as Windows-1252.
-std::string ToUtf8(std::string_view text) {
-    if (IsValidUtf8(text)) {
-        return std::string(text);
-    }
-    std::string out;
-    out.reserve(text.size() * 2);
-    for (const char c : text) {
-        const auto byte = static_cast<unsigned char>(c);
-        if (byte >= 0x80 && byte < 0xA0) {
-            AppendUtf8(out, kCp1252High[byte - 0x80]);
-        } else {
-            AppendUtf8(out, byte);
-        }
-    }
-    return out;
-}
-
 std::string WithoutLineBreaks(std::string_view text) {
     std::string out;
     out.reserve(text.size());
@@ -127,7 +44,7 @@ std::string WithoutLineBreaks(std::string_view text) {
 
 // A section or key name as it is compared and stored.
 std::string NormalizeName(std::string_view name) {
-    return std::string(TrimBlanks(WithoutLineBreaks(ToUtf8(name))));
+    return std::string(TrimBlanks(WithoutLineBreaks(text::LegacyTextToUtf8(name))));
 }
 
 enum class LineKind { kBlank, kComment, kSection, kEntry, kOther };
@@ -189,7 +106,7 @@ IniDocument IniDocument::Parse(std::string_view bytes) {
         if (end == std::string_view::npos) {
             end = bytes.size();
         }
-        document.lines_.push_back(ToUtf8(bytes.substr(start, end - start)));
+        document.lines_.push_back(text::LegacyTextToUtf8(bytes.substr(start, end - start)));
         start = end;
         if (start < bytes.size() && bytes[start] == '\r') {
             ++start;
@@ -241,7 +158,7 @@ std::optional<std::string> IniDocument::Get(std::string_view section, std::strin
 Status IniDocument::Set(std::string_view section, std::string_view key, std::string_view value) {
     const std::string section_name = NormalizeName(section);
     const std::string key_name = NormalizeName(key);
-    const std::string new_value = WithoutLineBreaks(ToUtf8(value));
+    const std::string new_value = WithoutLineBreaks(text::LegacyTextToUtf8(value));
     if (section_name.find(']') != std::string::npos) {
         return Status::Fail("A section name cannot contain ']': " + section_name);
     }

@@ -10,6 +10,7 @@
 #include "catalog/ini.h"
 #include "catalog/settings.h"
 #include "shell/message_box.h"
+#include "text/utf.h"
 #include "text/vni.h"
 
 #ifndef KICKVANE_UPDATE_HOST
@@ -19,80 +20,6 @@
 namespace kickvane::shell {
 
 namespace {
-
-// Strict UTF-8: no overlong forms, no surrogates, nothing above U+10FFFF.
-bool IsValidUtf8(std::string_view text) {
-    size_t i = 0;
-    while (i < text.size()) {
-        const auto lead = static_cast<unsigned char>(text[i]);
-        size_t length = 1;
-        char32_t code = lead;
-        char32_t smallest = 0;
-        if (lead >= 0x80) {
-            if ((lead & 0xE0) == 0xC0) {
-                length = 2;
-                code = lead & 0x1F;
-                smallest = 0x80;
-            } else if ((lead & 0xF0) == 0xE0) {
-                length = 3;
-                code = lead & 0x0F;
-                smallest = 0x800;
-            } else if ((lead & 0xF8) == 0xF0) {
-                length = 4;
-                code = lead & 0x07;
-                smallest = 0x10000;
-            } else {
-                return false;
-            }
-            if (text.size() - i < length) {
-                return false;
-            }
-            for (size_t k = 1; k < length; ++k) {
-                const auto next = static_cast<unsigned char>(text[i + k]);
-                if ((next & 0xC0) != 0x80) {
-                    return false;
-                }
-                code = (code << 6) | (next & 0x3F);
-            }
-            if (code < smallest || code > 0x10FFFF || (code >= 0xD800 && code <= 0xDFFF)) {
-                return false;
-            }
-        }
-        i += length;
-    }
-    return true;
-}
-
-// Windows-1252 at 0x80-0x9F; the five unassigned bytes keep their value as C1 controls.
-// 0xA0-0xFF equal Latin-1.
-constexpr std::array<char16_t, 32> kCp1252High = {
-    0x20AC, 0x0081, 0x201A, 0x0192, 0x201E, 0x2026, 0x2020, 0x2021, 0x02C6, 0x2030, 0x0160,
-    0x2039, 0x0152, 0x008D, 0x017D, 0x008F, 0x0090, 0x2018, 0x2019, 0x201C, 0x201D, 0x2022,
-    0x2013, 0x2014, 0x02DC, 0x2122, 0x0161, 0x203A, 0x0153, 0x009D, 0x017E, 0x0178,
-};
-
-std::string DecodeToUtf8(std::string_view bytes) {
-    if (IsValidUtf8(bytes)) {
-        return std::string(bytes);
-    }
-    std::string out;
-    out.reserve(bytes.size() * 2);
-    for (const char c : bytes) {
-        const auto byte = static_cast<unsigned char>(c);
-        const char32_t code = byte >= 0x80 && byte < 0xA0 ? kCp1252High[byte - 0x80] : byte;
-        if (code < 0x80) {
-            out += static_cast<char>(code);
-        } else if (code < 0x800) {
-            out += static_cast<char>(0xC0 | (code >> 6));
-            out += static_cast<char>(0x80 | (code & 0x3F));
-        } else {
-            out += static_cast<char>(0xE0 | (code >> 12));
-            out += static_cast<char>(0x80 | ((code >> 6) & 0x3F));
-            out += static_cast<char>(0x80 | (code & 0x3F));
-        }
-    }
-    return out;
-}
 
 bool IsLinkBlank(char c) {
     return c == ' ' || c == '\t' || c == '\r' || c == '\n' || c == '\v' || c == '\f';
@@ -124,7 +51,7 @@ const QString kBadHost = QStringLiteral("địa chỉ máy chủ cập nhật kh
 }  // namespace
 
 std::string ReadFetchedText(std::string_view bytes) {
-    const std::string decoded = DecodeToUtf8(bytes);
+    const std::string decoded = text::LegacyTextToUtf8(bytes);
     std::string text;
     text.reserve(decoded.size() + 2);
     size_t start = 0;

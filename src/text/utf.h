@@ -12,4 +12,12 @@ std::u16string Utf8ToUtf16(std::string_view utf8);
 // UTF-16 to UTF-8. An unpaired surrogate becomes U+FFFD.
 std::string Utf16ToUtf8(std::u16string_view utf16);
 
+// Strict UTF-8: no overlong forms, no surrogates, nothing above U+10FFFF.
+bool IsValidUtf8(std::string_view text);
+
+// Text from files that older tools wrote: kept as it is when it is valid UTF-8, otherwise read
+// as Windows-1252 (the five bytes that code page leaves unassigned become the C1 controls of the
+// same value). Never drops a byte.
+std::string LegacyTextToUtf8(std::string_view bytes);
+
 }  // namespace kickvane::text
