@@ -146,9 +146,9 @@ MainWindow::MainWindow(std::filesystem::path toolFolder, ShellServices services,
 
 MainWindow::~MainWindow() = default;
 
-QString MainWindow::skinFile(const QString& suffix) const {
-    const std::filesystem::path file = platform::ResolveCaseInsensitive(
-        toolFolder_ / "skin" / (hidden_.skn + suffix).toStdString());
+QString MainWindow::skinFile(const QString& skin, const QString& suffix) const {
+    const std::filesystem::path file =
+        platform::ResolveCaseInsensitive(toolFolder_ / "skin" / (skin + suffix).toStdString());
     return QString::fromStdString(file.string());
 }
 
@@ -324,8 +324,12 @@ void MainWindow::buildTrayMenu() {
 
 void MainWindow::initTabs() {
     tabHeight_ = static_cast<int16_t>(tabs_[0]->height());
-    const QString panelPicture = QString::fromStdString(
-        platform::ResolveCaseInsensitive(toolFolder_ / "skin" / "skin1_panel.jpg").string());
+    layoutPanels(skinFile(LightSkin().name, QStringLiteral("_panel.jpg")));
+    LoadPicture(background_, skinFile(hidden_.skn, QStringLiteral("_bg.jpg")));
+}
+
+void MainWindow::layoutPanels(const QString& panelPicture) {
+    // Every panel takes panel 0's colour, left and width, and sits just below the tab heads' top.
     for (int i = 0; i < kTabCount; ++i) {
         PictureBox* panel = panels_[static_cast<size_t>(i)];
         panel->setBackground(panels_[0]->background());
@@ -335,7 +339,6 @@ void MainWindow::initTabs() {
             panel->resize(panels_[0]->width(), panel->height());
         }
     }
-    LoadPicture(background_, skinFile(QStringLiteral("_bg.jpg")));
 }
 
 void MainWindow::paintTabs() {
@@ -345,9 +348,9 @@ void MainWindow::paintTabs() {
         panels_[static_cast<size_t>(i)]->setVisible(selected);
         if (selected) {
             tab->raise();
-            tab->setPictureFile(skinFile(QStringLiteral("_selected.jpg")));
+            tab->setPictureFile(skinFile(hidden_.skn, QStringLiteral("_selected.jpg")));
         } else {
-            tab->setPictureFile(skinFile(QStringLiteral("_unselect.jpg")));
+            tab->setPictureFile(skinFile(hidden_.skn, QStringLiteral("_unselect.jpg")));
             tab->setBackground(kUnselectedTabColour);
         }
         tab->resize(kTabHeadWidth, kTabHeadHeight);
@@ -551,23 +554,8 @@ TranslucentResult MainWindow::makeTranslucent(int alpha) {
 }
 
 void MainWindow::applySkin(const SkinLook& look) {
-    LoadPicture(background_, QString::fromStdString(
-                                 platform::ResolveCaseInsensitive(
-                                     toolFolder_ / "skin" / (look.name + "_bg.jpg").toStdString())
-                                     .string()));
-    const QString panelPicture =
-        QString::fromStdString(platform::ResolveCaseInsensitive(
-                                   toolFolder_ / "skin" / (look.name + "_panel.jpg").toStdString())
-                                   .string());
-    for (int i = 0; i < kTabCount; ++i) {
-        PictureBox* panel = panels_[static_cast<size_t>(i)];
-        panel->setBackground(panels_[0]->background());
-        panel->setPictureFile(panelPicture);
-        panel->move(i > 0 ? panels_[0]->x() : panel->x(), tabHeight_ + 16);
-        if (i > 0) {
-            panel->resize(panels_[0]->width(), panel->height());
-        }
-    }
+    LoadPicture(background_, skinFile(look.name, QStringLiteral("_bg.jpg")));
+    layoutPanels(skinFile(look.name, QStringLiteral("_panel.jpg")));
     for (size_t i = 0; i < checks_.size(); ++i) {
         Paint(checks_[i], look.entryBackground);
         Paint(categoryLabels_[i], look.labelBackground, look.labelText);

@@ -170,10 +170,11 @@ private:
     void hideToTray();
     QWidget* showSideWindow(QPointer<QWidget>& window, QWidget* (*create)(QWidget*));
     void initTabs();
+    void layoutPanels(const QString& panelPicture);
     void loadSettings();
     void showSelection();
     void onOptionClicked(catalog::OptionArray array, int index);
-    QString skinFile(const QString& suffix) const;
+    QString skinFile(const QString& skin, const QString& suffix) const;
 
     std::filesystem::path toolFolder_;
     ShellServices services_;
