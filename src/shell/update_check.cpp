@@ -226,14 +226,19 @@ void UpdateCheck::onMetaData(File file, QNetworkReply* reply) {
     }
 }
 
-void UpdateCheck::onData(File file, QNetworkReply* reply) {
+bool UpdateCheck::takeBody(File file, QNetworkReply* reply) {
     Transfer& t = transfer(file);
-    if (t.reply != reply) {
-        return;
-    }
     t.body += reply->readAll();
     if (t.body.size() > options_.maxBytes) {
         fail(file, kTooLarge);
+        return false;
+    }
+    return true;
+}
+
+void UpdateCheck::onData(File file, QNetworkReply* reply) {
+    if (transfer(file).reply == reply) {
+        takeBody(file, reply);
     }
 }
 
@@ -252,12 +257,7 @@ void UpdateCheck::follow(File file, const QUrl& target) {
 
 void UpdateCheck::onFinished(File file, QNetworkReply* reply) {
     Transfer& t = transfer(file);
-    if (t.reply != reply) {
-        return;
-    }
-    t.body += reply->readAll();
-    if (t.body.size() > options_.maxBytes) {
-        fail(file, kTooLarge);
+    if (t.reply != reply || !takeBody(file, reply)) {
         return;
     }
     const QVariant status = reply->attribute(QNetworkRequest::HttpStatusCodeAttribute);

@@ -95,6 +95,8 @@ private:
     void fetch(File file);
     void onMetaData(File file, QNetworkReply* reply);
     void onData(File file, QNetworkReply* reply);
+    // Adds what has arrived to the body; false (and the fetch failed) once it is too large.
+    bool takeBody(File file, QNetworkReply* reply);
     void request(File file, const QUrl& url);
     void follow(File file, const QUrl& target);
     void onFinished(File file, QNetworkReply* reply);
