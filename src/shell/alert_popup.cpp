@@ -69,7 +69,7 @@ AlertPopup::AlertPopup(text::PopupEnvironment environment)
     timer_.setTimerType(Qt::PreciseTimer);
     timer_.setInterval(
         std::chrono::duration_cast<std::chrono::milliseconds>(text::kPopupTickInterval));
-    connect(&timer_, &QTimer::timeout, this, &AlertPopup::Tick);
+    connect(&timer_, &QTimer::timeout, this, &AlertPopup::CatchUp);
 }
 
 AlertPopup* AlertPopup::Show(const QString& text, int displaySeconds) {
@@ -90,7 +90,19 @@ void AlertPopup::DisplayMessage(const QString& text, int displaySeconds, bool fa
     }
     Follow();
     show();
+    clock_.start();
+    ticksRun_ = 0;
     timer_.start();
+}
+
+void AlertPopup::CatchUp() {
+    const qint64 due =
+        clock_.nsecsElapsed() /
+        std::chrono::duration_cast<std::chrono::nanoseconds>(text::kPopupTickInterval).count();
+    while (ticksRun_ < due && !model_.Finished()) {
+        ++ticksRun_;
+        Tick();
+    }
 }
 
 void AlertPopup::Tick() {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QElapsedTimer>
 #include <QTimer>
 #include <QWidget>
 
@@ -36,9 +37,14 @@ protected:
 
 private:
     void Follow();
+    // Runs the ticks that are due by the clock, so the popup's life does not depend on how
+    // exactly the system timer fires.
+    void CatchUp();
 
     text::AlertPopupModel model_;
     QTimer timer_;
+    QElapsedTimer clock_;
+    qint64 ticksRun_ = 0;
 };
 
 }  // namespace kickvane::shell

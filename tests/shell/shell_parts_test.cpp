@@ -6,6 +6,7 @@
 #include <QTest>
 
 #include "fakes.h"
+#include "shell/alert_popup.h"
 #include "shell/main_window.h"
 #include "support/temp_dir.h"
 
@@ -228,6 +229,27 @@ TEST_F(ShellPartsTest, CheckButtonRunsTheUpdateCheckAndReportsAnUnreachableHost)
     EXPECT_TRUE(window->checkUpdateButton()->isVisible());
     EXPECT_TRUE(window->checkUpdateButton()->isEnabled());
     EXPECT_FALSE(window->downloadButton()->isVisible());
+}
+
+TEST_F(ShellPartsTest, PopupWindowFollowsItsModelAndClosesWhenItFinishes) {
+    QPointer<AlertPopup> popup = AlertPopup::Show(QStringLiteral("Đã lưu thiết lập!"), 2);
+    ASSERT_TRUE(popup->isVisible());
+    EXPECT_TRUE(popup->testAttribute(Qt::WA_ShowWithoutActivating));
+    const text::AlertPopupModel& model = popup->model();
+    for (int i = 0; i < 5; ++i) {
+        popup->Tick();
+    }
+    const text::PixelRect rect = model.WindowPixels();
+    EXPECT_EQ(popup->geometry(), QRect(rect.left, rect.top, rect.width, rect.height));
+    // Rising, resting 160 ticks, leaving: it closes and deletes itself at the end.
+    for (int i = 0; i < 2000 && popup && !model.Finished(); ++i) {
+        popup->Tick();
+    }
+    ASSERT_TRUE(popup);
+    EXPECT_TRUE(model.Finished());
+    EXPECT_FALSE(popup->isVisible());
+    QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+    EXPECT_TRUE(popup.isNull());
 }
 
 TEST_F(ShellPartsTest, HelpWindowShowsTheGuideVerbatim) {
