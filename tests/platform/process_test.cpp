@@ -5,10 +5,9 @@
 #include <unistd.h>
 
 #include <cerrno>
-#include <chrono>
-#include <thread>
 
 #include "platform/scoped_env.h"
+#include "platform/wait_until.h"
 #include "support/temp_dir.h"
 
 namespace kickvane::platform {
@@ -18,6 +17,7 @@ namespace fs = std::filesystem;
 using testing::ReadText;
 using testing::ScopedEnv;
 using testing::TempDir;
+using testing::WaitUntil;
 using testing::WriteFile;
 
 void WriteExecutable(const fs::path& path, std::string_view content) {
@@ -25,19 +25,7 @@ void WriteExecutable(const fs::path& path, std::string_view content) {
     fs::permissions(path, fs::perms::owner_all);
 }
 
-// Waits for a file that a started program writes; generous, since the machine may be busy.
-bool WaitForFile(const fs::path& path) {
-    const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(30);
-    while (std::chrono::steady_clock::now() < deadline) {
-        if (fs::exists(path)) {
-            return true;
-        }
-        std::this_thread::sleep_for(std::chrono::milliseconds(20));
-    }
-    return false;
-}
-
-TEST(StartDetached, RunsProgramInWorkingFolder_WithArgumentsUntouchedByAShell) {
+TEST(StartDetached, RunsProgramInWorkingFolder_WithArgumentsUntouchedByAShell_AndLeavesNoChild) {
     TempDir dir;
     fs::create_directories(dir / "game");
     // The report is written beside and renamed into place, so a file that exists is whole.
@@ -54,7 +42,8 @@ TEST(StartDetached, RunsProgramInWorkingFolder_WithArgumentsUntouchedByAShell) {
     EXPECT_EQ(::waitpid(-1, nullptr, WNOHANG), -1);
     EXPECT_EQ(errno, ECHILD);
 
-    ASSERT_TRUE(WaitForFile(dir / "game/report.txt"));
+    ASSERT_TRUE(
+        WaitUntil([&] { return fs::exists(dir / "game/report.txt"); }, std::chrono::seconds(30)));
     // Standard input is empty (/dev/null), so `cat` ends at once and adds nothing.
     EXPECT_EQ(ReadText(dir / "game/report.txt"),
               fs::canonical(dir / "game").string() + "\n3\ntwo words\n$(touch injected)\n\nend\n");
@@ -65,20 +54,18 @@ TEST(StartDetached, FailsWithReason_WhenProgramOrFolderCannotBeUsed) {
     TempDir dir;
     WriteFile(dir / "plain.txt", "not a program");
     WriteExecutable(dir / "ok.sh", "#!/bin/sh\nexit 0\n");
-
-    const Status missing = StartDetached(dir / "Gameloader.exe", {}, dir.path());
-    EXPECT_FALSE(missing.ok());
-    EXPECT_NE(missing.reason().find("Gameloader.exe"), std::string::npos) << missing.reason();
-
-    const Status notExecutable = StartDetached(dir / "plain.txt", {}, dir.path());
-    EXPECT_FALSE(notExecutable.ok());
-    EXPECT_FALSE(notExecutable.reason().empty());
-
-    const Status noFolder = StartDetached(dir / "ok.sh", {}, dir / "missing");
-    EXPECT_FALSE(noFolder.ok());
-    EXPECT_NE(noFolder.reason().find("missing"), std::string::npos) << noFolder.reason();
-
-    EXPECT_FALSE(StartDetached("", {}, dir.path()).ok());
+    // {program, folder, a word the reason names}
+    const std::tuple<fs::path, fs::path, std::string> cases[] = {
+        {dir / "Gameloader.exe", dir.path(), "Gameloader.exe"},
+        {dir / "plain.txt", dir.path(), ""},
+        {dir / "ok.sh", dir / "missing", "missing"},
+        {"", dir.path(), ""}};
+    for (const auto& [program, folder, named] : cases) {
+        const Status started = StartDetached(program, {}, folder);
+        EXPECT_FALSE(started.ok()) << program;
+        EXPECT_FALSE(started.reason().empty()) << program;
+        EXPECT_NE(started.reason().find(named), std::string::npos) << started.reason();
+    }
 }
 
 TEST(IsNativeExecutable, AcceptsElfAndScripts_RejectsWindowsProgramsAndPlainFiles) {
@@ -91,33 +78,28 @@ TEST(IsNativeExecutable, AcceptsElfAndScripts_RejectsWindowsProgramsAndPlainFile
 
     EXPECT_TRUE(IsNativeExecutable(fs::read_symlink("/proc/self/exe")));
     EXPECT_TRUE(IsNativeExecutable(dir / "run.sh"));
-    EXPECT_FALSE(IsNativeExecutable(dir / "Gameloader.exe"));
-    EXPECT_FALSE(IsNativeExecutable(dir / "notes.sh"));
-    EXPECT_FALSE(IsNativeExecutable(dir / "empty"));
-    EXPECT_FALSE(IsNativeExecutable(dir / "folder"));
-    EXPECT_FALSE(IsNativeExecutable(dir / "missing"));
+    for (const char* name : {"Gameloader.exe", "notes.sh", "empty", "folder", "missing"}) {
+        EXPECT_FALSE(IsNativeExecutable(dir / name)) << name;
+    }
 }
 
 TEST(FindOnPath, FindsExecutablesInPathFolders_NeverInTheCurrentFolder) {
     const fs::path sh = FindOnPath("sh");
     ASSERT_FALSE(sh.empty());
     EXPECT_TRUE(sh.is_absolute());
-    EXPECT_TRUE(IsNativeExecutable(sh));
 
     TempDir dir;
     WriteExecutable(dir / "bin/kv-tool", "#!/bin/sh\n");
-    WriteFile(dir / "other/kv-plain", "#!/bin/sh\n");
-    ScopedEnv path("PATH", ":" + (dir / "other").string() + ":" + (dir / "bin").string());
-    EXPECT_EQ(FindOnPath("kv-tool"), dir / "bin/kv-tool");
-    EXPECT_TRUE(FindOnPath("kv-plain").empty());  // not executable
-    EXPECT_TRUE(FindOnPath("kv-missing").empty());
-    EXPECT_TRUE(FindOnPath("").empty());
-
-    // An empty PATH entry would mean the current folder, where anything may lie.
+    WriteFile(dir / "other/kv-plain", "#!/bin/sh\n");  // not executable
     WriteExecutable(dir / "cwd/kv-here", "#!/bin/sh\n");
+    // An empty PATH entry would mean the current folder, where anything may lie.
+    ScopedEnv path("PATH", ":" + (dir / "other").string() + ":" + (dir / "bin").string());
     const fs::path previous = fs::current_path();
     fs::current_path(dir / "cwd");
-    EXPECT_TRUE(FindOnPath("kv-here").empty());
+    EXPECT_EQ(FindOnPath("kv-tool"), dir / "bin/kv-tool");
+    for (const char* name : {"kv-plain", "kv-here", "kv-missing", ""}) {
+        EXPECT_TRUE(FindOnPath(name).empty()) << name;
+    }
     fs::current_path(previous);
 }
 

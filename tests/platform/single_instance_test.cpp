@@ -27,66 +27,52 @@ class SingleInstanceTest : public ::testing::Test {
 protected:
     SingleInstanceTest() { fs::permissions(runtime_.path(), fs::perms::owner_all); }
 
-    const fs::path& runtime() const { return runtime_.path(); }
+    // Connects to the running copy as a client and sends `bytes` as they are; the socket, or -1.
+    int SendRaw(const std::string& bytes) {
+        sockaddr_un address{};
+        address.sun_family = AF_UNIX;
+        const std::string path = (runtime_ / "kv-test.sock").string();
+        std::strncpy(address.sun_path, path.c_str(), sizeof address.sun_path - 1);
+        const int fd = ::socket(AF_UNIX, SOCK_STREAM, 0);
+        if (::connect(fd, reinterpret_cast<const sockaddr*>(&address), sizeof address) != 0 ||
+            ::send(fd, bytes.data(), bytes.size(), MSG_NOSIGNAL) !=
+                static_cast<ssize_t>(bytes.size())) {
+            ::close(fd);
+            return -1;
+        }
+        return fd;
+    }
 
-private:
     TempDir runtime_;
     ScopedEnv xdgRuntime_{"XDG_RUNTIME_DIR", runtime_.path().string()};
 };
-
-bool Readable(int fd) {
-    pollfd readable{fd, POLLIN, 0};
-    return ::poll(&readable, 1, 10000) == 1;
-}
-
-// A client that connects to the running copy and sends `bytes` as they are.
-int ConnectRaw(const fs::path& socketPath) {
-    sockaddr_un address{};
-    address.sun_family = AF_UNIX;
-    std::strncpy(address.sun_path, socketPath.c_str(), sizeof address.sun_path - 1);
-    const int fd = ::socket(AF_UNIX, SOCK_STREAM, 0);
-    if (::connect(fd, reinterpret_cast<const sockaddr*>(&address), sizeof address) != 0) {
-        ::close(fd);
-        return -1;
-    }
-    return fd;
-}
 
 TEST_F(SingleInstanceTest, RefusesSecondCopy_WhileFirstRuns_AndAllowsOneAfterIt) {
     auto first = AcquireSingleInstance("kv-test");
     ASSERT_NE(first, nullptr);
     EXPECT_EQ(AcquireSingleInstance("kv-test"), nullptr);
-    // Another name is another use and does not conflict.
-    EXPECT_NE(AcquireSingleInstance("kv-other"), nullptr);
+    EXPECT_NE(AcquireSingleInstance("kv-other"), nullptr);  // another name, another use
 
     first.reset();
     EXPECT_NE(AcquireSingleInstance("kv-test"), nullptr);
 }
 
-TEST_F(SingleInstanceTest, DeliversSentCommand_ThroughReadableDescriptor) {
+TEST_F(SingleInstanceTest, DeliversSentCommandsInOrder_ThroughReadableDescriptor) {
     auto running = AcquireSingleInstance("kv-test");
     ASSERT_NE(running, nullptr);
     EXPECT_EQ(running->TakeCommand(), std::nullopt);  // nothing waiting: returns at once
 
-    ASSERT_TRUE(SendToRunningInstance("trigger", "kv-test"));
-    ASSERT_GE(running->commandDescriptor(), 0);
-    ASSERT_TRUE(Readable(running->commandDescriptor()));
-    EXPECT_EQ(running->TakeCommand(), "trigger");
-    EXPECT_EQ(running->TakeCommand(), std::nullopt);
-
     ASSERT_TRUE(SendToRunningInstance("show", "kv-test"));
     ASSERT_TRUE(SendToRunningInstance("trigger", "kv-test"));
+    pollfd readable{running->commandDescriptor(), POLLIN, 0};
+    ASSERT_EQ(::poll(&readable, 1, 10000), 1);
     EXPECT_EQ(running->TakeCommand(), "show");
     EXPECT_EQ(running->TakeCommand(), "trigger");
+    EXPECT_EQ(running->TakeCommand(), std::nullopt);
 }
 
-TEST_F(SingleInstanceTest, SendFails_WhenNoCopyRuns) {
+TEST_F(SingleInstanceTest, SendFails_WhenNoCopyRuns_AndACopyThatDiedLeavesNothingStale) {
     EXPECT_FALSE(SendToRunningInstance("trigger", "kv-test"));
-    AcquireSingleInstance("kv-test").reset();
-    EXPECT_FALSE(SendToRunningInstance("trigger", "kv-test"));
-}
-
-TEST_F(SingleInstanceTest, CopyThatDied_LeavesNoStaleLockOrSocket) {
     const pid_t child = ::fork();
     ASSERT_GE(child, 0);
     if (child == 0) {
@@ -97,7 +83,7 @@ TEST_F(SingleInstanceTest, CopyThatDied_LeavesNoStaleLockOrSocket) {
     int status = 0;
     ASSERT_EQ(::waitpid(child, &status, 0), child);
     ASSERT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0);
-    ASSERT_TRUE(fs::exists(runtime() / "kv-test.sock"));
+    ASSERT_TRUE(fs::exists(runtime_ / "kv-test.sock"));
 
     EXPECT_FALSE(SendToRunningInstance("trigger", "kv-test"));
     auto next = AcquireSingleInstance("kv-test");
@@ -106,48 +92,37 @@ TEST_F(SingleInstanceTest, CopyThatDied_LeavesNoStaleLockOrSocket) {
     EXPECT_EQ(next->TakeCommand(), "trigger");
 }
 
-TEST_F(SingleInstanceTest, DropsSilentOverlongAndMultiLineInput_AndKeepsServing) {
+TEST_F(SingleInstanceTest, SilentOverlongAndMultiLineClients_CannotBlockOrAddCommands) {
     auto running = AcquireSingleInstance("kv-test");
     ASSERT_NE(running, nullptr);
-    const fs::path socketPath = runtime() / "kv-test.sock";
-
     // A client that connects and never writes must not hold the user interface.
-    const int silent = ConnectRaw(socketPath);
-    ASSERT_GE(silent, 0);
-    EXPECT_EQ(running->TakeCommand(), std::nullopt);
-
-    const int overlong = ConnectRaw(socketPath);
-    ASSERT_GE(overlong, 0);
-    const std::string flood(4096, 'x');
-    ASSERT_EQ(::send(overlong, flood.data(), flood.size(), MSG_NOSIGNAL),
-              static_cast<ssize_t>(flood.size()));
+    const int silent = SendRaw("");
+    const int overlong = SendRaw(std::string(4096, 'x'));
+    ASSERT_TRUE(silent >= 0 && overlong >= 0);
     EXPECT_EQ(running->TakeCommand(), std::nullopt);
 
     // One command per connection: a second line is not taken as another command.
-    const int twoLines = ConnectRaw(socketPath);
+    const int twoLines = SendRaw("show\r\nquit\n");
     ASSERT_GE(twoLines, 0);
-    const std::string lines = "show\r\nquit\n";
-    ASSERT_EQ(::send(twoLines, lines.data(), lines.size(), MSG_NOSIGNAL),
-              static_cast<ssize_t>(lines.size()));
     EXPECT_EQ(running->TakeCommand(), "show");
     EXPECT_EQ(running->TakeCommand(), std::nullopt);
 
-    EXPECT_FALSE(SendToRunningInstance("show\nquit", "kv-test"));
-    EXPECT_FALSE(SendToRunningInstance(std::string(1000, 'x'), "kv-test"));
-    EXPECT_FALSE(SendToRunningInstance("", "kv-test"));
+    for (const std::string& bad :
+         {std::string("show\nquit"), std::string(1000, 'x'), std::string()}) {
+        EXPECT_FALSE(SendToRunningInstance(bad, "kv-test")) << bad;
+    }
     ASSERT_TRUE(SendToRunningInstance("trigger", "kv-test"));
     EXPECT_EQ(running->TakeCommand(), "trigger");
-
-    ::close(silent);
-    ::close(overlong);
-    ::close(twoLines);
+    for (int fd : {silent, overlong, twoLines}) {
+        ::close(fd);
+    }
 }
 
 TEST_F(SingleInstanceTest, NameCannotReachOutsideRuntimeFolder) {
-    fs::create_directories(runtime() / "sub");
+    fs::create_directories(runtime_ / "sub");
     auto running = AcquireSingleInstance("sub/x");
     ASSERT_NE(running, nullptr);
-    EXPECT_TRUE(fs::is_empty(runtime() / "sub"));
+    EXPECT_TRUE(fs::is_empty(runtime_ / "sub"));
     ASSERT_TRUE(SendToRunningInstance("trigger", "sub/x"));
     EXPECT_EQ(running->TakeCommand(), "trigger");
 }
@@ -165,9 +140,7 @@ TEST(SingleInstanceFallback, UsesPrivateTmpFolder_WhenRuntimeFolderIsSharedWithO
     const fs::path folder = "/tmp/kickvane-" + std::to_string(::getuid());
     struct stat st {};
     ASSERT_EQ(::lstat(folder.c_str(), &st), 0);
-    EXPECT_TRUE(S_ISDIR(st.st_mode));
-    EXPECT_EQ(st.st_uid, ::getuid());
-    EXPECT_EQ(st.st_mode & 077, 0u);
+    EXPECT_TRUE(S_ISDIR(st.st_mode) && st.st_uid == ::getuid() && (st.st_mode & 077) == 0);
     EXPECT_TRUE(fs::exists(folder / (name + ".lock")));
     ASSERT_TRUE(SendToRunningInstance("trigger", name));
     EXPECT_EQ(running->TakeCommand(), "trigger");

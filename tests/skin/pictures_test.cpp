@@ -7,31 +7,25 @@
 namespace kickvane::skin {
 namespace {
 
-bool IsMagenta(const QImage& image, int x, int y) {
-    return (image.pixel(x, y) & 0xFFFFFFu) == 0xFF00FFu;
-}
-
 int CountMagenta(const QImage& image, const QRect& area) {
     int count = 0;
     for (int y = area.top(); y <= area.bottom(); ++y) {
         for (int x = area.left(); x <= area.right(); ++x) {
-            count += IsMagenta(image, x, y) ? 1 : 0;
+            count += (image.pixel(x, y) & 0xFFFFFFu) == 0xFF00FFu ? 1 : 0;
         }
     }
     return count;
 }
 
-class PicturesTest : public ::testing::Test {
-protected:
-    static void SetUpTestSuite() { pictures_ = new SkinPictures(MakeSkinPictures()); }
-    static void TearDownTestSuite() { delete pictures_; }
-    static SkinPictures* pictures_;
-};
-SkinPictures* PicturesTest::pictures_ = nullptr;
+// One set for all tests: generating the pictures is the slow part.
+const SkinPictures& ThePictures() {
+    static const SkinPictures pictures = MakeSkinPictures();
+    return pictures;
+}
 
-TEST_F(PicturesTest, EveryPictureHasItsSize_AndOnlyKeyedOnesUseMagenta) {
+TEST(PicturesTest, EveryPictureHasItsSize_AndOnlyKeyedOnesUseMagenta) {
     std::set<std::string> names;
-    for (const NamedPicture& picture : ListPictures(*pictures_)) {
+    for (const NamedPicture& picture : ListPictures(ThePictures())) {
         names.insert(picture.name);
         ASSERT_FALSE(picture.image->isNull()) << picture.name;
         EXPECT_EQ(picture.image->size(), QSize(picture.width, picture.height)) << picture.name;
@@ -45,8 +39,8 @@ TEST_F(PicturesTest, EveryPictureHasItsSize_AndOnlyKeyedOnesUseMagenta) {
     EXPECT_EQ(names.size(), 32u);
 }
 
-TEST_F(PicturesTest, EveryArrowCellHoldsAGlyphOnTheKey) {
-    const QImage& arrows = pictures_->pArrow;
+TEST(PicturesTest, EveryArrowCellHoldsAGlyphOnTheKey) {
+    const QImage& arrows = ThePictures().pArrow;
     for (int cell = 0; cell < 20; ++cell) {
         const int keyed = CountMagenta(arrows, QRect(0, cell * 9, 9, 9));
         EXPECT_GT(keyed, 40) << cell;
@@ -54,11 +48,11 @@ TEST_F(PicturesTest, EveryArrowCellHoldsAGlyphOnTheKey) {
     }
 }
 
-TEST_F(PicturesTest, KeyedThumbsKeepTheirPointInsideTheMarginsThatDoNotStretch) {
+TEST(PicturesTest, KeyedThumbsKeepTheirPointInsideTheMarginsThatDoNotStretch) {
     // An upright thumb pointing down keeps its point in the bottom 10 rows, one pointing up in
     // the top 6; the middle rows between them are a plain body with no keyed pixels inside.
-    const QImage& down = pictures_->pTrackBarVerBottom;
-    const QImage& up = pictures_->pTrackBarVerTop;
+    const QImage& down = ThePictures().pTrackBarVerBottom;
+    const QImage& up = ThePictures().pTrackBarVerTop;
     for (int frame = 0; frame < 3; ++frame) {
         const int top = frame * 21;
         EXPECT_EQ(CountMagenta(down, QRect(1, top + 6, 9, 5)), 0);
@@ -66,7 +60,7 @@ TEST_F(PicturesTest, KeyedThumbsKeepTheirPointInsideTheMarginsThatDoNotStretch) 
         EXPECT_EQ(CountMagenta(up, QRect(1, top + 6, 9, 5)), 0);
         EXPECT_GT(CountMagenta(up, QRect(0, top, 11, 6)), 0);
     }
-    const QImage& left = pictures_->pTrackBarHorLeft;
+    const QImage& left = ThePictures().pTrackBarHorLeft;
     EXPECT_EQ(CountMagenta(left, QRect(6, 1, 5, 9)), 0);
     EXPECT_GT(CountMagenta(left, QRect(0, 0, 6, 11)), 0);
 }
