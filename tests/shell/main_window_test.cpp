@@ -5,60 +5,29 @@
 #include <QSignalSpy>
 #include <QTest>
 
-#include "fakes.h"
-#include "support/temp_dir.h"
 #include "support/trees.h"
+#include "window_fixture.h"
 
 namespace kickvane::shell {
 namespace {
 
 using catalog::GroupId;
 using catalog::OptionArray;
-using testing::FakeKeySampler;
 using testing::ReadText;
-using testing::RecordingDialogs;
-using testing::TempDir;
 using testing::WriteFile;
 
-class MainWindowTest : public ::testing::Test {
+class MainWindowTest : public testing::WindowFixture {
 protected:
-    std::unique_ptr<MainWindow> Open() {
-        ShellServices services;
-        services.dialogs = &dialogs_;
-        auto keys = std::make_unique<FakeKeySampler>();
-        keys_ = keys.get();
-        services.keySampler = std::move(keys);
-        services.playSound = [this](const std::filesystem::path& wav) { sounds_.push_back(wav); };
-        services.makeTray = [this](const QIcon&, QMenu*) {
-            auto tray = std::make_unique<testing::FakeTray>();
-            tray_ = tray.get();
-            return tray;
-        };
-        return std::make_unique<MainWindow>(tool(), std::move(services));
-    }
-
-    std::filesystem::path tool() const { return dir_ / "tool"; }
-    std::filesystem::path game() const { return dir_ / "game"; }
-
-    void Click(QWidget* widget) { QTest::mouseClick(widget, Qt::LeftButton, {}, QPoint(5, 5)); }
-
-    int VisiblePanels(const MainWindow& window) {
+    static int VisiblePanels(const MainWindow& window) {
         int visible = 0;
         for (int i = 0; i < kTabCount; ++i) {
             visible += window.panel(i)->isVisibleTo(&window) ? 1 : 0;
         }
         return visible;
     }
-
-    TempDir dir_;
-    RecordingDialogs dialogs_;
-    FakeKeySampler* keys_ = nullptr;
-    testing::FakeTray* tray_ = nullptr;
-    std::vector<std::filesystem::path> sounds_;
 };
 
 TEST_F(MainWindowTest, StartsOnFirstPanelWithDefaultsAndTheTwelveHotkeys) {
-    std::filesystem::create_directories(tool());
     auto window = Open();
 
     EXPECT_EQ(window->size(), QSize(425, 478));
@@ -79,7 +48,6 @@ TEST_F(MainWindowTest, StartsOnFirstPanelWithDefaultsAndTheTwelveHotkeys) {
 }
 
 TEST_F(MainWindowTest, TabClicksShowExactlyOnePanelWithAlignedPanelsAndFixedTabHeads) {
-    std::filesystem::create_directories(tool());
     auto window = Open();
     for (int tab : {2, 2, 3, 0, 1}) {
         Click(window->tabHead(tab));
@@ -95,27 +63,7 @@ TEST_F(MainWindowTest, TabClicksShowExactlyOnePanelWithAlignedPanelsAndFixedTabH
     }
 }
 
-TEST_F(MainWindowTest, TabHeadsUseTheActiveSkinsPicturesAndKeepOldOnesWhenMissing) {
-    QImage picture(82, 31, QImage::Format_RGB32);
-    picture.fill(Qt::blue);
-    std::filesystem::create_directories(tool() / "skin");
-    for (const char* name : {"skin1_selected.jpg", "skin1_unselect.jpg", "skin2_selected.jpg"}) {
-        picture.save(QString::fromStdString((tool() / "skin" / name).string()), "JPG");
-    }
-    auto window = Open();
-    EXPECT_TRUE(window->tabHead(0)->pictureFile().endsWith("skin/skin1_selected.jpg"));
-    EXPECT_TRUE(window->tabHead(1)->pictureFile().endsWith("skin/skin1_unselect.jpg"));
-    EXPECT_EQ(window->tabHead(1)->background(), QColor(0xE0, 0xE0, 0xE0));
-
-    window->hiddenTexts().skn = "skin2";
-    Click(window->tabHead(1));
-    EXPECT_TRUE(window->tabHead(1)->pictureFile().endsWith("skin/skin2_selected.jpg"));
-    // skin2_unselect.jpg is missing: the other heads keep the picture they had.
-    EXPECT_TRUE(window->tabHead(0)->pictureFile().endsWith("skin/skin1_selected.jpg"));
-}
-
 TEST_F(MainWindowTest, OptionButtonsFollowTheContainerRule) {
-    std::filesystem::create_directories(tool());
     auto window = Open();
     Click(window->tabHead(3));
     Click(window->optionButton(OptionArray::UniOption1, 5));

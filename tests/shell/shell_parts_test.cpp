@@ -5,44 +5,23 @@
 #include <QSignalSpy>
 #include <QTest>
 
-#include "fakes.h"
 #include "shell/alert_popup.h"
-#include "shell/main_window.h"
-#include "support/temp_dir.h"
+#include "window_fixture.h"
 
 namespace kickvane::shell {
 namespace {
 
-using testing::FakeTray;
-using testing::RecordingDialogs;
-using testing::TempDir;
-using testing::WriteFile;
-
-class ShellPartsTest : public ::testing::Test {
+class ShellPartsTest : public testing::WindowFixture {
 protected:
-    std::unique_ptr<MainWindow> Open(std::filesystem::path folder = {}) {
-        ShellServices services;
-        services.dialogs = &dialogs_;
-        services.makeTray = [this](const QIcon&, QMenu*) {
-            auto tray = std::make_unique<FakeTray>();
-            tray->hostRunning = hostRunning_;
-            tray_ = tray.get();
-            return tray;
-        };
-        services.launchGame = [this](std::string_view, engine::EngineUi&) {
-            ++launches_;
-            return engine::LaunchResult::Started;
-        };
-        services.updates.host = QUrl(QStringLiteral("http://127.0.0.1:9/"));  // nothing listens
-        auto window = std::make_unique<MainWindow>(folder.empty() ? dir_.path() : folder,
-                                                   std::move(services));
+    void SetUp() override { countLaunches_ = true; }
+
+    std::unique_ptr<MainWindow> Show(std::filesystem::path folder = {}) {
+        auto window = Open(std::move(folder));
         window->show();
         return window;
     }
 
-    void Click(QWidget* widget) { QTest::mouseClick(widget, Qt::LeftButton, {}, QPoint(5, 5)); }
-
-    QAction* TrayEntry(MainWindow& window, const QString& text) {
+    static QAction* TrayEntry(MainWindow& window, const QString& text) {
         for (QAction* action : window.trayMenu()->actions()) {
             if (action->text() == text) {
                 return action;
@@ -51,34 +30,21 @@ protected:
         return nullptr;
     }
 
-    static void FinishFade(MainWindow& window) {
-        for (int i = 0; i < 100 && window.fade().running(); ++i) {
-            window.fadeTick();
-        }
-    }
-
     static void SavePicture(QWidget& widget, const QString& name) {
         QDir().mkpath(QStringLiteral(KICKVANE_ARTIFACTS));
         widget.grab().save(QStringLiteral(KICKVANE_ARTIFACTS "/") + name);
     }
 
-    static std::filesystem::path WritePicture(const std::filesystem::path& file, QColor colour) {
+    static void WritePicture(const std::filesystem::path& file, QColor colour) {
         std::filesystem::create_directories(file.parent_path());
         QImage image(40, 20, QImage::Format_RGB32);
         image.fill(colour);
         image.save(QString::fromStdString(file.string()), "JPG");
-        return file;
     }
-
-    TempDir dir_;
-    RecordingDialogs dialogs_;
-    FakeTray* tray_ = nullptr;
-    bool hostRunning_ = true;
-    int launches_ = 0;
 };
 
 TEST_F(ShellPartsTest, StartUpFadesInToTwoFortyAndTranslucencyKeepsTheFadesPlace) {
-    auto window = Open();
+    auto window = Show();
     EXPECT_TRUE(window->fade().running());
     FinishFade(*window);
     EXPECT_EQ(window->fade().alpha(), 240);
@@ -93,7 +59,7 @@ TEST_F(ShellPartsTest, StartUpFadesInToTwoFortyAndTranslucencyKeepsTheFadesPlace
 }
 
 TEST_F(ShellPartsTest, TrayMenuHasItsFiveEntriesAndTheirActions) {
-    auto window = Open();
+    auto window = Show();
     QStringList entries;
     for (QAction* action : window->trayMenu()->actions()) {
         entries << action->text();
@@ -144,14 +110,14 @@ TEST_F(ShellPartsTest, TrayMenuHasItsFiveEntriesAndTheirActions) {
 
 TEST_F(ShellPartsTest, WithoutATrayHostHidingMinimisesSoTheWindowStaysReachable) {
     hostRunning_ = false;
-    auto window = Open();
+    auto window = Show();
     Click(window->runHiddenButton());
     EXPECT_TRUE(window->isVisible());
     EXPECT_TRUE(window->isMinimized());
 }
 
 TEST_F(ShellPartsTest, ClosingTheWindowRemovesTheTrayIcon) {
-    auto window = Open();
+    auto window = Show();
     QSignalSpy closed(window.get(), &MainWindow::closed);
     window->close();
     EXPECT_FALSE(tray_->added);
@@ -161,9 +127,9 @@ TEST_F(ShellPartsTest, ClosingTheWindowRemovesTheTrayIcon) {
 TEST_F(ShellPartsTest, SkinsRecolourTheEntriesAndUseTheirPicturesKeepingTheTab) {
     for (const char* name : {"skin1_selected", "skin1_unselect", "skin1_panel", "skin2_selected",
                              "skin2_unselect", "skin2_bg"}) {
-        WritePicture(dir_ / "skin" / (std::string(name) + ".jpg"), Qt::darkGray);
+        WritePicture(tool() / "skin" / (std::string(name) + ".jpg"), Qt::darkGray);
     }
-    auto window = Open();
+    auto window = Show();
     Click(window->tabHead(2));
     Click(window->skinButton(2));
     EXPECT_EQ(window->hiddenTexts().skn, "skin2");
@@ -191,10 +157,10 @@ TEST_F(ShellPartsTest, SkinsRecolourTheEntriesAndUseTheirPicturesKeepingTheTab) 
 }
 
 TEST_F(ShellPartsTest, LabelClicksShowTheirPreviewInOneSharedWindow) {
-    WritePicture(dir_ / "img/t2_img_3.jpg", Qt::red);
-    WritePicture(dir_ / "img/t4_img_10.jpg", Qt::green);
-    WritePicture(dir_ / "img/t1_img_12.jpg", Qt::blue);
-    auto window = Open();
+    WritePicture(tool() / "img/t2_img_3.jpg", Qt::red);
+    WritePicture(tool() / "img/t4_img_10.jpg", Qt::green);
+    WritePicture(tool() / "img/t1_img_12.jpg", Qt::blue);
+    auto window = Show();
 
     Click(window->categoryLabel(12));
     ASSERT_NE(window->previewWindow(), nullptr);
@@ -214,13 +180,12 @@ TEST_F(ShellPartsTest, LabelClicksShowTheirPreviewInOneSharedWindow) {
     EXPECT_TRUE(preview->pictureFile().endsWith("img/t4_img_10.jpg"));
     EXPECT_TRUE(preview->isVisible());
 
-    EXPECT_EQ(PreviewPicture(dir_.path(), catalog::LabelArray::UniLabel3, 9).filename(),
-              "t4_img_9.jpg");
-    EXPECT_TRUE(PreviewPicture(dir_.path(), catalog::LabelArray::UniLabel1, 4).empty());
+    EXPECT_EQ(PreviewPicture(tool(), catalog::LabelArray::UniLabel3, 9).filename(), "t4_img_9.jpg");
+    EXPECT_TRUE(PreviewPicture(tool(), catalog::LabelArray::UniLabel1, 4).empty());
 }
 
 TEST_F(ShellPartsTest, CheckButtonRunsTheUpdateCheckAndReportsAnUnreachableHost) {
-    auto window = Open();
+    auto window = Show();
     QSignalSpy finished(window->updateFlow(), &UpdateFlow::checkFinished);
     Click(window->checkUpdateButton());
     ASSERT_TRUE(finished.wait(15000));
@@ -253,7 +218,7 @@ TEST_F(ShellPartsTest, PopupWindowFollowsItsModelAndClosesWhenItFinishes) {
 }
 
 TEST_F(ShellPartsTest, HelpWindowShowsTheGuideVerbatim) {
-    auto window = Open();
+    auto window = Show();
     Click(window->helpButton());
     const QString help = HelpText();
     EXPECT_TRUE(help.startsWith("Hướng dẫn sử dụng:\r\n 1. Tại thẻ đầu tiên"));
@@ -267,7 +232,7 @@ TEST_F(ShellPartsTest, ScreenshotsOfBothSkinsAndAPreview) {
     if (!std::filesystem::exists(tool / "skin/skin2_bg.jpg")) {
         GTEST_SKIP() << "the artwork is not built";
     }
-    auto window = Open(tool);
+    auto window = Show(tool);
     FinishFade(*window);
     SavePicture(*window, "window-skin1.png");
     window->applySkin(DarkSkin());
