@@ -2,13 +2,19 @@
 
 #include <QMouseEvent>
 #include <QPainter>
+#include <QPixmapCache>
 
 namespace kickvane::shell {
 
 bool LoadPicture(QPixmap& pixmap, const QString& file) {
+    // The same few skin pictures are drawn on every tab switch and by all four panels: decode
+    // each file once and share it.
     QPixmap loaded;
-    if (!loaded.load(file)) {
-        return false;
+    if (!QPixmapCache::find(file, &loaded)) {
+        if (!loaded.load(file)) {
+            return false;
+        }
+        QPixmapCache::insert(file, loaded);
     }
     pixmap = loaded;
     return true;
