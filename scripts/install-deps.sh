@@ -4,8 +4,8 @@
 set -euo pipefail
 
 packages=(
-  # build
-  cmake ninja-build g++ pkg-config clang-format
+  # build (MinGW-w64 cross-compiles the core for Windows, to keep those backends building)
+  cmake ninja-build g++ pkg-config clang-format g++-mingw-w64-x86-64-posix
   # libraries
   qt6-base-dev libqt6network6 libgl-dev
   libx11-dev libxi-dev libxtst-dev libcanberra-dev

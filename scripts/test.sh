@@ -14,3 +14,7 @@ for preset in default asan; do
   echo "== $preset: test"
   ctest --preset "$preset" -j "$jobs"
 done
+
+echo "== windows-core: cross-build"
+cmake --preset windows-core >/dev/null
+cmake --build --preset windows-core -j "$jobs"

@@ -1,6 +1,8 @@
 // File system backend for Windows, where names are case-insensitive already and the game's
 // folders are native paths.
 #include <windows.h>
+// windows.h names its own ReplaceFile function as a macro; ours is the one declared below.
+#undef ReplaceFile
 
 #include <fstream>
 #include <random>
@@ -23,7 +25,8 @@ fs::path TemporaryBeside(const fs::path& target) {
 }
 
 Status MoveOver(const fs::path& from, const fs::path& to) {
-    if (!::MoveFileExW(from.c_str(), to.c_str(), MOVEFILE_REPLACE_EXISTING | MOVEFILE_WRITE_THROUGH)) {
+    if (!::MoveFileExW(from.c_str(), to.c_str(),
+                       MOVEFILE_REPLACE_EXISTING | MOVEFILE_WRITE_THROUGH)) {
         const std::string error = LastErrorText();
         std::error_code ignored;
         fs::remove(from, ignored);
@@ -34,7 +37,9 @@ Status MoveOver(const fs::path& from, const fs::path& to) {
 
 }  // namespace
 
-fs::path ResolveCaseInsensitive(const fs::path& path) { return path; }
+fs::path ResolveCaseInsensitive(const fs::path& path) {
+    return path;
+}
 
 Status MakeDirectory(const fs::path& path) {
     if (!::CreateDirectoryW(path.c_str(), nullptr)) {
@@ -87,7 +92,8 @@ Status WriteFileAtomically(const fs::path& path, std::string_view content) {
 fs::path ProgramFolder() {
     std::wstring buffer(MAX_PATH, L'\0');
     for (;;) {
-        const DWORD length = ::GetModuleFileNameW(nullptr, buffer.data(), static_cast<DWORD>(buffer.size()));
+        const DWORD length =
+            ::GetModuleFileNameW(nullptr, buffer.data(), static_cast<DWORD>(buffer.size()));
         if (length < buffer.size()) {
             buffer.resize(length);
             return fs::path(buffer).parent_path();

@@ -2,8 +2,9 @@
 // file is missing or cannot be played; SND_ASYNC returns at once.
 #include "platform/sound.h"
 
-#include <mmsystem.h>
 #include <windows.h>
+// mmsystem.h needs the types of windows.h first.
+#include <mmsystem.h>
 
 namespace kickvane::platform {
 
