@@ -256,8 +256,8 @@ void MainWindow::buildButtons() {
                 [this, group, index] { emit labelClicked(group->labels, index); });
     }
 
-    auto* hotkeyLabel = new QLabel(QStringLiteral("Phím tắt:"), this);
-    hotkeyLabel->setGeometry(9, 446, 60, 22);
+    hotkeyLabel_ = new QLabel(QStringLiteral("Phím tắt:"), this);
+    hotkeyLabel_->setGeometry(9, 446, 60, 22);
     hotkey_ = new QComboBox(this);
     hotkey_->setEditable(true);
     hotkey_->setMaxVisibleItems(12);
@@ -567,15 +567,17 @@ void MainWindow::applySkin(const SkinLook& look) {
     for (PictureBox* frame : groupFrames_) {
         frame->setBackground(look.entryBackground);
     }
-    // Headings on the panels and in the frames follow the labels' text colour, so they stay
-    // readable on the dark panels of skin 2.
+    // Headings on the panels and in the frames, and the hotkey's caption, follow the labels' text
+    // colour, so they stay readable on the dark pictures of skin 2.
+    QList<QLabel*> headings{hotkeyLabel_};
     for (PictureBox* panel : panels_) {
-        for (QLabel* heading : panel->findChildren<QLabel*>()) {
-            if (!qobject_cast<ClickableLabel*>(heading)) {
-                QPalette palette = heading->palette();
-                palette.setColor(QPalette::WindowText, look.labelText);
-                heading->setPalette(palette);
-            }
+        headings += panel->findChildren<QLabel*>();
+    }
+    for (QLabel* heading : headings) {
+        if (!qobject_cast<ClickableLabel*>(heading)) {
+            QPalette palette = heading->palette();
+            palette.setColor(QPalette::WindowText, look.labelText);
+            heading->setPalette(palette);
         }
     }
     hidden_.skn = look.name;

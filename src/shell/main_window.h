@@ -2,6 +2,7 @@
 
 #include <QCheckBox>
 #include <QComboBox>
+#include <QLabel>
 #include <QLineEdit>
 #include <QMenu>
 #include <QPointer>
@@ -200,6 +201,7 @@ private:
     QLineEdit* gameFolder_ = nullptr;
     QPushButton* browse_ = nullptr;
     QComboBox* hotkey_ = nullptr;
+    QLabel* hotkeyLabel_ = nullptr;
     QPushButton* save_ = nullptr;
     QPushButton* launch_ = nullptr;
     QPushButton* quickLoad_ = nullptr;
