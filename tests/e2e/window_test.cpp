@@ -6,7 +6,7 @@
 
 #include "support/temp_dir.h"
 #include "support/trees.h"
-#include "x_display.h"
+#include "support/x_server.h"
 
 namespace kickvane::testing {
 namespace {
@@ -15,7 +15,7 @@ const std::string kWindowTitle = "Kickvane v2.0";
 
 class WindowTest : public ::testing::Test {
 protected:
-    static void SetUpTestSuite() { display_ = XDisplay::Start().release(); }
+    static void SetUpTestSuite() { display_ = XServer::Start().release(); }
     static void TearDownTestSuite() {
         delete display_;
         display_ = nullptr;
@@ -25,7 +25,7 @@ protected:
         if (!display_) {
             GTEST_SKIP() << "no Xvfb here";
         }
-        ::setenv("DISPLAY", display_->name().c_str(), 1);
+        ::setenv("DISPLAY", display_->display().c_str(), 1);
         ::setenv("XDG_RUNTIME_DIR", (dir_ / "runtime").c_str(), 1);
         fs::create_directories(dir_ / "runtime");
         fs::permissions(dir_ / "runtime", fs::perms::owner_all, fs::perm_options::replace);
@@ -73,16 +73,16 @@ protected:
                 "'");
     }
 
-    static XDisplay* display_;
+    static XServer* display_;
     TempDir dir_;
 };
 
-XDisplay* WindowTest::display_ = nullptr;
+XServer* WindowTest::display_ = nullptr;
 
 TEST_F(WindowTest, HotkeyPressedInAnotherWindowAppliesThePatches) {
     WriteSettings("F7");
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle));
+    ASSERT_TRUE(WindowShown(kWindowTitle)) << ReadText(dir_ / "kickvane.log");
     SaveScreenshot(FindWindow(kWindowTitle), "window-after-start.png");
 
     auto focused = FocusOtherWindow();
@@ -95,7 +95,7 @@ TEST_F(WindowTest, HotkeyPressedInAnotherWindowAppliesThePatches) {
 TEST_F(WindowTest, HotkeyTextThatNamesNoKeyTriggersNothing) {
     WriteSettings("f7");
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle));
+    ASSERT_TRUE(WindowShown(kWindowTitle)) << ReadText(dir_ / "kickvane.log");
     auto focused = FocusOtherWindow();
     for (const char* key : {"F7", "F1", "F12"}) {
         Capture(std::string("xdotool key ") + key);
@@ -110,7 +110,7 @@ TEST_F(WindowTest, SecondStartIsRefusedAndLeavesTheFirstRunning) {
     WriteSettings("F7");
     const std::string before = ReadText(tool() / "ThietLap.ini");
     auto first = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle));
+    ASSERT_TRUE(WindowShown(kWindowTitle)) << ReadText(dir_ / "kickvane.log");
 
     auto second = StartKickvane("second.log");
     ASSERT_TRUE(WindowShown("Thông báo"));
@@ -127,7 +127,7 @@ TEST_F(WindowTest, TriggerCommandRunsThePatchesInTheRunningCopy) {
     EXPECT_NE(ChildProcess({KICKVANE_BINARY, "trigger"}).Wait(), 0);  // nothing runs yet
 
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle));
+    ASSERT_TRUE(WindowShown(kWindowTitle)) << ReadText(dir_ / "kickvane.log");
     EXPECT_EQ(ChildProcess({KICKVANE_BINARY, "trigger"}).Wait(), 0);
     EXPECT_TRUE(WaitFor([&] { return fs::exists(applied()); }));
 }

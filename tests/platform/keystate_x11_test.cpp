@@ -1,11 +1,6 @@
 // Global key state against a real X server: each test starts its own Xvfb and presses keys with
 // xdotool, which sends them through XTEST like a keyboard would.
-#include <fcntl.h>
 #include <gtest/gtest.h>
-#include <poll.h>
-#include <signal.h>
-#include <spawn.h>
-#include <sys/wait.h>
 #include <unistd.h>
 
 #include <cstdlib>
@@ -17,35 +12,19 @@
 #include "platform/process.h"
 #include "platform/scoped_env.h"
 #include "platform/wait_until.h"
+#include "support/x_server.h"
 
 // Xlib last: its macros (Status, None, Bool) would clash with the project's names.
 #include <X11/Xlib.h>
-
-extern char** environ;
 
 namespace kickvane::platform {
 namespace {
 
 using testing::ScopedEnv;
 using testing::WaitUntil;
+using testing::XServer;
 
 constexpr int kF7 = 0x76;
-
-// Starts a program found on PATH, its errors discarded; its pid, or -1.
-pid_t Spawn(std::vector<std::string> command) {
-    std::vector<char*> argv;
-    for (std::string& part : command) {
-        argv.push_back(part.data());
-    }
-    argv.push_back(nullptr);
-    posix_spawn_file_actions_t actions;
-    posix_spawn_file_actions_init(&actions);
-    posix_spawn_file_actions_addopen(&actions, STDERR_FILENO, "/dev/null", O_WRONLY, 0);
-    pid_t pid = -1;
-    const int spawned = ::posix_spawnp(&pid, argv[0], &actions, nullptr, argv.data(), environ);
-    posix_spawn_file_actions_destroy(&actions);
-    return spawned == 0 ? pid : -1;
-}
 
 void Xdotool(const std::string& action, const std::string& key = "F7") {
     const std::string command = "xdotool " + action + " --delay 0 " + key;
@@ -54,27 +33,11 @@ void Xdotool(const std::string& action, const std::string& key = "F7") {
 
 class KeySamplerX11Test : public ::testing::Test {
 protected:
-    // Starts an Xvfb of this test's own. -displayfd lets the server choose a free display and
-    // write its number once it accepts connections, so parallel runs never race for a display.
     void SetUp() override {
-        if (FindOnPath("Xvfb").empty() || FindOnPath("xdotool").empty()) {
+        if (FindOnPath("xdotool").empty() || !(server_ = XServer::Start("320x240x24"))) {
             GTEST_SKIP() << "Xvfb and xdotool are needed for this test";
         }
-        int fds[2];
-        ASSERT_EQ(::pipe(fds), 0);
-        xvfb_ = Spawn({"Xvfb", "-displayfd", std::to_string(fds[1]), "-nolisten", "tcp", "-screen",
-                       "0", "320x240x24"});
-        ::close(fds[1]);
-        std::string number;
-        pollfd readable{fds[0], POLLIN, 0};
-        char c = 0;
-        while (xvfb_ > 0 && ::poll(&readable, 1, 30000) == 1 && ::read(fds[0], &c, 1) == 1 &&
-               c != '\n') {
-            number += c;
-        }
-        ::close(fds[0]);
-        ASSERT_TRUE(c == '\n' && !number.empty()) << "Xvfb did not start";
-        display_.emplace("DISPLAY", ":" + number);
+        display_.emplace("DISPLAY", server_->display());
         sampler_ = CreateKeySampler();
         ASSERT_NE(sampler_, nullptr);
     }
@@ -82,10 +45,7 @@ protected:
     void TearDown() override {
         sampler_.reset();
         display_.reset();
-        if (xvfb_ > 0) {
-            ::kill(xvfb_, SIGTERM);
-            ::waitpid(xvfb_, nullptr, 0);
-        }
+        server_.reset();
     }
 
     // Samples F7 until a press shows (xdotool's events reach the sampler shortly after it ends);
@@ -96,7 +56,7 @@ protected:
         return sample;
     }
 
-    pid_t xvfb_ = -1;
+    std::unique_ptr<XServer> server_;
     std::optional<ScopedEnv> display_;
     std::unique_ptr<KeySampler> sampler_;
 };

@@ -70,10 +70,14 @@ public:
         return exitCode_;
     }
 
+    // Asks the program to end (an X server then removes its socket), and kills it if it does not.
     void Kill() {
         if (Running()) {
-            ::kill(pid_, SIGKILL);
-            Reap(0);
+            ::kill(pid_, SIGTERM);
+            if (!Wait(std::chrono::seconds(3))) {
+                ::kill(pid_, SIGKILL);
+                Reap(0);
+            }
         }
     }
 
