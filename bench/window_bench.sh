@@ -6,7 +6,7 @@ cd "$(dirname "$0")/.."
 build=${1:-build/default}
 
 display=:$((300 + RANDOM % 300))
-Xvfb "$display" -screen 0 1280x800x24 -nolisten tcp >/dev/null 2>&1 &
+Xvfb "$display" -screen 0 1280x800x24 -nolisten tcp -noreset >/dev/null 2>&1 &
 xvfb=$!
 runtime=$(mktemp -d)
 trap 'kill $xvfb 2>/dev/null; rm -rf "$runtime"' EXIT

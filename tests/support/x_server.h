@@ -11,8 +11,10 @@
 namespace kickvane::testing {
 
 // A virtual X server of a test's own. -displayfd lets Xvfb choose a free display and write its
-// number once it accepts connections, so parallel tests never race for a display. Null where
-// Xvfb is not installed; the tests then skip.
+// number once it accepts connections, so parallel tests never race for a display. -noreset keeps
+// it from resetting when its last client leaves: a program that connects while a short-lived
+// xdotool disconnects would otherwise be refused. Null where Xvfb is not installed; the tests
+// then skip.
 class XServer {
 public:
     static std::unique_ptr<XServer> Start(const std::string& screen = "1280x800x24") {
@@ -23,9 +25,9 @@ public:
         if (::pipe(fds) != 0) {
             return nullptr;
         }
-        auto server =
-            std::unique_ptr<XServer>(new XServer({"Xvfb", "-displayfd", std::to_string(fds[1]),
-                                                  "-nolisten", "tcp", "-screen", "0", screen}));
+        auto server = std::unique_ptr<XServer>(
+            new XServer({"Xvfb", "-displayfd", std::to_string(fds[1]), "-nolisten", "tcp",
+                         "-noreset", "-screen", "0", screen}));
         ::close(fds[1]);
         std::string number;
         char c = 0;
