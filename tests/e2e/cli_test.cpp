@@ -40,70 +40,55 @@ protected:
     TempDir dir_;
 };
 
-TEST_F(CliTest, ApplyCopiesTheChosenSetsAndPrintsEachStep) {
+TEST_F(CliTest, PlanListsTheStepsAndApplyExitsZeroOneOrTwo) {
     MakeToolFolder(tool());
     MakeGameFolder(game());
-    const Result run = Kickvane("apply " + Folders());
-    EXPECT_EQ(run.exitCode, 0) << run.err;
-    EXPECT_NE(run.out.find("done     Bong: merge ExtrasFolder\\Ball\\Europa League 2011"),
-              std::string::npos);
-    EXPECT_NE(run.out.find("skipped  Gdien: merge ToolDataRoot\\gui\\font"), std::string::npos);
-    EXPECT_EQ(ReadText(game() / "zdata/data2/ball/ball10.dds"), "europa ball");
-}
-
-TEST_F(CliTest, ApplyTakesTheGameFolderFromTheSettingsAndExitsOneOnFailedSteps) {
-    MakeToolFolder(tool());
-    MakeGameFolder(game(), /*withZData=*/false);
-    WriteFile(tool() / "thietlap.ini",
-              "[Thiet lap]\r\nDuongDan=" + game().string() + "\r\n[Thay doi]\r\nCDV=1\r\n");
-    const Result run = Kickvane("apply --tool-folder " + Quote(tool()));
-    EXPECT_EQ(run.exitCode, 1);
-    EXPECT_NE(run.err.find("failed: CDV: merge ToolZDataRoot\\crowd\\textures"), std::string::npos);
-    EXPECT_TRUE(fs::exists(game() / "data2/cmn/base.dds"));
-}
-
-TEST_F(CliTest, ApplyStopsWithExitTwoWhenAFolderCheckFails) {
-    MakeToolFolder(tool());
-    fs::create_directories(game());
-    const Result run = Kickvane("apply " + Folders());
-    EXPECT_EQ(run.exitCode, 2);
-    EXPECT_NE(run.err.find("Không tìm thấy thư mục chứa FIFA Online 2"), std::string::npos);
-    EXPECT_TRUE(fs::is_empty(game()));
-
-    fs::remove_all(tool() / "data");
-    const Result noBase = Kickvane("apply " + Folders());
-    EXPECT_EQ(noBase.exitCode, 2);
-    EXPECT_NE(noBase.err.find("Thu muc nguon: Khong tim thay: "), std::string::npos);
-}
-
-TEST_F(CliTest, PlanListsTheStepsAndCopiesNothing) {
-    MakeToolFolder(tool());
-    MakeGameFolder(game());
-    const Result run = Kickvane("plan " + Folders());
-    EXPECT_EQ(run.exitCode, 0);
-    EXPECT_NE(run.out.find(
-                  "Mark: merge ToolDataRoot\\gui\\hud\\Indicator -> DataRoot\\gui\\hud\\Indicator"),
+    const Result plan = Kickvane("plan " + Folders());
+    EXPECT_EQ(plan.exitCode, 0);
+    EXPECT_NE(plan.out.find("Mark: merge ToolDataRoot\\gui\\hud\\Indicator -> "
+                            "DataRoot\\gui\\hud\\Indicator"),
               std::string::npos);
     EXPECT_FALSE(fs::exists(game() / "data2/cmn"));
+
+    const Result done = Kickvane("apply " + Folders());
+    EXPECT_EQ(done.exitCode, 0) << done.err;
+    EXPECT_NE(done.out.find("done     Bong: merge ExtrasFolder\\Ball\\Europa League 2011"),
+              std::string::npos);
+    EXPECT_NE(done.out.find("skipped  Gdien: merge ToolDataRoot\\gui\\font"), std::string::npos);
+
+    // The game folder comes from the settings when not given.
+    fs::remove_all(game() / "zdata");
+    WriteFile(tool() / "thietlap.ini",
+              "[Thiet lap]\r\nDuongDan=" + game().string() + "\r\n[Thay doi]\r\nCDV=1\r\n");
+    const std::string apply = "apply --tool-folder " + Quote(tool());
+    const Result failed = Kickvane(apply);
+    EXPECT_EQ(failed.exitCode, 1);
+    EXPECT_NE(failed.err.find("failed: CDV: merge ToolZDataRoot\\crowd\\textures"),
+              std::string::npos);
+
+    fs::remove_all(game() / "data2");
+    const Result noData = Kickvane(apply);
+    EXPECT_EQ(noData.exitCode, 2);
+    EXPECT_NE(noData.err.find("Không tìm thấy thư mục chứa FIFA Online 2"), std::string::npos);
+    fs::remove_all(tool() / "data");
+    const Result noBase = Kickvane(apply);
+    EXPECT_EQ(noBase.exitCode, 2);
+    EXPECT_NE(noBase.err.find("Thu muc nguon: Khong tim thay: "), std::string::npos);
 }
 
 TEST_F(CliTest, QuickLoadExitCodes) {
     fs::create_directories(tool() / "data/data2/players/heads/textures");
     WriteFile(dir_ / "faces/face1.dds", "face");
     WriteFile(dir_ / "faces/skin1.dds", "skin");  // no bodies folder in the base set
-    const Result partly =
-        Kickvane("quick-load " + Quote(dir_ / "faces") + " --tool-folder " + Quote(tool()));
+    const auto quickLoad = [&](const char* folder) {
+        return Kickvane("quick-load " + Quote(dir_ / folder) + " --tool-folder " + Quote(tool()));
+    };
+    const Result partly = quickLoad("faces");
     EXPECT_EQ(partly.exitCode, 1);
     EXPECT_EQ(partly.out, "Hoàn tất!\n");
-    EXPECT_TRUE(fs::exists(tool() / "data/data2/players/heads/textures/face1.dds"));
-
     fs::remove(dir_ / "faces/skin1.dds");
-    EXPECT_EQ(Kickvane("quick-load " + Quote(dir_ / "faces") + " --tool-folder " + Quote(tool()))
-                  .exitCode,
-              0);
-
-    const Result empty =
-        Kickvane("quick-load " + Quote(dir_ / "nothing") + " --tool-folder " + Quote(tool()));
+    EXPECT_EQ(quickLoad("faces").exitCode, 0);
+    const Result empty = quickLoad("nothing");
     EXPECT_EQ(empty.exitCode, 2);
     EXPECT_EQ(empty.err, "Bạn chưa chọn thư mục nào!\n");
 }

@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+
 #include "fake_ui.h"
 #include "support/trees.h"
 
@@ -10,7 +12,6 @@ namespace {
 
 using catalog::OptionArray;
 using catalog::PatchSelection;
-using testing::FakeUi;
 using testing::ReadText;
 using testing::TempDir;
 using testing::WriteFile;
@@ -25,64 +26,57 @@ protected:
     fs::path tool() const { return dir_ / "tool"; }
     fs::path game() const { return dir_ / "game"; }
 
-    ApplyOutcome Apply(const PatchSelection& selection) {
-        return ApplyPatches(tool(), game().string(), selection, ui_);
+    ApplyOutcome Apply(const PatchSelection& selection, const std::string& suffix = "") {
+        return ApplyPatches(tool(), game().string() + suffix, selection, ui_);
     }
 
-    static PatchSelection AllOff() {
+    // Only the given categories on; the chosen variants stay at their defaults.
+    static PatchSelection Only(std::initializer_list<int> categories) {
         PatchSelection selection = PatchSelection::Defaults();
         for (int i = 0; i < catalog::kCategoryCount; ++i) {
-            selection.setSwitchValue(i, 0);
+            selection.setSwitchValue(
+                i, static_cast<int>(std::count(categories.begin(), categories.end(), i)));
         }
         return selection;
     }
 
     TempDir dir_;
-    FakeUi ui_;
+    testing::FakeUi ui_;
 };
 
-TEST_F(ApplyTest, MissingToolBaseSetStopsWithThePlainMessageFirst) {
+TEST_F(ApplyTest, FolderChecksStopTheRunWithTheirMessageBeforeAnyCopyOrSound) {
+    fs::remove_all(game() / "data2");
+    EXPECT_EQ(Apply(PatchSelection::Defaults()).stoppedBy, RootProblem::DataMissing);
+    EXPECT_EQ(ui_.messages.shown, std::vector<std::string>{"Không tìm thấy thư mục chứa FIFA "
+                                                           "Online 2\r\nVui lòng kiểm tra lại "
+                                                           "đường dẫn"});
+
+    // The tool's own base set is checked first, with a plain message.
     fs::remove_all(tool() / "data");
-    fs::remove_all(game() / "data2");
     const ApplyOutcome outcome = Apply(PatchSelection::Defaults());
-
     EXPECT_EQ(outcome.stoppedBy, RootProblem::ToolDataMissing);
-    ASSERT_EQ(ui_.plain.size(), 1u);
-    EXPECT_EQ(ui_.plain[0], "Thu muc nguon|Khong tim thay: " + (tool() / "data/data2").string() +
-                                "\r\nKiem tra lai duong dan");
-    EXPECT_TRUE(ui_.messages.shown.empty());
-    EXPECT_TRUE(ui_.sounds.empty());
+    EXPECT_EQ(ui_.plain, std::vector<std::string>{
+                             "Thu muc nguon|Khong tim thay: " + (tool() / "data/data2").string() +
+                             "\r\nKiem tra lai duong dan"});
+    EXPECT_EQ(ui_.messages.shown.size(), 1u);
     EXPECT_TRUE(outcome.steps.empty());
-}
-
-TEST_F(ApplyTest, MissingGameDataStopsWithTheConvertedMessageAndNoSound) {
-    fs::remove_all(game() / "data2");
-    const ApplyOutcome outcome = Apply(PatchSelection::Defaults());
-
-    EXPECT_EQ(outcome.stoppedBy, RootProblem::DataMissing);
-    ASSERT_EQ(ui_.messages.shown.size(), 1u);
-    EXPECT_EQ(ui_.messages.shown[0],
-              "Không tìm thấy thư mục chứa FIFA Online 2\r\nVui lòng kiểm tra lại đường dẫn");
     EXPECT_TRUE(ui_.sounds.empty());
     EXPECT_FALSE(fs::exists(game() / "zdata/data2/ball"));
 }
 
-TEST_F(ApplyTest, AllCategoriesOffCopiesNothingButPlaysTheSound) {
-    const ApplyOutcome outcome = Apply(AllOff());
-    EXPECT_TRUE(outcome.steps.empty());
-    ASSERT_EQ(ui_.sounds.size(), 1u);
-    EXPECT_EQ(ui_.sounds[0], tool() / "sound.wav");
+TEST_F(ApplyTest, NothingChosenStillPlaysTheSound) {
+    EXPECT_TRUE(Apply(Only({})).steps.empty());
+    EXPECT_EQ(ui_.sounds, std::vector<fs::path>{tool() / "sound.wav"});
 }
 
-TEST_F(ApplyTest, DefaultRunCopiesEverySetAndASecondRunChangesNothing) {
-    fs::create_directories(game() / "data2/teams");  // emblems missing: only the second mkdir runs
+TEST_F(ApplyTest, DefaultRunMergesIntoFoldersOfAnyCaseAndASecondRunCopiesNothing) {
+    fs::create_directories(game() / "data2/teams");  // its make-folder step is not needed
     fs::rename(game() / "data2/players", game() / "data2/Players");
     WriteFile(game() / "data2/Players/Kit/only_in_game.dds", "keep me");
 
     const ApplyOutcome first = Apply(PatchSelection::Defaults());
     EXPECT_TRUE(first.Failures().empty());
     EXPECT_EQ(ReadText(game() / "zdata/data2/ball/ball10.dds"), "europa ball");
-    // Merged into the folders that exist under another letter case.
     EXPECT_EQ(ReadText(game() / "data2/Players/Kit/base.dds"), "base players/kit");
     EXPECT_EQ(ReadText(game() / "data2/Players/Kit/only_in_game.dds"), "keep me");
     EXPECT_FALSE(fs::exists(game() / "data2/players"));
@@ -91,7 +85,11 @@ TEST_F(ApplyTest, DefaultRunCopiesEverySetAndASecondRunChangesNothing) {
     // The base set has no "gui\font": that one folder is skipped, the others are copied.
     EXPECT_FALSE(fs::exists(game() / "data2/gui/font"));
     EXPECT_TRUE(fs::exists(game() / "data2/gui/loading/base.dds"));
-    EXPECT_FALSE(fs::exists(game() / "zdata/data2/crowd"));
+    int notNeeded = 0;
+    for (const StepOutcome& step : first.steps) {
+        notNeeded += step.state == StepState::NotNeeded ? 1 : 0;
+    }
+    EXPECT_EQ(notNeeded, 2);  // "make folder DataRoot\teams" and "gui\font"
 
     const ApplyOutcome second = Apply(PatchSelection::Defaults());
     ASSERT_EQ(second.steps.size(), first.steps.size());
@@ -99,69 +97,44 @@ TEST_F(ApplyTest, DefaultRunCopiesEverySetAndASecondRunChangesNothing) {
         EXPECT_EQ(step.files.copied, 0) << Describe(step.step);
         EXPECT_NE(step.state, StepState::Failed) << Describe(step.step);
     }
-    EXPECT_EQ(ui_.sounds.size(), 2u);
 }
 
-TEST_F(ApplyTest, MissingSecondTreeFailsOnlyItsCopiesAndTheRunGoesOn) {
+TEST_F(ApplyTest, FailedStepsAreListedWithAReasonAndTheRunGoesOn) {
     fs::remove_all(game() / "zdata");
+    fs::create_directories(game() / "data2/cmn/base.dds");  // a folder where the file goes
     PatchSelection selection = PatchSelection::Defaults();
     selection.setSwitchValue(12, 1);
     selection.setSwitchValue(13, 1);
-    selection.setOptionValue(OptionArray::UniOption1, 5, true);  // pitch Caro: step 5 goes to zdata
+    selection.setOptionValue(OptionArray::UniOption1, 5, true);  // pitch Caro
     const ApplyOutcome outcome = Apply(selection);
 
-    std::vector<std::string> failed;
-    for (const StepOutcome& step : outcome.Failures()) {
-        failed.push_back(Describe(step.step));
-        EXPECT_FALSE(step.reason.empty());
+    ASSERT_FALSE(outcome.stopped());
+    for (const StepOutcome& step : outcome.steps) {
+        const bool blocked = step.step.target.root == Root::ZData || step.step.category == 5;
+        EXPECT_EQ(step.state == StepState::Failed, blocked) << Describe(step.step);
+        EXPECT_EQ(step.reason.empty(), !blocked) << Describe(step.step);
     }
-    EXPECT_EQ(failed, (std::vector<std::string>{
-                          "merge ExtrasFolder\\Ball\\Europa League 2011 -> ZDataRoot\\ball",
-                          "merge ToolZDataRoot\\pitch -> ZDataRoot\\pitch",
-                          "merge ToolZDataRoot\\crowd\\textures -> ZDataRoot\\crowd\\textures",
-                          "merge ToolZDataRoot\\stadiums -> ZDataRoot\\stadiums"}));
+    EXPECT_EQ(outcome.Failures().size(), 5u);
     EXPECT_EQ(ReadText(game() / "data2/gui/hud/Indicator/base.dds"), "base gui/hud/Indicator");
     EXPECT_EQ(ui_.sounds.size(), 1u);
 }
 
 TEST_F(ApplyTest, PitchVariantEndsWithTheBaseSetsDirtAndLines) {
-    PatchSelection selection = AllOff();
-    selection.setSwitchValue(1, 1);
+    PatchSelection selection = Only({1});
     selection.setOptionValue(OptionArray::UniOption1, 5, true);
-    const ApplyOutcome outcome = Apply(selection);
-
-    EXPECT_TRUE(outcome.Failures().empty());
-    EXPECT_EQ(ReadText(game() / "data2/pitch/textures/grass.dds"), "caro grass");
-    EXPECT_EQ(ReadText(game() / "data2/pitch/textures/shadow.dds"), "shared shadow");
-    EXPECT_EQ(ReadText(game() / "data2/pitch/textures/grass_dirt.dds"), "base dirt");
-    EXPECT_EQ(ReadText(game() / "data2/pitch/textures/grass_pitchlines.dds"), "base lines");
+    // A trailing separator on the game folder names the same folders.
+    EXPECT_TRUE(Apply(selection, "/").Failures().empty());
+    const fs::path textures = game() / "data2/pitch/textures";
+    EXPECT_EQ(ReadText(textures / "grass.dds"), "caro grass");
+    EXPECT_EQ(ReadText(textures / "shadow.dds"), "shared shadow");
+    EXPECT_EQ(ReadText(textures / "grass_dirt.dds"), "base dirt");
+    EXPECT_EQ(ReadText(textures / "grass_pitchlines.dds"), "base lines");
 }
 
-TEST_F(ApplyTest, FileThatCannotBeReplacedFailsItsStepOnly) {
-    fs::create_directories(game() / "data2/cmn/base.dds");  // a folder where the file goes
-    PatchSelection selection = AllOff();
-    selection.setSwitchValue(5, 1);
-    selection.setSwitchValue(8, 1);
-    const ApplyOutcome outcome = Apply(selection);
-
-    ASSERT_EQ(outcome.Failures().size(), 1u);
-    EXPECT_EQ(outcome.Failures()[0].step.category, 5);
-    EXPECT_EQ(ReadText(game() / "data2/players/kit/base.dds"), "base players/kit");
-}
-
-TEST_F(ApplyTest, GameFolderWithTrailingSeparatorNamesTheSameFolders) {
-    PatchSelection selection = AllOff();
-    selection.setSwitchValue(5, 1);
-    const ApplyOutcome outcome = ApplyPatches(tool(), game().string() + "/", selection, ui_);
-    EXPECT_FALSE(outcome.stopped());
-    EXPECT_TRUE(fs::exists(game() / "data2/cmn/base.dds"));
-}
-
-TEST(MergeCopy, CreatesTargetButNotItsParentAndFailsOnMissingSource) {
+// A missing parent of the target fails the copy too; the failed steps above show that.
+TEST(MergeCopy, FailsOnAMissingSourceAndFindsTheSourceInAnyCase) {
     TempDir dir;
     WriteFile(dir / "src/sub/a.dds", "a");
-    EXPECT_FALSE(MergeCopy(dir / "src", dir / "no/parent").ok());
-    EXPECT_FALSE(fs::exists(dir / "no"));
     EXPECT_FALSE(MergeCopy(dir / "missing", dir / "dst").ok());
     EXPECT_FALSE(fs::exists(dir / "dst"));
 
@@ -171,10 +144,11 @@ TEST(MergeCopy, CreatesTargetButNotItsParentAndFailsOnMissingSource) {
     EXPECT_EQ(count.copied, 1);
 }
 
-TEST(MakeFolder, FailsWhenTheFolderExistsInAnyCase) {
+TEST(MakeFolder, FailsWhenTheFolderExistsInAnyCaseOrItsParentIsMissing) {
     TempDir dir;
     fs::create_directories(dir / "Teams");
     EXPECT_FALSE(MakeFolder(dir / "teams").ok());
+    EXPECT_FALSE(MakeFolder(dir / "b/c").ok());
     EXPECT_TRUE(MakeFolder(dir / "teams/emblems").ok());
     EXPECT_TRUE(fs::is_directory(dir / "Teams/emblems"));
 }

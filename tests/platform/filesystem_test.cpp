@@ -1,10 +1,13 @@
 #include "platform/filesystem.h"
 
 #include <gtest/gtest.h>
-#include <stdlib.h>
+#include <sys/resource.h>
 
+#include <csignal>
 #include <fstream>
+#include <functional>
 
+#include "platform/scoped_env.h"
 #include "support/temp_dir.h"
 
 namespace kickvane::platform {
@@ -19,9 +22,21 @@ size_t EntryCount(const fs::path& folder) {
         std::distance(fs::directory_iterator(folder), fs::directory_iterator()));
 }
 
+// Runs `write` while files may grow to two bytes only, so that the write stops part-way.
+Status WithTinyFileLimit(const std::function<Status()>& write) {
+    std::signal(SIGXFSZ, SIG_IGN);
+    rlimit saved{};
+    ::getrlimit(RLIMIT_FSIZE, &saved);
+    rlimit tiny = saved;
+    tiny.rlim_cur = 2;
+    ::setrlimit(RLIMIT_FSIZE, &tiny);
+    Status status = write();
+    ::setrlimit(RLIMIT_FSIZE, &saved);
+    return status;
+}
+
 TEST(ResolveCaseInsensitive, MatchesEveryComponentAndKeepsSpellingOfMissingTail) {
     TempDir dir;
-    fs::create_directories(dir / "Data2/Ball/Textures");
     WriteFile(dir / "Data2/Ball/Textures/Ball10.DDS", "x");
 
     EXPECT_EQ(ResolveCaseInsensitive(dir / "data2/ball/textures/ball10.dds"),
@@ -31,15 +46,12 @@ TEST(ResolveCaseInsensitive, MatchesEveryComponentAndKeepsSpellingOfMissingTail)
     // Doubled and trailing separators, as "D:\" + "\data2" gives, name the same folder.
     EXPECT_EQ(ResolveCaseInsensitive(fs::path(dir.path().string() + "//DATA2//ball/")),
               dir / "Data2/Ball");
-}
 
-TEST(ResolveCaseInsensitive, PrefersExactSpellingWhenSeveralCasesExist) {
-    TempDir dir;
-    fs::create_directories(dir / "ball");
-    fs::create_directories(dir / "Ball");
-    EXPECT_EQ(ResolveCaseInsensitive(dir / "Ball"), dir / "Ball");
-    EXPECT_EQ(ResolveCaseInsensitive(dir / "ball"), dir / "ball");
-    EXPECT_EQ(ResolveCaseInsensitive(dir / "BALL"), dir / "Ball");  // first in name order
+    // Of several spellings the exact one wins, else the first in name order.
+    fs::create_directories(dir / "Data2/ball");
+    EXPECT_EQ(ResolveCaseInsensitive(dir / "Data2/Ball"), dir / "Data2/Ball");
+    EXPECT_EQ(ResolveCaseInsensitive(dir / "Data2/ball"), dir / "Data2/ball");
+    EXPECT_EQ(ResolveCaseInsensitive(dir / "Data2/BALL"), dir / "Data2/Ball");
 }
 
 TEST(ReplaceFile, ReplacesContentTakesSourceTimeAndLeavesNoTemporaryFile) {
@@ -80,8 +92,10 @@ TEST(ReplaceFile, FailureLeavesTargetWholeAndNamesThePath) {
     WriteFile(dir / "src/dir.dds/inner", "x");  // a folder is no file to copy
     EXPECT_FALSE(ReplaceFile(dir / "src/dir.dds", dir / "dst/a.dds").ok());
 
-    WriteFile(dir / "src/a.dds", "new");
+    WriteFile(dir / "src/a.dds", "new content");
     EXPECT_FALSE(ReplaceFile(dir / "src/a.dds", dir / "missing/a.dds").ok());
+    EXPECT_FALSE(
+        WithTinyFileLimit([&] { return ReplaceFile(dir / "src/a.dds", dir / "dst/a.dds"); }).ok());
 
     EXPECT_EQ(ReadText(dir / "dst/a.dds"), "old");
     EXPECT_EQ(EntryCount(dir / "dst"), 1u);
@@ -92,16 +106,13 @@ TEST(WriteFileAtomically, ReplacesWholeFileOrLeavesItAsItWas) {
     WriteFile(dir / "settings.ini", "previous");
     ASSERT_TRUE(WriteFileAtomically(dir / "settings.ini", "next").ok());
     EXPECT_EQ(ReadText(dir / "settings.ini"), "next");
+
+    EXPECT_FALSE(WithTinyFileLimit([&] {
+                     return WriteFileAtomically(dir / "settings.ini", "longer");
+                 }).ok());
+    EXPECT_EQ(ReadText(dir / "settings.ini"), "next");
     EXPECT_EQ(EntryCount(dir.path()), 1u);
-
     EXPECT_FALSE(WriteFileAtomically(dir / "no/such/folder.ini", "x").ok());
-}
-
-TEST(MakeDirectory, FailsWhenFolderExistsOrParentIsMissing) {
-    TempDir dir;
-    EXPECT_TRUE(MakeDirectory(dir / "a").ok());
-    EXPECT_FALSE(MakeDirectory(dir / "a").ok());
-    EXPECT_FALSE(MakeDirectory(dir / "b/c").ok());
 }
 
 TEST(ListPlainFiles, SkipsFoldersAndHiddenFiles) {
@@ -119,21 +130,8 @@ TEST(ListPlainFiles, SkipsFoldersAndHiddenFiles) {
 
 class WinePrefixTest : public ::testing::Test {
 protected:
-    void SetUp() override {
-        const char* old = getenv("WINEPREFIX");
-        saved_ = old ? std::optional<std::string>(old) : std::nullopt;
-        setenv("WINEPREFIX", prefix_.path().c_str(), 1);
-    }
-    void TearDown() override {
-        if (saved_) {
-            setenv("WINEPREFIX", saved_->c_str(), 1);
-        } else {
-            unsetenv("WINEPREFIX");
-        }
-    }
-
     TempDir prefix_;
-    std::optional<std::string> saved_;
+    testing::ScopedEnv env_{"WINEPREFIX", prefix_.path().string()};
 };
 
 TEST_F(WinePrefixTest, WindowsPathGoesThroughTheDriveMapping) {

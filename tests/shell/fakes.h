@@ -2,7 +2,7 @@
 
 #include <QStringList>
 #include <deque>
-#include <map>
+#include <set>
 
 #include "platform/keystate.h"
 #include "shell/dialogs.h"
@@ -13,8 +13,7 @@ namespace kickvane::testing {
 // Records what the window would show, and answers folder pickers from a queue.
 class RecordingDialogs final : public shell::Dialogs {
 public:
-    std::optional<QString> PickFolder(QWidget*, const QString& title) override {
-        pickerTitles << title;
+    std::optional<QString> PickFolder(QWidget*, const QString&) override {
         if (folders.empty()) {
             return std::nullopt;
         }
@@ -31,7 +30,6 @@ public:
     }
 
     std::deque<std::optional<QString>> folders;  // nullopt: the user cancels
-    QStringList pickerTitles;
     QStringList messages;
     QStringList notices;
     QStringList popups;
@@ -41,30 +39,22 @@ public:
 class FakeKeySampler final : public platform::KeySampler {
 public:
     platform::KeySample Sample(int virtualKey) override {
-        ++samples[virtualKey];
-        platform::KeySample sample{held.count(virtualKey) > 0, pressed.count(virtualKey) > 0};
-        pressed.erase(virtualKey);
-        return sample;
+        return {held.count(virtualKey) > 0, pressed.erase(virtualKey) > 0};
     }
 
-    std::map<int, int> samples;
-    std::map<int, bool> held;
-    std::map<int, bool> pressed;
+    std::set<int> held;
+    std::set<int> pressed;
 };
 
 // A tray that records whether its icon is there; `hostRunning` says whether a tray host shows it.
 class FakeTray final : public shell::TrayIcon {
 public:
-    void Add() override {
-        added = true;
-        ++adds;
-    }
+    void Add() override { added = true; }
     void Remove() override { added = false; }
     bool Shown() const override { return added && hostRunning; }
 
     bool added = false;
     bool hostRunning = true;
-    int adds = 0;
 };
 
 }  // namespace kickvane::testing

@@ -17,9 +17,8 @@ protected:
     std::unique_ptr<shell::MainWindow> Open(std::filesystem::path folder = {}) {
         shell::ShellServices services;
         services.dialogs = &dialogs_;
-        auto keys = std::make_unique<FakeKeySampler>();
-        keys_ = keys.get();
-        services.keySampler = std::move(keys);
+        services.keySampler = std::make_unique<FakeKeySampler>();
+        keys_ = static_cast<FakeKeySampler*>(services.keySampler.get());
         services.playSound = [this](const std::filesystem::path& wav) { sounds_.push_back(wav); };
         services.makeTray = [this](const QIcon&, QMenu*) {
             auto tray = std::make_unique<FakeTray>();
