@@ -1,5 +1,5 @@
 // The real program on a virtual display: the hotkey pressed while another window has the focus,
-// a second start, and the trigger command.
+// a hotkey text that names no key, a second start, the trigger command and the tray.
 #include <gtest/gtest.h>
 
 #include <sstream>
@@ -87,6 +87,18 @@ TEST_F(WindowTest, HotkeyPressedInAnotherWindowAppliesThePatches) {
     auto focused = FocusOtherWindow();
     Capture("xdotool key F7");
     EXPECT_TRUE(WaitFor([&] { return fs::exists(applied()); }));
+    EXPECT_TRUE(kickvane->Running());
+}
+
+TEST_F(WindowTest, HotkeyTextThatNamesNoKeyTriggersNothing) {
+    WriteSettings("f7");  // names are compared exactly: "f7" is no key
+    auto kickvane = StartKickvane();
+    ASSERT_TRUE(WindowShown(kWindowTitle)) << ReadText(dir_ / "kickvane.log");
+    auto focused = FocusOtherWindow();
+    Capture("xdotool key F7 F1 F12");
+    // Several ticks of the 100 ms poll go by; none may react.
+    std::this_thread::sleep_for(std::chrono::milliseconds(800));
+    EXPECT_FALSE(fs::exists(applied()));
     EXPECT_TRUE(kickvane->Running());
 }
 
