@@ -45,7 +45,7 @@ TEST_F(MainWindowTest, StartsOnTheFirstTabAndEachTabClickShowsExactlyOnePanel) {
     }
 }
 
-TEST_F(MainWindowTest, OptionButtonsShowTheSelection) {
+TEST_F(MainWindowTest, OptionButtonsFollowTheContainerRule) {
     auto window = Open();
     Click(window->tabHead(3));
     Click(window->optionButton(OptionArray::UniOption1, 5));
