@@ -49,3 +49,19 @@ TEST(PatchSelection, CategoryIsOnOnlyForSwitchValueOne) {
 
 }  // namespace
 }  // namespace kickvane::catalog
+
+namespace kickvane::catalog {
+namespace {
+
+TEST(Catalog, LooksUpEntriesByKeyWithinTheirSection) {
+    EXPECT_EQ(FindCategory("CDV")->switchIndex, 12);
+    EXPECT_EQ(FindOption("Khac", "CoCaro")->index, 5);
+    // "MacDinh" is a key of two sections; each lookup finds its own.
+    EXPECT_EQ(FindOption("Bong", "MacDinh")->isDefault, false);
+    EXPECT_EQ(FindOption("Bang Ti So", "MacDinh")->isDefault, true);
+    EXPECT_EQ(FindOption("Khac", "MacDinh"), nullptr);
+    EXPECT_EQ(FindCategory("Khac")->switchIndex, 5);  // the category, not the section
+}
+
+}  // namespace
+}  // namespace kickvane::catalog
