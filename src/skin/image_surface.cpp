@@ -68,15 +68,22 @@ Status ImageSurface::CheckTarget() const {
     return Status::Ok();
 }
 
-Status ImageSurface::Copy(const QImage& source, const Piece& from, const Piece& to) {
+Status ImageSurface::CheckCopy(const QImage& source, const Piece& from, const Piece& to,
+                               bool& draw) const {
     if (Status s = CheckTarget(); !s) {
         return s;
     }
     if (Status s = CheckPieces(source, from, to); !s) {
         return s;
     }
-    if (from.IsEmpty() || to.IsEmpty() || !Touches(target_, to)) {
-        return Status::Ok();
+    draw = !from.IsEmpty() && !to.IsEmpty() && Touches(target_, to);
+    return Status::Ok();
+}
+
+Status ImageSurface::Copy(const QImage& source, const Piece& from, const Piece& to) {
+    bool draw = false;
+    if (Status s = CheckCopy(source, from, to, draw); !s || !draw) {
+        return s;
     }
     // Copying the piece out first keeps smooth scaling from sampling the neighbouring frames.
     const QImage piece = source.copy(from.x, from.y, from.width, from.height);
@@ -89,14 +96,9 @@ Status ImageSurface::Copy(const QImage& source, const Piece& from, const Piece& 
 
 Status ImageSurface::CopyKeyed(const QImage& source, const Piece& from, const Piece& to,
                                Colour key) {
-    if (Status s = CheckTarget(); !s) {
+    bool draw = false;
+    if (Status s = CheckCopy(source, from, to, draw); !s || !draw) {
         return s;
-    }
-    if (Status s = CheckPieces(source, from, to); !s) {
-        return s;
-    }
-    if (from.IsEmpty() || to.IsEmpty() || !Touches(target_, to)) {
-        return Status::Ok();
     }
     // The key becomes a fully transparent mask; everything else stays opaque, and nearest-pixel
     // scaling keeps the mask exact.

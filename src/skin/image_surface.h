@@ -23,6 +23,8 @@ public:
 
 private:
     Status CheckTarget() const;
+    // Checks a copy before it draws: a failure, or ok with `draw` false when nothing would show.
+    Status CheckCopy(const QImage& source, const Piece& from, const Piece& to, bool& draw) const;
 
     QImage& target_;
     StretchMode mode_ = StretchMode::Plain;
