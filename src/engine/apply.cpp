@@ -4,24 +4,9 @@
 
 namespace kickvane::engine {
 
-std::vector<StepOutcome> ApplyOutcome::Failures() const {
-    std::vector<StepOutcome> failures;
-    for (const StepOutcome& step : steps) {
-        if (step.state == StepState::Failed) {
-            failures.push_back(step);
-        }
-    }
-    return failures;
-}
+namespace {
 
-std::string ToolDataMissingText(const Roots& roots) {
-    return "Khong tim thay: " + roots.toolData.string() + "\r\nKiem tra lai duong dan";
-}
-
-std::filesystem::path SignalSoundPath(const std::filesystem::path& toolFolder) {
-    return platform::ResolveCaseInsensitive(toolFolder / "sound.wav");
-}
-
+// Runs one step of the plan against the run's roots; a step whose guard says no is not needed.
 StepOutcome RunStep(const PlanStep& step, const Roots& roots) {
     StepOutcome outcome{step, StepState::Done, {}, {}};
     const bool needed = [&] {
@@ -64,6 +49,26 @@ StepOutcome RunStep(const PlanStep& step, const Roots& roots) {
         outcome.reason = status.reason();
     }
     return outcome;
+}
+
+}  // namespace
+
+std::vector<StepOutcome> ApplyOutcome::Failures() const {
+    std::vector<StepOutcome> failures;
+    for (const StepOutcome& step : steps) {
+        if (step.state == StepState::Failed) {
+            failures.push_back(step);
+        }
+    }
+    return failures;
+}
+
+std::string ToolDataMissingText(const Roots& roots) {
+    return "Khong tim thay: " + roots.toolData.string() + "\r\nKiem tra lai duong dan";
+}
+
+std::filesystem::path SignalSoundPath(const std::filesystem::path& toolFolder) {
+    return platform::ResolveCaseInsensitive(toolFolder / "sound.wav");
 }
 
 ApplyOutcome ApplyPatches(const std::filesystem::path& toolFolder, std::string_view gameFolder,

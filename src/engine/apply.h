@@ -52,9 +52,6 @@ ApplyOutcome ApplyPatches(const std::filesystem::path& toolFolder, std::string_v
                           const catalog::PatchSelection& selection, EngineUi& ui,
                           const StepObserver& observer = {});
 
-// Runs one step of a plan against resolved roots.
-StepOutcome RunStep(const PlanStep& step, const Roots& roots);
-
 // The path of the signal sound in the tool folder.
 std::filesystem::path SignalSoundPath(const std::filesystem::path& toolFolder);
 
