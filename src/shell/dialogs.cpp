@@ -1,18 +1,87 @@
 #include "shell/dialogs.h"
 
+#include <QDir>
 #include <QFileDialog>
+#include <QIdentityProxyModel>
 #include <QMessageBox>
+#include <array>
+#include <filesystem>
 
+#include "platform/filesystem.h"
 #include "shell/alert_popup.h"
 
 namespace kickvane::shell {
 
-std::optional<QString> QtDialogs::PickFolder(QWidget* owner, const QString& title) {
-    const QString folder = QFileDialog::getExistingDirectory(owner, title);
+namespace {
+
+// The folder list's column heads ("Name", "Size", ...) in Vietnamese.
+class VietnameseColumns final : public QIdentityProxyModel {
+public:
+    using QIdentityProxyModel::QIdentityProxyModel;
+
+    QVariant headerData(int section, Qt::Orientation orientation, int role) const override {
+        static const std::array<QString, 4> kHeads{
+            QStringLiteral("Tên"), QStringLiteral("Kích thước"), QStringLiteral("Loại"),
+            QStringLiteral("Ngày sửa")};
+        if (orientation == Qt::Horizontal && role == Qt::DisplayRole && section >= 0 &&
+            section < static_cast<int>(kHeads.size())) {
+            return kHeads[static_cast<size_t>(section)];
+        }
+        return QIdentityProxyModel::headerData(section, orientation, role);
+    }
+};
+
+}  // namespace
+
+QString FolderDialogStart(const QString& wanted) {
+    const QString text = wanted.trimmed();
+    if (!text.isEmpty()) {
+        namespace fs = std::filesystem;
+        // A relative text would name a folder under the program's working folder, which is
+        // nowhere the user has been.
+        fs::path folder = platform::NativePathFromUserText(text.toStdString());
+        while (folder.is_absolute()) {
+            const fs::path existing = platform::ResolveCaseInsensitive(folder);
+            if (platform::IsDirectory(existing)) {
+                return QDir::cleanPath(QString::fromStdString(existing.string()));
+            }
+            if (!folder.has_relative_path()) {
+                break;  // the root itself is missing, as an unmapped drive is
+            }
+            folder = folder.parent_path();
+        }
+    }
+    return QDir::homePath();
+}
+
+void PrepareFolderDialog(QFileDialog& dialog, const QString& title, const QString& start) {
+    // Qt's own dialog rather than the desktop's, so that every label can be Vietnamese.
+    dialog.setOption(QFileDialog::DontUseNativeDialog);
+    dialog.setFileMode(QFileDialog::Directory);
+    dialog.setOption(QFileDialog::ShowDirsOnly);
+    dialog.setFilter(dialog.filter() | QDir::Hidden);
+    dialog.setWindowTitle(title);
+    dialog.setLabelText(QFileDialog::LookIn, QStringLiteral("Tìm trong:"));
+    dialog.setLabelText(QFileDialog::FileName, QStringLiteral("Thư mục:"));
+    dialog.setLabelText(QFileDialog::FileType, QStringLiteral("Loại:"));
+    dialog.setLabelText(QFileDialog::Accept, QStringLiteral("Chọn"));
+    dialog.setLabelText(QFileDialog::Reject, QStringLiteral("Hủy"));
+    dialog.setProxyModel(new VietnameseColumns(&dialog));
+    dialog.setDirectory(FolderDialogStart(start));
+}
+
+std::optional<QString> QtDialogs::PickFolder(QWidget* owner, const QString& title,
+                                             const QString& start) {
+    QFileDialog dialog(owner);
+    PrepareFolderDialog(dialog, title, start);
+    if (dialog.exec() != QDialog::Accepted || dialog.selectedFiles().isEmpty()) {
+        return std::nullopt;
+    }
+    const QString folder = dialog.selectedFiles().constFirst();
     if (folder.isEmpty()) {
         return std::nullopt;
     }
-    return folder;
+    return QDir::toNativeSeparators(folder);
 }
 
 void QtDialogs::ShowMessage(QWidget* owner, const QString& title, const QString& text, Icon icon) {

@@ -3,6 +3,7 @@
 #include <QString>
 #include <optional>
 
+class QFileDialog;
 class QWidget;
 
 namespace kickvane::shell {
@@ -14,8 +15,10 @@ public:
 
     virtual ~Dialogs() = default;
 
-    // A folder picker; nullopt when the user cancels.
-    virtual std::optional<QString> PickFolder(QWidget* owner, const QString& title) = 0;
+    // A folder picker that opens at `start` (a folder as the user typed it, or empty); nullopt
+    // when the user cancels.
+    virtual std::optional<QString> PickFolder(QWidget* owner, const QString& title,
+                                              const QString& start) = 0;
 
     // A message box with one OK button; returns when the user has closed it.
     virtual void ShowMessage(QWidget* owner, const QString& title, const QString& text,
@@ -28,10 +31,19 @@ public:
     virtual void ShowPopup(const QString& text, int displaySeconds) = 0;
 };
 
+// Where a folder picker opens: the folder named by `wanted` (a native path or a Windows path in
+// the Wine prefix) or its nearest parent that exists, else the home folder.
+QString FolderDialogStart(const QString& wanted);
+
+// Sets up Qt's own folder dialog in Vietnamese, opening at FolderDialogStart(start) and listing
+// hidden folders too (Wine prefixes live in ~/.wine and ~/.local/share).
+void PrepareFolderDialog(QFileDialog& dialog, const QString& title, const QString& start);
+
 // Qt's file dialog, message boxes and the alert popup.
 class QtDialogs final : public Dialogs {
 public:
-    std::optional<QString> PickFolder(QWidget* owner, const QString& title) override;
+    std::optional<QString> PickFolder(QWidget* owner, const QString& title,
+                                      const QString& start) override;
     void ShowMessage(QWidget* owner, const QString& title, const QString& text, Icon icon) override;
     void ShowNotice(QWidget* owner, const QString& title, const QString& text) override;
     void ShowPopup(const QString& text, int displaySeconds) override;

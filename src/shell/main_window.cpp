@@ -5,9 +5,11 @@
 #include <QCursor>
 #include <QLabel>
 #include <QPainter>
+#include <QTime>
 
 #include "engine/apply.h"
 #include "engine/quick_load.h"
+#include "engine/run_summary.h"
 #include "platform/filesystem.h"
 
 namespace kickvane::shell {
@@ -461,6 +463,8 @@ void MainWindow::applyPatchesNow() {
     const engine::ApplyOutcome outcome =
         engine::ApplyPatches(toolFolder_, gameFolder_->text().toStdString(), selection_, ui_);
     applying_ = false;
+    const QTime now = QTime::currentTime();
+    tray_->SetStatusLine(FromUtf8(engine::RunSummary(outcome, {now.hour(), now.minute()})));
     const std::vector<engine::StepOutcome> failures = outcome.Failures();
     if (failures.empty()) {
         return;
@@ -487,14 +491,14 @@ void MainWindow::launchGame() {
 
 void MainWindow::browseGameFolder() {
     if (auto folder = services_.dialogs->PickFolder(
-            this, QStringLiteral("Chon thu muc cai dat FIFA Online 2"))) {
+            this, QStringLiteral("Chon thu muc cai dat FIFA Online 2"), gameFolder_->text())) {
         gameFolder_->setText(*folder);
     }
 }
 
 void MainWindow::quickLoad() {
     if (auto folder = services_.dialogs->PickFolder(
-            this, QStringLiteral("Ho tro nap nhanh cac file Face va Ball"))) {
+            this, QStringLiteral("Ho tro nap nhanh cac file Face va Ball"), hidden_.cpn)) {
         hidden_.cpn = *folder;
     }
     const engine::QuickLoadOutcome outcome =

@@ -1,7 +1,14 @@
 #include "shell/side_windows.h"
 
+#include <QGuiApplication>
+#include <QHBoxLayout>
+#include <QKeyEvent>
 #include <QPixmap>
+#include <QPushButton>
+#include <QScreen>
+#include <QStyle>
 #include <QVBoxLayout>
+#include <algorithm>
 
 #include "platform/filesystem.h"
 
@@ -11,22 +18,47 @@ namespace {
 
 constexpr QSize kPreviewSize(597, 397);
 
-QWidget* TextWindow(QWidget* owner, const QString& title, const QStringList& paragraphs) {
-    auto* window = new QWidget(owner, Qt::Tool);
-    window->setAttribute(Qt::WA_DeleteOnClose);
-    window->setWindowTitle(title);
-    auto* layout = new QVBoxLayout(window);
-    layout->setContentsMargins(16, 14, 16, 14);
-    layout->setSpacing(10);
-    for (const QString& paragraph : paragraphs) {
-        auto* label = new QLabel(paragraph, window);
-        label->setWordWrap(true);
-        label->setTextInteractionFlags(Qt::TextSelectableByMouse);
-        layout->addWidget(label);
+// A window of text beside the main window that the user reads and closes, with its button
+// "Đóng" or with Escape.
+class TextWindow final : public QWidget {
+public:
+    TextWindow(QWidget* owner, const QString& title, const QStringList& paragraphs,
+               Qt::TextFormat format, int width)
+        : QWidget(owner, Qt::Tool) {
+        setAttribute(Qt::WA_DeleteOnClose);
+        setWindowTitle(title);
+        auto* layout = new QVBoxLayout(this);
+        layout->setContentsMargins(16, 14, 16, 14);
+        layout->setSpacing(10);
+        for (const QString& paragraph : paragraphs) {
+            auto* label = new QLabel(this);
+            label->setTextFormat(format);
+            label->setText(paragraph);
+            label->setWordWrap(true);
+            label->setTextInteractionFlags(Qt::TextSelectableByMouse);
+            layout->addWidget(label);
+        }
+        auto* close = new QPushButton(QStringLiteral("Đóng"), this);
+        close->setObjectName(QStringLiteral("close"));
+        connect(close, &QPushButton::clicked, this, &QWidget::close);
+        auto* buttons = new QHBoxLayout;
+        buttons->addStretch();
+        buttons->addWidget(close);
+        layout->addLayout(buttons);
+        setFixedWidth(width);
+        // The keyboard starts on the button, so Space closes too.
+        close->setFocus();
     }
-    window->setFixedWidth(420);
-    return window;
-}
+
+protected:
+    void keyPressEvent(QKeyEvent* event) override {
+        if (event->key() == Qt::Key_Escape && event->modifiers() == Qt::NoModifier) {
+            close();
+            return;
+        }
+        QWidget::keyPressEvent(event);
+    }
+};
 
 }  // namespace
 
@@ -68,6 +100,23 @@ PreviewWindow::PreviewWindow(QWidget* owner)
     picture_->setGeometry(0, 0, kPreviewSize.width(), kPreviewSize.height());
     picture_->setAlignment(Qt::AlignCenter);
     picture_->setScaledContents(true);
+    // Centred on the main window's screen, not wherever the window manager would put it.
+    QScreen* screen = owner ? owner->screen() : QGuiApplication::primaryScreen();
+    if (screen) {
+        const QRect area = screen->availableGeometry();
+        QRect frame = QStyle::alignedRect(Qt::LeftToRight, Qt::AlignCenter, kPreviewSize, area);
+        // On a screen smaller than the picture its top left corner stays on the screen.
+        frame.moveTo(std::max(frame.left(), area.left()), std::max(frame.top(), area.top()));
+        move(frame.topLeft());
+    }
+}
+
+void PreviewWindow::keyPressEvent(QKeyEvent* event) {
+    if (event->key() == Qt::Key_Escape && event->modifiers() == Qt::NoModifier) {
+        close();
+        return;
+    }
+    QWidget::keyPressEvent(event);
 }
 
 void PreviewWindow::ShowPicture(const std::filesystem::path& file) {
@@ -84,7 +133,7 @@ void PreviewWindow::ShowPicture(const std::filesystem::path& file) {
 }
 
 QWidget* CreateAboutWindow(QWidget* owner) {
-    return TextWindow(
+    return new TextWindow(
         owner, QStringLiteral("Thong tin"),
         {QStringLiteral("<b>Kickvane</b> phiên bản 2.0"),
          QStringLiteral("Công cụ thay đổi đồ hoạ cho FIFA Online 2: bóng, mặt cỏ, biển quảng cáo, "
@@ -92,7 +141,8 @@ QWidget* CreateAboutWindow(QWidget* owner) {
                         "vận động."),
          QStringLiteral("Từ phiên bản 1.1 đến 2.0: thêm nạp nhanh Face và Ball, hai giao diện, ảnh "
                         "xem trước cho từng mục, kiểm tra phiên bản mới và biểu tượng ở khay hệ "
-                        "thống.")});
+                        "thống.")},
+        Qt::RichText, 420);
 }
 
 QString HelpText() {
@@ -121,14 +171,9 @@ QString HelpText() {
 }
 
 QWidget* CreateHelpWindow(QWidget* owner) {
-    auto* window = TextWindow(owner, QStringLiteral("Huong dan"), {});
-    auto* label = new QLabel(window);
-    label->setTextFormat(Qt::PlainText);
-    label->setText(HelpText().replace(QStringLiteral("\r\n"), QStringLiteral("\n")));
-    label->setWordWrap(true);
-    window->layout()->addWidget(label);
-    window->setFixedWidth(520);
-    return window;
+    return new TextWindow(owner, QStringLiteral("Huong dan"),
+                          {HelpText().replace(QStringLiteral("\r\n"), QStringLiteral("\n"))},
+                          Qt::PlainText, 520);
 }
 
 }  // namespace kickvane::shell

@@ -15,8 +15,9 @@ namespace kickvane::shell {
 std::filesystem::path PreviewPicture(const std::filesystem::path& toolFolder,
                                      catalog::LabelArray labels, int index);
 
-// "Xem truoc": one picture scaled to the window. A picture that cannot be loaded leaves the one
-// shown before (or a short note when there was none).
+// "Xem truoc": one picture scaled to the window, which opens centred on the main window's
+// screen. A picture that cannot be loaded leaves the one shown before (or a short note when there
+// was none).
 class PreviewWindow final : public QWidget {
     Q_OBJECT
 public:
@@ -24,12 +25,16 @@ public:
     void ShowPicture(const std::filesystem::path& file);
     const QString& pictureFile() const { return pictureFile_; }
 
+protected:
+    void keyPressEvent(QKeyEvent* event) override;  // Escape closes it
+
 private:
     QLabel* picture_;
     QString pictureFile_;
 };
 
-// "Thong tin": the tool's name and version.
+// "Thong tin": the tool's name and version. It and the help window close with their button
+// "Đóng" or with Escape.
 QWidget* CreateAboutWindow(QWidget* owner);
 
 // "Huong dan": the user guide.

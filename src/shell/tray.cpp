@@ -1,12 +1,31 @@
 #include "shell/tray.h"
 
 #include <QMenu>
+#include <utility>
 
 namespace kickvane::shell {
 
+QString TrayToolTip(const QString& statusLine) {
+    QString tip = QString::fromLatin1(kTrayTooltip);
+    if (!statusLine.isEmpty()) {
+        tip += QLatin1Char('\n') + statusLine;
+    }
+    return tip;
+}
+
+void TrayIcon::SetStatusLine(const QString& line) {
+    // One line only: a line break in it would push the name off a short tooltip.
+    QString single = line.simplified();
+    if (single == statusLine_) {
+        return;
+    }
+    statusLine_ = std::move(single);
+    ToolTipChanged();
+}
+
 SystemTrayIcon::SystemTrayIcon(const QIcon& icon, QMenu* menu, QObject* parent)
     : TrayIcon(parent), icon_(icon) {
-    icon_.setToolTip(QString::fromLatin1(kTrayTooltip));
+    icon_.setToolTip(toolTip());
     icon_.setContextMenu(menu);
     // A left click opens the same menu; the right click opens it through the context menu.
     connect(&icon_, &QSystemTrayIcon::activated, this,
@@ -35,6 +54,10 @@ void SystemTrayIcon::Remove() {
 
 bool SystemTrayIcon::Shown() const {
     return wanted_ && icon_.isVisible() && QSystemTrayIcon::isSystemTrayAvailable();
+}
+
+void SystemTrayIcon::ToolTipChanged() {
+    icon_.setToolTip(toolTip());
 }
 
 void SystemTrayIcon::ShowWhenHostAppears() {

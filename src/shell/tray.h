@@ -12,6 +12,9 @@ namespace kickvane::shell {
 
 inline constexpr const char* kTrayTooltip = "Kickvane v2.0";
 
+// The icon's tooltip: the tool's name and version, and below it a status line when there is one.
+QString TrayToolTip(const QString& statusLine);
+
 // The tool's entry in the notification area. The window adds it at start-up and removes it when
 // it closes or the user exits from the menu.
 class TrayIcon : public QObject {
@@ -25,9 +28,20 @@ public:
     // A tray host shows the icon now; without one the window must stay reachable on screen.
     virtual bool Shown() const = 0;
 
+    // The tooltip's second line, such as the last patch run's result; empty leaves one line.
+    void SetStatusLine(const QString& line);
+    QString toolTip() const { return TrayToolTip(statusLine_); }
+
 signals:
     // The user clicked the icon: the window opens the menu at the mouse position.
     void menuRequested();
+
+protected:
+    // The tooltip has changed; an icon on screen shows the new one.
+    virtual void ToolTipChanged() {}
+
+private:
+    QString statusLine_;
 };
 
 // The tray icon of the desktop. Where no tray host runs at start-up the icon waits and appears
@@ -40,6 +54,9 @@ public:
     void Add() override;
     void Remove() override;
     bool Shown() const override;
+
+protected:
+    void ToolTipChanged() override;
 
 private:
     void ShowWhenHostAppears();

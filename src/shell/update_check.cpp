@@ -9,6 +9,7 @@
 
 #include "catalog/ini.h"
 #include "catalog/settings.h"
+#include "shell/fetch_problem.h"
 #include "shell/message_box.h"
 #include "text/utf.h"
 #include "text/vni.h"
@@ -42,11 +43,11 @@ QString Vni(std::string_view text) {
     return QString::fromStdString(text::VniToUnicodeUtf8(text));
 }
 
-const QString kTimedOut = QStringLiteral("máy chủ không trả lời kịp");
-const QString kTooLarge = QStringLiteral("câu trả lời của máy chủ quá lớn");
-const QString kRedirectRefused = QStringLiteral("máy chủ chuyển sang một địa chỉ không được phép");
-const QString kTooManyRedirects = QStringLiteral("máy chủ chuyển hướng quá nhiều lần");
-const QString kBadHost = QStringLiteral("địa chỉ máy chủ cập nhật không hợp lệ");
+const QString kTimedOut = FetchProblemText(FetchProblem::TimedOut);
+const QString kTooLarge = FetchProblemText(FetchProblem::TooLarge);
+const QString kRedirectRefused = FetchProblemText(FetchProblem::RedirectRefused);
+const QString kTooManyRedirects = FetchProblemText(FetchProblem::TooManyRedirects);
+const QString kBadHost = FetchProblemText(FetchProblem::BadHost);
 
 }  // namespace
 
@@ -266,11 +267,11 @@ void UpdateCheck::onFinished(File file, QNetworkReply* reply) {
     if (code >= 300 && code < 400 && target.isValid()) {
         follow(file, target.toUrl());
     } else if (status.isValid() && (code < 200 || code >= 300)) {
-        fail(file, QStringLiteral("máy chủ trả lời mã HTTP %1").arg(code));
+        fail(file, FetchProblemText(FetchProblem::HttpStatus, code));
     } else if (reply->error() != QNetworkReply::NoError) {
-        fail(file, QStringLiteral("lỗi mạng (%1)").arg(reply->errorString()));
+        fail(file, NetworkErrorText(reply->error()));
     } else if (!status.isValid()) {
-        fail(file, QStringLiteral("máy chủ không trả lời theo HTTP"));
+        fail(file, FetchProblemText(FetchProblem::NotHttp));
     } else {
         succeed(file);
     }

@@ -12,17 +12,36 @@ namespace kickvane::shell {
 // previous picture and returns false.
 bool LoadPicture(QPixmap& pixmap, const QString& file);
 
-// A label that reports a click, as the catalog labels do to open their preview.
+// Whether a focused widget draws its focus frame: not while the focus came from a mouse click,
+// as on Windows; from the first key press on, or when the keyboard brought the focus, it does.
+class FocusCue {
+public:
+    void FocusIn(Qt::FocusReason reason);
+    void KeyPressed() { keyboard_ = true; }
+    bool Shown(const QWidget& widget) const { return keyboard_ && widget.hasFocus(); }
+
+private:
+    bool keyboard_ = false;
+};
+
+// A label that reports a click, as the catalog labels do to open their preview. It takes the
+// keyboard focus, shows it with a dotted frame, and Space or Enter click it.
 class ClickableLabel final : public QLabel {
     Q_OBJECT
 public:
-    using QLabel::QLabel;
+    explicit ClickableLabel(const QString& text, QWidget* parent = nullptr);
 
 signals:
     void clicked();
 
 protected:
     void mouseReleaseEvent(QMouseEvent* event) override;
+    void keyPressEvent(QKeyEvent* event) override;
+    void focusInEvent(QFocusEvent* event) override;
+    void paintEvent(QPaintEvent* event) override;
+
+private:
+    FocusCue focusCue_;
 };
 
 // A surface with a background colour and a picture drawn unscaled at its top-left corner.
@@ -50,7 +69,9 @@ private:
     QColor background_{0xE0, 0xE0, 0xE0};
 };
 
-// A tab head: the skin's tab picture with the tab's name on it.
+// A tab head: the skin's tab picture with the tab's name on it. It takes the keyboard focus,
+// shows it with a frame over the picture, and Space or Enter choose its tab; the arrow keys
+// move to the tab head above or below and choose that one.
 class TabHead final : public PictureBox {
     Q_OBJECT
 public:
@@ -59,9 +80,12 @@ public:
 
 protected:
     void paintEvent(QPaintEvent* event) override;
+    void keyPressEvent(QKeyEvent* event) override;
+    void focusInEvent(QFocusEvent* event) override;
 
 private:
     QString caption_;
+    FocusCue focusCue_;
 };
 
 }  // namespace kickvane::shell

@@ -13,7 +13,8 @@ namespace kickvane::testing {
 // Records what the window would show, and answers folder pickers from a queue.
 class RecordingDialogs final : public shell::Dialogs {
 public:
-    std::optional<QString> PickFolder(QWidget*, const QString&) override {
+    std::optional<QString> PickFolder(QWidget*, const QString&, const QString& start) override {
+        starts << start;
         if (folders.empty()) {
             return std::nullopt;
         }
@@ -30,6 +31,7 @@ public:
     }
 
     std::deque<std::optional<QString>> folders;  // nullopt: the user cancels
+    QStringList starts;  // where each folder picker was asked to open
     QStringList messages;
     QStringList notices;
     QStringList popups;
