@@ -1,0 +1,75 @@
+// The update check's failures reach the user in Vietnamese, never in Qt's English.
+#include "shell/fetch_problem.h"
+
+#include <gtest/gtest.h>
+
+#include <QHostAddress>
+#include <QSignalSpy>
+#include <QTcpServer>
+#include <set>
+
+#include "shell/update_check.h"
+
+namespace kickvane::shell {
+namespace {
+
+TEST(FetchProblemTest, QtErrorsMapToTheirVietnameseReason) {
+    using E = QNetworkReply::NetworkError;
+    const struct {
+        E error;
+        const char* reason;
+    } cases[] = {
+        {E::TimeoutError, "máy chủ không trả lời kịp"},
+        {E::HostNotFoundError, "không tìm thấy máy chủ cập nhật, hãy kiểm tra kết nối mạng"},
+        {E::ConnectionRefusedError, "máy chủ cập nhật từ chối kết nối"},
+        {E::RemoteHostClosedError, "máy chủ cập nhật đóng kết nối giữa chừng"},
+        {E::SslHandshakeFailedError, "không lập được kết nối bảo mật (TLS/SSL) với máy chủ"},
+        {E::TemporaryNetworkFailureError, "mạng đang gián đoạn, hãy kiểm tra kết nối mạng"},
+        {E::ProxyNotFoundError, "không kết nối được qua máy chủ proxy"},
+        {E::TooManyRedirectsError, "máy chủ chuyển hướng quá nhiều lần"},
+        {E::InsecureRedirectError, "máy chủ chuyển sang một địa chỉ không được phép"},
+        {E::ProtocolFailure, "máy chủ không trả lời theo HTTP"},
+        {E::UnknownNetworkError, "lỗi mạng (mã 99)"},
+        {E::ContentAccessDenied, "lỗi mạng (mã 201)"},
+    };
+    for (const auto& c : cases) {
+        EXPECT_EQ(NetworkErrorText(c.error), QString::fromUtf8(c.reason)) << c.reason;
+    }
+    EXPECT_EQ(FetchProblemText(FetchProblem::HttpStatus, 503), "máy chủ trả lời mã HTTP 503");
+
+    // Every problem has its own words, so the user can tell them apart.
+    std::set<QString> texts;
+    for (int p = 0; p <= static_cast<int>(FetchProblem::Other); ++p) {
+        texts.insert(FetchProblemText(static_cast<FetchProblem>(p), 7));
+    }
+    EXPECT_EQ(texts.size(), static_cast<size_t>(FetchProblem::Other) + 1);
+}
+
+TEST(FetchProblemTest, RealRefusedAndClosedConnectionsAreSaidInVietnamese) {
+    QTcpServer server;
+    ASSERT_TRUE(server.listen(QHostAddress::LocalHost));
+    // A server that hangs up on every request without an answer.
+    QObject::connect(&server, &QTcpServer::newConnection, &server, [&server] {
+        while (QTcpSocket* socket = server.nextPendingConnection()) {
+            QObject::connect(socket, &QTcpSocket::readyRead, socket,
+                             [socket] { socket->disconnectFromHost(); });
+        }
+    });
+    const QString closing = QStringLiteral("http://127.0.0.1:%1/").arg(server.serverPort());
+    QTcpServer gone;
+    ASSERT_TRUE(gone.listen(QHostAddress::LocalHost));
+    const QString refusing = QStringLiteral("http://127.0.0.1:%1/").arg(gone.serverPort());
+    gone.close();
+
+    for (const auto& [host, problem] : {std::pair{closing, FetchProblem::ConnectionClosed},
+                                        std::pair{refusing, FetchProblem::ConnectionRefused}}) {
+        UpdateCheck check(UpdateCheck::Options{QUrl(host), std::chrono::seconds(10)});
+        QSignalSpy failed(&check, &UpdateCheck::versionFailed);
+        check.fetchVersion();
+        ASSERT_TRUE(failed.wait(10000)) << host.toStdString();
+        EXPECT_EQ(failed.at(0).at(0).toString(), FetchProblemText(problem));
+    }
+}
+
+}  // namespace
+}  // namespace kickvane::shell

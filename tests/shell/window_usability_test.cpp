@@ -1,0 +1,260 @@
+// The window from the keyboard, its side windows, its folder dialogs and its tray tooltip.
+#include <gtest/gtest.h>
+
+#include <QAbstractProxyModel>
+#include <QAccessible>
+#include <QApplication>
+#include <QFileDialog>
+#include <QFileSystemModel>
+#include <QLabel>
+#include <QPushButton>
+#include <QScreen>
+#include <QTest>
+
+#include "engine/run_summary.h"
+#include "platform/scoped_env.h"
+#include "shell/dialogs.h"
+#include "support/trees.h"
+#include "window_fixture.h"
+
+namespace kickvane::shell {
+namespace {
+
+namespace fs = std::filesystem;
+using testing::ScopedEnv;
+
+class WindowUsabilityTest : public testing::WindowFixture {
+protected:
+    std::unique_ptr<MainWindow> ShowActive() {
+        auto window = Open();
+        window->show();
+        QApplication::setActiveWindow(window.get());
+        EXPECT_TRUE(QTest::qWaitForWindowActive(window.get()));
+        return window;
+    }
+
+    static void Press(QWidget* widget, Qt::Key key) { QTest::keyClick(widget, key); }
+
+    static QWidget* SideWindow(const char* title) {
+        for (QWidget* widget : QApplication::topLevelWidgets()) {
+            if (widget->windowTitle() == title && widget->isVisible()) {
+                return widget;
+            }
+        }
+        return nullptr;
+    }
+};
+
+TEST_F(WindowUsabilityTest, TabKeyReachesTabHeadsAndLabelsWhichTheKeyboardActivates) {
+    std::filesystem::create_directories(tool() / "img");
+    QImage(40, 20, QImage::Format_RGB32)
+        .save(QString::fromStdString((tool() / "img/t1_img_3.jpg").string()));
+    auto window = ShowActive();
+
+    std::set<QWidget*> reached;
+    for (int i = 0; i < 80 && QApplication::focusWidget(); ++i) {
+        reached.insert(QApplication::focusWidget());
+        Press(QApplication::focusWidget(), Qt::Key_Tab);
+    }
+    for (int tab = 0; tab < kTabCount; ++tab) {
+        EXPECT_TRUE(reached.count(window->tabHead(tab))) << tab;
+    }
+    EXPECT_TRUE(reached.count(window->categoryLabel(3)));
+
+    window->tabHead(1)->setFocus(Qt::TabFocusReason);
+    Press(window->tabHead(1), Qt::Key_Space);
+    EXPECT_EQ(window->currentTab(), 1);
+    // The arrows walk the column and choose as they go; they stop at its ends.
+    Press(window->tabHead(1), Qt::Key_Down);
+    EXPECT_EQ(window->currentTab(), 2);
+    EXPECT_TRUE(window->tabHead(2)->hasFocus());
+    Press(window->tabHead(2), Qt::Key_End);
+    Press(window->tabHead(3), Qt::Key_Right);
+    EXPECT_EQ(window->currentTab(), 3);
+    EXPECT_TRUE(window->tabHead(3)->hasFocus());
+    Press(window->tabHead(3), Qt::Key_Home);
+    Press(window->tabHead(0), Qt::Key_Up);
+    EXPECT_EQ(window->currentTab(), 0);
+    EXPECT_TRUE(window->tabHead(0)->hasFocus());
+
+    window->categoryLabel(3)->setFocus(Qt::TabFocusReason);
+    Press(window->categoryLabel(3), Qt::Key_Return);
+    ASSERT_NE(window->previewWindow(), nullptr);
+    EXPECT_TRUE(window->previewWindow()->pictureFile().endsWith("t1_img_3.jpg"));
+    Press(window->previewWindow(), Qt::Key_Escape);
+    EXPECT_FALSE(window->previewWindow() && window->previewWindow()->isVisible());
+}
+
+TEST_F(WindowUsabilityTest, FocusFrameShowsForKeyboardFocusOnly) {
+    auto window = ShowActive();
+    for (QWidget* widget :
+         std::initializer_list<QWidget*>{window->tabHead(1), window->categoryLabel(0)}) {
+        window->tabHead(3)->setFocus(Qt::MouseFocusReason);
+        const QImage unfocused = widget->grab().toImage();
+        widget->setFocus(Qt::MouseFocusReason);
+        EXPECT_EQ(widget->grab().toImage(), unfocused);  // a click shows no frame
+        Press(widget, Qt::Key_Shift);
+        EXPECT_NE(widget->grab().toImage(), unfocused);  // a key press does
+        window->tabHead(3)->setFocus(Qt::MouseFocusReason);
+        widget->setFocus(Qt::BacktabFocusReason);
+        EXPECT_NE(widget->grab().toImage(), unfocused);
+    }
+}
+
+TEST_F(WindowUsabilityTest, TabHeadsAndLabelsTellAssistiveToolsWhatTheyAreAndDo) {
+    auto window = Open();
+    QAccessibleInterface* tab = QAccessible::queryAccessibleInterface(window->tabHead(2));
+    ASSERT_NE(tab, nullptr);
+    EXPECT_EQ(tab->role(), QAccessible::PageTab);
+    EXPECT_EQ(tab->text(QAccessible::Name), "Tỉ số");
+    ASSERT_NE(tab->actionInterface(), nullptr);
+    tab->actionInterface()->doAction(QAccessibleActionInterface::pressAction());
+    EXPECT_EQ(window->currentTab(), 2);
+
+    ClickableLabel* label = window->categoryLabel(12);
+    QAccessibleInterface* entry = QAccessible::queryAccessibleInterface(label);
+    ASSERT_NE(entry, nullptr);
+    EXPECT_EQ(entry->role(), QAccessible::Button);
+    EXPECT_EQ(entry->text(QAccessible::Name), label->text());
+    EXPECT_FALSE(label->text().isEmpty());
+}
+
+TEST_F(WindowUsabilityTest, PreviewOpensCentredOnTheMainWindowsScreen) {
+    auto window = Open();
+    window->show();
+    Click(window->categoryLabel(0));
+    ASSERT_NE(window->previewWindow(), nullptr);
+    const QPoint offset = window->previewWindow()->frameGeometry().center() -
+                          window->screen()->availableGeometry().center();
+    // Within the window frame's few pixels, which are not known before it is shown.
+    EXPECT_LE(offset.manhattanLength(), 10) << offset.x() << "," << offset.y();
+}
+
+TEST_F(WindowUsabilityTest, AboutAndHelpCloseWithTheirButtonAndWithEscape) {
+    auto window = Open();
+    window->show();
+    for (const char* title : {"Thong tin", "Huong dan"}) {
+        for (bool useButton : {true, false}) {
+            SCOPED_TRACE(std::string(title) + (useButton ? " button" : " Escape"));
+            if (std::string_view(title) == "Thong tin") {
+                Click(window->infoButton());
+            } else {
+                Click(window->helpButton());
+            }
+            QPointer<QWidget> side = SideWindow(title);
+            ASSERT_TRUE(side);
+            auto* close = side->findChild<QPushButton*>(QStringLiteral("close"));
+            ASSERT_NE(close, nullptr);
+            EXPECT_EQ(close->text(), "Đóng");
+            if (useButton) {
+                Click(close);
+            } else {
+                Press(side, Qt::Key_Escape);
+            }
+            QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
+            EXPECT_TRUE(side.isNull());
+        }
+    }
+}
+
+TEST_F(WindowUsabilityTest, FolderPickersOpenWhereTheUserIs) {
+    auto window = Open();
+    const QString faces = QString::fromStdString((dir_ / "faces").string());
+    window->gameFolderBox()->setText(QStringLiteral("D:\\Games\\FO2"));
+    dialogs_.folders = {std::nullopt, faces, std::nullopt};
+    Click(window->browseButton());
+    Click(window->quickLoadButton());
+    Click(window->quickLoadButton());
+    EXPECT_EQ(dialogs_.starts, QStringList({"D:\\Games\\FO2", "", faces}));
+}
+
+TEST_F(WindowUsabilityTest, FolderDialogStartsAtTheNearestExistingFolderElseAtHome) {
+    const fs::path home = dir_ / "home";
+    const fs::path prefix = home / ".wine";
+    std::filesystem::create_directories(prefix / "drive_c/Program Files/Games");
+    ScopedEnv homeEnv("HOME", home.string());
+    ScopedEnv prefixEnv("WINEPREFIX", prefix.string());
+    const auto native = [](const fs::path& path) { return QString::fromStdString(path.string()); };
+
+    EXPECT_EQ(FolderDialogStart(native(prefix / "drive_c/Program Files/Games")),
+              native(prefix / "drive_c/Program Files/Games"));
+    // Missing folders below an existing one, in the Wine prefix, in any letter case.
+    EXPECT_EQ(FolderDialogStart(QStringLiteral("c:\\program files\\games\\FIFA Online 2")),
+              native(prefix / "drive_c/Program Files/Games"));
+    EXPECT_EQ(FolderDialogStart(native(home / "nowhere/deeper")), native(home));
+    for (const char* nothing : {"", "  ", "relative/folder"}) {
+        EXPECT_EQ(FolderDialogStart(QString::fromUtf8(nothing)), native(home)) << nothing;
+    }
+}
+
+TEST_F(WindowUsabilityTest, FolderDialogSpeaksVietnameseAndListsHiddenFolders) {
+    std::filesystem::create_directories(dir_ / ".wine");
+    std::filesystem::create_directories(dir_ / "Games");
+    QFileDialog dialog;
+    PrepareFolderDialog(dialog, QStringLiteral("Ho tro nap nhanh cac file Face va Ball"),
+                        QString::fromStdString(dir_.path().string()));
+    EXPECT_EQ(dialog.windowTitle(), "Ho tro nap nhanh cac file Face va Ball");
+    EXPECT_TRUE(dialog.testOption(QFileDialog::DontUseNativeDialog));
+    for (const auto& [label, text] :
+         {std::pair{QFileDialog::LookIn, "Tìm trong:"}, std::pair{QFileDialog::Accept, "Chọn"},
+          std::pair{QFileDialog::Reject, "Hủy"}, std::pair{QFileDialog::FileName, "Thư mục:"},
+          std::pair{QFileDialog::FileType, "Loại:"}}) {
+        EXPECT_EQ(dialog.labelText(label), QString::fromUtf8(text));
+    }
+    EXPECT_EQ(dialog.proxyModel()->headerData(0, Qt::Horizontal, Qt::DisplayRole).toString(),
+              "Tên");
+
+    auto* model = dialog.findChild<QFileSystemModel*>();
+    ASSERT_NE(model, nullptr);
+    const QModelIndex folder = model->index(QString::fromStdString(dir_.path().string()));
+    QStringList listed;
+    for (int i = 0; i < 200 && listed.size() < 2; ++i) {
+        QTest::qWait(10);
+        listed.clear();
+        for (int row = 0; row < model->rowCount(folder); ++row) {
+            listed << model->index(row, 0, folder).data().toString();
+        }
+    }
+    listed.sort();
+    EXPECT_EQ(listed, QStringList({".wine", "Games"}));
+}
+
+TEST_F(WindowUsabilityTest, TrayTooltipShowsTheLastRunBelowTheName) {
+    testing::MakeToolFolder(tool());
+    testing::MakeGameFolder(game());
+    auto window = Open();
+    EXPECT_EQ(tray_->toolTip(), "Kickvane v2.0");
+    window->gameFolderBox()->setText(QString::fromStdString(game().string()));
+    window->applyPatchesNow();
+    const QStringList lines = tray_->toolTip().split(QLatin1Char('\n'));
+    ASSERT_EQ(lines.size(), 2);
+    EXPECT_EQ(lines[0], "Kickvane v2.0");
+    EXPECT_TRUE(lines[1].startsWith("Lần chạy lúc ")) << lines[1].toStdString();
+    EXPECT_TRUE(lines[1].endsWith(" bộ, 0 lỗi")) << lines[1].toStdString();
+
+    window->gameFolderBox()->setText(QString::fromStdString((dir_ / "missing").string()));
+    window->applyPatchesNow();
+    EXPECT_TRUE(tray_->toolTip().contains("đã dừng")) << tray_->toolTip().toStdString();
+
+    // A line break in the status stays on one line.
+    tray_->SetStatusLine(QStringLiteral("a\nb"));
+    EXPECT_EQ(tray_->toolTip(), "Kickvane v2.0\na b");
+    tray_->SetStatusLine({});
+    EXPECT_EQ(tray_->toolTip(), "Kickvane v2.0");
+}
+
+TEST_F(WindowUsabilityTest, EveryRunSummaryFitsAWindowsTrayTooltip) {
+    // Windows shows at most 127 characters of a tray tooltip; the rest would be cut off.
+    engine::ApplyOutcome outcome;
+    outcome.steps.resize(100);
+    for (auto stop : {engine::RootProblem::None, engine::RootProblem::DataMissing,
+                      engine::RootProblem::ToolDataMissing}) {
+        outcome.stoppedBy = stop;
+        const QString tip =
+            TrayToolTip(QString::fromStdString(engine::RunSummary(outcome, {23, 59})));
+        EXPECT_LE(tip.size(), 127) << tip.toStdString();
+    }
+}
+
+}  // namespace
+}  // namespace kickvane::shell
