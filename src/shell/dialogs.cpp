@@ -1,7 +1,9 @@
 #include "shell/dialogs.h"
 
+#include <QDateTime>
 #include <QDir>
 #include <QFileDialog>
+#include <QFileSystemModel>
 #include <QIdentityProxyModel>
 #include <QMessageBox>
 #include <array>
@@ -14,7 +16,8 @@ namespace kickvane::shell {
 
 namespace {
 
-// The folder list's column heads ("Name", "Size", ...) in Vietnamese.
+// The folder list in Vietnamese: its column heads ("Name", "Size", ...), the type of a folder
+// and its date, which Qt would write in English.
 class VietnameseColumns final : public QIdentityProxyModel {
 public:
     using QIdentityProxyModel::QIdentityProxyModel;
@@ -29,8 +32,25 @@ public:
         }
         return QIdentityProxyModel::headerData(section, orientation, role);
     }
-};
 
+    QVariant data(const QModelIndex& index, int role) const override {
+        const auto* files = qobject_cast<const QFileSystemModel*>(sourceModel());
+        if (files && role == Qt::DisplayRole && (index.column() == 2 || index.column() == 3)) {
+            const QModelIndex entry = mapToSource(index);
+            const QFileInfo info = files->fileInfo(entry);
+            if (index.column() == 3) {
+                return files->lastModified(entry).toString(QStringLiteral("dd/MM/yyyy"));
+            }
+            if (info.isRoot()) {
+                return QStringLiteral("Ổ đĩa");
+            }
+            if (info.isDir()) {
+                return QStringLiteral("Thư mục");
+            }
+        }
+        return QIdentityProxyModel::data(index, role);
+    }
+};
 }  // namespace
 
 QString FolderDialogStart(const QString& wanted) {
@@ -67,6 +87,19 @@ void PrepareFolderDialog(QFileDialog& dialog, const QString& title, const QStrin
     dialog.setLabelText(QFileDialog::Accept, QStringLiteral("Chọn"));
     dialog.setLabelText(QFileDialog::Reject, QStringLiteral("Hủy"));
     dialog.setProxyModel(new VietnameseColumns(&dialog));
+    // A folder picker has no file types to choose ("Directories" only).
+    for (const char* name : {"fileTypeCombo", "fileTypeLabel"}) {
+        if (auto* widget = dialog.findChild<QWidget*>(QString::fromLatin1(name))) {
+            widget->hide();
+        }
+    }
+    // The side list: the home folder and the drives (the root on Linux), without Qt's English
+    // "Computer".
+    QList<QUrl> places{QUrl::fromLocalFile(QDir::homePath())};
+    for (const QFileInfo& drive : QDir::drives()) {
+        places << QUrl::fromLocalFile(drive.absoluteFilePath());
+    }
+    dialog.setSidebarUrls(places);
     dialog.setDirectory(FolderDialogStart(start));
 }
 

@@ -217,6 +217,8 @@ TEST_F(WindowUsabilityTest, FolderDialogSpeaksVietnameseAndListsHiddenFolders) {
     }
     listed.sort();
     EXPECT_EQ(listed, QStringList({".wine", "Games"}));
+    const QModelIndex type = dialog.proxyModel()->mapFromSource(model->index(0, 2, folder));
+    EXPECT_EQ(type.data().toString(), "Thư mục");
 }
 
 TEST_F(WindowUsabilityTest, TrayTooltipShowsTheLastRunBelowTheName) {
