@@ -18,6 +18,15 @@ namespace {
 
 constexpr QSize kPreviewSize(597, 397);
 
+// The side windows close on a plain Escape, as dialogs do.
+bool ClosesOnEscape(QWidget& window, const QKeyEvent& event) {
+    if (event.key() != Qt::Key_Escape || event.modifiers() != Qt::NoModifier) {
+        return false;
+    }
+    window.close();
+    return true;
+}
+
 // A window of text beside the main window that the user reads and closes, with its button
 // "Đóng" or with Escape.
 class TextWindow final : public QWidget {
@@ -52,11 +61,9 @@ public:
 
 protected:
     void keyPressEvent(QKeyEvent* event) override {
-        if (event->key() == Qt::Key_Escape && event->modifiers() == Qt::NoModifier) {
-            close();
-            return;
+        if (!ClosesOnEscape(*this, *event)) {
+            QWidget::keyPressEvent(event);
         }
-        QWidget::keyPressEvent(event);
     }
 };
 
@@ -112,11 +119,9 @@ PreviewWindow::PreviewWindow(QWidget* owner)
 }
 
 void PreviewWindow::keyPressEvent(QKeyEvent* event) {
-    if (event->key() == Qt::Key_Escape && event->modifiers() == Qt::NoModifier) {
-        close();
-        return;
+    if (!ClosesOnEscape(*this, *event)) {
+        QWidget::keyPressEvent(event);
     }
-    QWidget::keyPressEvent(event);
 }
 
 void PreviewWindow::ShowPicture(const std::filesystem::path& file) {
