@@ -202,12 +202,6 @@ void TabHead::keyPressEvent(QKeyEvent* event) {
         case Qt::Key_Right:
             next = std::min<qsizetype>(at + 1, heads.size() - 1);
             break;
-        case Qt::Key_Home:
-            next = 0;
-            break;
-        case Qt::Key_End:
-            next = heads.size() - 1;
-            break;
         default:
             PictureBox::keyPressEvent(event);
             return;
