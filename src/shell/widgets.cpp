@@ -114,9 +114,10 @@ ClickableLabel::ClickableLabel(const QString& text, QWidget* parent) : QLabel(te
 }
 
 void ClickableLabel::keyPressEvent(QKeyEvent* event) {
-    focusCue_.KeyPressed();
-    if (IsActivationKey(*event)) {
+    if (focusCue_.KeyPressed()) {
         update();
+    }
+    if (IsActivationKey(*event)) {
         emit clicked();
         return;
     }
@@ -179,9 +180,10 @@ TabHead::TabHead(const QString& caption, QWidget* parent) : PictureBox(parent), 
 }
 
 void TabHead::keyPressEvent(QKeyEvent* event) {
-    focusCue_.KeyPressed();
-    if (IsActivationKey(*event)) {
+    if (focusCue_.KeyPressed()) {
         update();
+    }
+    if (IsActivationKey(*event)) {
         emit clicked();
         return;
     }

@@ -3,6 +3,7 @@
 #include <QLabel>
 #include <QPixmap>
 #include <QWidget>
+#include <utility>
 
 // Small widgets of the main window: pictures that keep the last picture that could be loaded,
 // and labels that report clicks.
@@ -17,7 +18,8 @@ bool LoadPicture(QPixmap& pixmap, const QString& file);
 class FocusCue {
 public:
     void FocusIn(Qt::FocusReason reason);
-    void KeyPressed() { keyboard_ = true; }
+    // True when the frame has just become due: the widget repaints.
+    bool KeyPressed() { return !std::exchange(keyboard_, true); }
     bool Shown(const QWidget& widget) const { return keyboard_ && widget.hasFocus(); }
 
 private:
