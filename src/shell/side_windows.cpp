@@ -55,7 +55,8 @@ public:
         buttons->addWidget(close);
         layout->addLayout(buttons);
         setFixedWidth(width);
-        // The keyboard starts on the button, so Space closes too.
+        // The keyboard starts on the button, so Space and Enter close too.
+        close->setAutoDefault(true);
         close->setFocus();
     }
 
@@ -111,10 +112,10 @@ PreviewWindow::PreviewWindow(QWidget* owner)
     QScreen* screen = owner ? owner->screen() : QGuiApplication::primaryScreen();
     if (screen) {
         const QRect area = screen->availableGeometry();
-        QRect frame = QStyle::alignedRect(Qt::LeftToRight, Qt::AlignCenter, kPreviewSize, area);
+        const QRect centred =
+            QStyle::alignedRect(Qt::LeftToRight, Qt::AlignCenter, kPreviewSize, area);
         // On a screen smaller than the picture its top left corner stays on the screen.
-        frame.moveTo(std::max(frame.left(), area.left()), std::max(frame.top(), area.top()));
-        move(frame.topLeft());
+        move(std::max(centred.left(), area.left()), std::max(centred.top(), area.top()));
     }
 }
 

@@ -129,8 +129,8 @@ TEST_F(WindowUsabilityTest, AboutAndHelpCloseWithTheirButtonAndWithEscape) {
     auto window = Open();
     window->show();
     for (const char* title : {"Thong tin", "Huong dan"}) {
-        for (bool useButton : {true, false}) {
-            SCOPED_TRACE(std::string(title) + (useButton ? " button" : " Escape"));
+        for (Qt::Key key : {Qt::Key_unknown, Qt::Key_Escape, Qt::Key_Return}) {
+            SCOPED_TRACE(std::string(title) + " " + std::to_string(key));
             if (std::string_view(title) == "Thong tin") {
                 Click(window->infoButton());
             } else {
@@ -141,10 +141,10 @@ TEST_F(WindowUsabilityTest, AboutAndHelpCloseWithTheirButtonAndWithEscape) {
             auto* close = side->findChild<QPushButton*>(QStringLiteral("close"));
             ASSERT_NE(close, nullptr);
             EXPECT_EQ(close->text(), "Đóng");
-            if (useButton) {
+            if (key == Qt::Key_unknown) {
                 Click(close);
             } else {
-                Press(side, Qt::Key_Escape);
+                Press(key == Qt::Key_Escape ? side.data() : close, key);
             }
             QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
             EXPECT_TRUE(side.isNull());
