@@ -160,7 +160,8 @@ size_t YamlKeyEnd(std::string_view line) {
 struct YamlLevel {
     int indent;
     std::string path;
-    int nextItem = 0;  // index of the next "- " item below this key
+    int nextItem = 0;     // index of the next "- " item below this key
+    bool isItem = false;  // opened by a "- " item
 };
 
 std::string JoinKey(const std::string& parent, std::string_view key) {
@@ -245,19 +246,23 @@ Parsed ParseYamlSubset(std::string_view text) {
         if (content.empty() || content == "---" || content == "...") {
             continue;
         }
-        while (levels.size() > 1 && levels.back().indent >= indent) {
+        // A list may stand at its key's own column ("key:\n- item"), so an item closes only the
+        // previous item of that column, not the key.
+        const bool item = content == "-" || content.starts_with("- ");
+        while (levels.size() > 1 && (levels.back().indent > indent ||
+                                     (levels.back().indent == indent && (!item || levels.back().isItem)))) {
             levels.pop_back();
         }
         // "- " items: a scalar item gets the next index; an item that opens a mapping becomes a
         // level of its own, at the column of its first key.
         std::string parentPath = levels.back().path;
-        if (content == "-" || content.starts_with("- ")) {
+        if (item) {
             const std::string itemPath =
                 JoinKey(parentPath, std::to_string(levels.back().nextItem++));
             std::string_view rest = Trim(content.substr(1));
             const int itemIndent = indent + 1 + static_cast<int>(content.size() - 1 - rest.size());
             if (rest.empty()) {
-                levels.push_back({indent, itemPath});
+                levels.push_back({indent, itemPath, 0, true});
                 continue;
             }
             if (YamlKeyEnd(rest) == std::string_view::npos) {
@@ -265,7 +270,7 @@ Parsed ParseYamlSubset(std::string_view text) {
                 ++entries;
                 continue;
             }
-            levels.push_back({indent, itemPath});
+            levels.push_back({indent, itemPath, 0, true});
             parentPath = itemPath;
             content = rest;
             indent = itemIndent;
