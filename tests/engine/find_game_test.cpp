@@ -30,7 +30,9 @@ std::map<fs::path, std::string> Snapshot(const fs::path& root) {
         if (it->is_symlink()) {
             it.disable_recursion_pending();
         } else if (it->is_regular_file()) {
-            files[it->path()] = testing::ReadText(it->path()) + "@" +
+            const bool small = it->file_size() < (1u << 20);
+            files[it->path()] = (small ? testing::ReadText(it->path()) : "") + "@" +
+                                std::to_string(it->file_size()) + "@" +
                                 std::to_string(it->last_write_time().time_since_epoch().count());
         } else {
             files[it->path()] = "folder";
