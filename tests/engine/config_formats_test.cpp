@@ -73,7 +73,8 @@ TEST(ParseJson, FlattensNestedValues_DecodesEscapes_AndRejectsBrokenOrTooDeepTex
 TEST(ParseVdf, ReadsLibraryPaths_AndRejectsUnbalancedText) {
     const Parsed parsed = ParseVdf(
         "\"libraryfolders\"\n{\n  \"0\"\n  {\n    \"path\"\t\t\"/home/u/.local/share/Steam\"\n"
-        "    \"apps\" { \"228980\" \"123\" }\n  }\n  // comment\n  \"1\" { \"path\" \"/mnt/g\\\\s\" }\n}\n");
+        "    \"apps\" { \"228980\" \"123\" }\n  }\n  // comment\n  \"1\" { \"path\" "
+        "\"/mnt/g\\\\s\" }\n}\n");
     ASSERT_TRUE(parsed.ok()) << parsed.problem;
     EXPECT_EQ(parsed.values.Find("libraryfolders.0.path"), "/home/u/.local/share/Steam");
     EXPECT_EQ(parsed.values.Find("libraryfolders.0.apps.228980"), "123");
@@ -108,7 +109,8 @@ TEST(ParseWineRegistry, ReadsWantedKeysOnly_WithEscapesContinuationsAndArch) {
     ASSERT_TRUE(file.problem.empty());
     EXPECT_EQ(file.arch, "win32");
     ASSERT_EQ(file.values.size(), 5u);
-    EXPECT_EQ(file.values[0].key, "Software\\Microsoft\\Windows\\CurrentVersion\\Uninstall\\FIFA Online 2");
+    EXPECT_EQ(file.values[0].key,
+              "Software\\Microsoft\\Windows\\CurrentVersion\\Uninstall\\FIFA Online 2");
     EXPECT_EQ(file.values[0].value, "C:\\Games\\FIFA \"2\"\\Gameloader.exe,0");
     EXPECT_EQ(file.values[1].name, "InstallLocation");
     EXPECT_EQ(file.values[1].value, "D:\\Tr\xC3\xB2 ch\xC6\xA1i\\FIFA");
@@ -119,8 +121,8 @@ TEST(ParseWineRegistry, ReadsWantedKeysOnly_WithEscapesContinuationsAndArch) {
 
     EXPECT_FALSE(ParseWineRegistry("REGEDIT4\n", {""}).problem.empty());
     // A value cut off at the end of the file is dropped, not read past the end.
-    EXPECT_TRUE(ParseWineRegistry("WINE REGISTRY Version 2\n[A] 1\n\"x\"=\"abc\\\n", {"A"})
-                    .values.empty());
+    EXPECT_TRUE(
+        ParseWineRegistry("WINE REGISTRY Version 2\n[A] 1\n\"x\"=\"abc\\\n", {"A"}).values.empty());
 }
 
 TEST(DesktopEntryValue, ReadsTheMainGroupOnly) {

@@ -27,11 +27,12 @@ public:
         const fs::path prefix = home() / relative;
         fs::create_directories(prefix / "drive_c/windows/system32");
         fs::create_directories(prefix / "dosdevices");
-        WriteFile(prefix / "system.reg", "WINE REGISTRY Version 2\n;; All keys relative to "
-                                         "\\\\Machine\n\n#arch=" +
-                                             std::string(arch) + "\n\n" +
-                                             std::string(systemRegBody));
-        WriteFile(prefix / "user.reg", "WINE REGISTRY Version 2\n#arch=" + std::string(arch) + "\n");
+        WriteFile(prefix / "system.reg",
+                  "WINE REGISTRY Version 2\n;; All keys relative to "
+                  "\\\\Machine\n\n#arch=" +
+                      std::string(arch) + "\n\n" + std::string(systemRegBody));
+        WriteFile(prefix / "user.reg",
+                  "WINE REGISTRY Version 2\n#arch=" + std::string(arch) + "\n");
         std::error_code error;
         fs::create_directory_symlink("../drive_c", prefix / "dosdevices/c:", error);
         fs::create_directory_symlink("/", prefix / "dosdevices/z:", error);
@@ -39,7 +40,8 @@ public:
     }
 
     // A game folder with its launcher (a Windows program: not runnable here).
-    static fs::path MakeGame(const fs::path& folder, std::string_view launcherName = "Gameloader.exe") {
+    static fs::path MakeGame(const fs::path& folder,
+                             std::string_view launcherName = "Gameloader.exe") {
         WriteFile(folder / launcherName, "MZ not really a program");
         return folder;
     }

@@ -57,7 +57,8 @@ protected:
         const fs::path lutrisPrefix = home_.MakePrefix("Games/fifa-online-2");
         FakeHome::MakeGame(lutrisPrefix / "drive_c/Program Files/FIFA");
         WriteFile(home_ / ".config/lutris/games/fifa-online-2-1700000000.yml",
-                  "game:\n  exe: " + (lutrisPrefix / "drive_c/Program Files/FIFA/Gameloader.exe").string() +
+                  "game:\n  exe: " +
+                      (lutrisPrefix / "drive_c/Program Files/FIFA/Gameloader.exe").string() +
                       "\n  prefix: " + lutrisPrefix.string() + "\nwine:\n  version: lutris-7\n");
         WriteFile(home_ / ".local/share/lutris/games/broken.yml", std::string("\0\1\2garbage", 10));
 
@@ -65,8 +66,10 @@ protected:
         const fs::path bottle = home_.MakePrefix("elsewhere/fifa-bottle");
         WriteFile(bottle / "bottle.yml", "Name: fifa-bottle\nArch: win64\n");
         FakeHome::MakeGame(bottle / "drive_c/users/me/FO2", "gameloader.exe");
-        WriteFile(home_ / ".var/app/com.usebottles.bottles/data/bottles/bottles/fifa-bottle/placeholder.yml",
-                  "Path: " + bottle.string() + "\n");
+        WriteFile(
+            home_ /
+                ".var/app/com.usebottles.bottles/data/bottles/bottles/fifa-bottle/placeholder.yml",
+            "Path: " + bottle.string() + "\n");
 
         // Heroic: a sideloaded game with its prefix in GamesConfig; a broken JSON file.
         const fs::path heroicPrefix = home_.MakePrefix("Games/Heroic/Prefixes/fo2");
@@ -81,8 +84,9 @@ protected:
 
         // PlayOnLinux, and a Steam library named in libraryfolders.vdf.
         FakeHome::MakeGame(home_.MakePrefix(".PlayOnLinux/wineprefix/FO2") / "drive_c/POL");
-        WriteFile(home_ / ".local/share/Steam/steamapps/libraryfolders.vdf",
-                  "\"libraryfolders\" { \"1\" { \"path\" \"" + (home_ / "lib2").string() + "\" } }");
+        WriteFile(
+            home_ / ".local/share/Steam/steamapps/libraryfolders.vdf",
+            "\"libraryfolders\" { \"1\" { \"path\" \"" + (home_ / "lib2").string() + "\" } }");
         FakeHome::MakeGame(home_.MakePrefix("lib2/steamapps/compatdata/3000000000/pfx") /
                            "drive_c/Steam FO2");
 

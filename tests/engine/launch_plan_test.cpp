@@ -36,7 +36,8 @@ void MakeLutrisDatabase(const fs::path& file, const std::string& configName) {
     const std::string sql =
         "CREATE TABLE games (id INTEGER PRIMARY KEY, name TEXT, slug TEXT, configpath TEXT);"
         "INSERT INTO games VALUES (7, 'Other', 'other', 'other-1');"
-        "INSERT INTO games VALUES (42, 'FIFA Online 2', 'fifa-online-2', '" + configName + "');";
+        "INSERT INTO games VALUES (42, 'FIFA Online 2', 'fifa-online-2', '" +
+        configName + "');";
     ASSERT_EQ(sqlite3_exec(db, sql.c_str(), nullptr, nullptr, nullptr), SQLITE_OK);
     sqlite3_close(db);
 }
@@ -49,9 +50,11 @@ TEST(PlanLaunch, LutrisGameStartsThroughLutris_ByItsNumber_OrFlatpak_OrFallsBack
                             "\n  prefix: " + prefix.string() + "\nwine:\n  version: lutris-8\n";
     WriteFile(home / ".config/lutris/games/fifa-online-2-1700.yml", yml);
     MakeLutrisDatabase(home / ".local/share/lutris/pga.db", "fifa-online-2-1700");
-    testing::WriteProgram(home / ".local/share/lutris/runners/wine/lutris-8/bin/wine", "#!/bin/sh\n");
+    testing::WriteProgram(home / ".local/share/lutris/runners/wine/lutris-8/bin/wine",
+                          "#!/bin/sh\n");
 
-    LaunchDecision decision = PlanLaunch(game.string(), home.folders(), Installed{{"lutris", "wine"}}.lookup());
+    LaunchDecision decision =
+        PlanLaunch(game.string(), home.folders(), Installed{{"lutris", "wine"}}.lookup());
     ASSERT_EQ(decision.problem, LaunchProblem::None);
     EXPECT_EQ(decision.plan.program, "/fake/bin/lutris");
     EXPECT_EQ(decision.plan.arguments, Args{"lutris:rungameid/42"});
@@ -66,7 +69,8 @@ TEST(PlanLaunch, LutrisGameStartsThroughLutris_ByItsNumber_OrFlatpak_OrFallsBack
     // The Flatpak build's files, without a database: started by the short name.
     fs::remove_all(home / ".config/lutris");
     WriteFile(home / ".var/app/net.lutris.Lutris/data/lutris/games/fifa-online-2-1700.yml", yml);
-    decision = PlanLaunch(game.string(), home.folders(), Installed{{"lutris", "flatpak", "wine"}}.lookup());
+    decision = PlanLaunch(game.string(), home.folders(),
+                          Installed{{"lutris", "flatpak", "wine"}}.lookup());
     EXPECT_EQ(decision.plan.program, "/fake/bin/flatpak");
     EXPECT_EQ(decision.plan.arguments,
               (Args{"run", "net.lutris.Lutris", "lutris:rungame/fifa-online-2"}));
@@ -76,7 +80,8 @@ TEST(PlanLaunch, BottleThatHoldsTheGameStartsThroughBottlesCli_NativeOrFlatpak) 
     FakeHome home;
     const fs::path bottle = home.MakePrefix(".local/share/bottles/bottles/FIFA");
     WriteFile(bottle / "bottle.yml", "Name: FIFA Bottle\nArch: win64\n");
-    const fs::path game = FakeHome::MakeGame(bottle / "drive_c/Program Files/FO2", "gameLoader.exe");
+    const fs::path game =
+        FakeHome::MakeGame(bottle / "drive_c/Program Files/FO2", "gameLoader.exe");
     const std::string launcher = (game / "gameLoader.exe").string();
 
     LaunchDecision decision =
@@ -116,19 +121,22 @@ TEST(PlanLaunch, OtherwiseWineRunsInTheGamesOwnPrefix_WithItsArch) {
     const fs::path outside = FakeHome::MakeGame(home / "disk/FIFA");
     fs::create_directory_symlink(home / "disk", wine / "dosdevices/d:");
     decision = PlanLaunch(outside.string(), home.folders(), wineOnly);
-    EXPECT_EQ(decision.plan.environment,
-              (platform::EnvironmentAdditions{{"WINEPREFIX", wine.string()}, {"WINEARCH", "win64"}}));
+    EXPECT_EQ(
+        decision.plan.environment,
+        (platform::EnvironmentAdditions{{"WINEPREFIX", wine.string()}, {"WINEARCH", "win64"}}));
     EXPECT_EQ(decision.plan.description, "Wine in prefix " + wine.string() + " (win64)");
 }
 
 TEST(PlanLaunch, MissingLauncherOrWineIsSaid_AndANativeLauncherRunsDirectly) {
     FakeHome home;
     const fs::path game = FakeHome::MakeGame(home / "game");
-    EXPECT_EQ(PlanLaunch((home / "empty").string(), home.folders(), Installed{{"wine"}}.lookup()).problem,
-              LaunchProblem::LauncherMissing);
+    EXPECT_EQ(
+        PlanLaunch((home / "empty").string(), home.folders(), Installed{{"wine"}}.lookup()).problem,
+        LaunchProblem::LauncherMissing);
     EXPECT_EQ(PlanLaunch(game.string(), home.folders(), Installed{}.lookup()).problem,
               LaunchProblem::WineMissing);
-    const LaunchDecision outside = PlanLaunch(game.string(), home.folders(), Installed{{"wine"}}.lookup());
+    const LaunchDecision outside =
+        PlanLaunch(game.string(), home.folders(), Installed{{"wine"}}.lookup());
     EXPECT_TRUE(outside.plan.environment.empty());
     EXPECT_EQ(outside.plan.description, "Wine in the prefix of the environment");
 
