@@ -87,7 +87,11 @@ GameFinderButton::GameFinderButton(QLineEdit* gameFolderBox, engine::UserFolders
 }
 
 GameFinderButton::~GameFinderButton() {
+    const bool running = !finished_;
     stopWorker();
+    if (running) {
+        QApplication::restoreOverrideCursor();
+    }
 }
 
 void GameFinderButton::stopWorker() {
