@@ -16,10 +16,13 @@ constexpr std::string_view kLauncherName = "Gameloader.exe";
 std::string Shorten(const fs::path& path, const fs::path& home) {
     const std::string text = path.string();
     const std::string homeText = home.string();
-    if (!homeText.empty() && text.starts_with(homeText + "/")) {
-        return "~" + text.substr(homeText.size());
+    if (homeText.empty() || text.size() <= homeText.size() || !text.starts_with(homeText) ||
+        text[homeText.size()] != '/') {
+        return text;
     }
-    return text;
+    std::string shortened(1, '~');
+    shortened.append(text, homeText.size());
+    return shortened;
 }
 
 std::string SourceOf(const ManagedPrefix& entry, const fs::path& home) {
@@ -28,9 +31,10 @@ std::string SourceOf(const ManagedPrefix& entry, const fs::path& home) {
         source += " (Flatpak)";
     }
     if (!entry.name.empty()) {
-        source += ": " + entry.name;
+        source.append(": ").append(entry.name);
     }
-    return source + " (" + Shorten(entry.configFile, home) + ")";
+    source.append(" (").append(Shorten(entry.configFile, home)).append(")");
+    return source;
 }
 
 class Finder {

@@ -42,6 +42,9 @@ public:
 
     ManagerScan Run() {
         AddPlainPrefix(folders_.winePrefix, Manager::Wine, "WINEPREFIX");
+        if (folders_.home.empty()) {
+            return std::move(scan_);  // no home folder (HOME unset): nothing more to read
+        }
         AddPlainPrefix(folders_.home / ".wine", Manager::Wine, "~/.wine");
         ScanLutris(folders_.configHome / "lutris", folders_.dataHome / "lutris", false);
         ScanLutris(Home(kLutrisFlatpak) / "config/lutris", Home(kLutrisFlatpak) / "data/lutris",
