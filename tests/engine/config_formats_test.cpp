@@ -133,5 +133,24 @@ TEST(DesktopEntryValue, ReadsTheMainGroupOnly) {
     EXPECT_EQ(DesktopEntryValue(text, "Icon"), "");
 }
 
+// Files cut off anywhere (a manager writing them, a full disk) are read or refused, never read
+// past their end; the sanitizer build checks that.
+TEST(ConfigReaders, EveryTruncationOfAFileIsHandled) {
+    const std::string yaml = "game:\n  exe: \"a\\u00e9\"\n  prefix: 'b''c'\nlist:\n- x\n- k: v\n";
+    const std::string json = R"({"a": {"b": ["\ud83d\ude00", 1.5e3, true, null]}})";
+    const std::string vdf = "\"a\" { \"path\" \"x\\\\y\" } // c\n";
+    const std::string reg =
+        "WINE REGISTRY Version 2\n#arch=win64\n[Software\\\\X] 1\n\"A\"=\"\\x00e9\\u1ea0\\\n b\"\n";
+    for (size_t n = 0; n <= reg.size(); ++n) {
+        (void)ParseYamlSubset(yaml.substr(0, std::min(n, yaml.size())));
+        (void)ParseJson(json.substr(0, std::min(n, json.size())));
+        (void)ParseVdf(vdf.substr(0, std::min(n, vdf.size())));
+        (void)ParseWineRegistry(reg.substr(0, n), {"Software"});
+        (void)DesktopEntryValue(reg.substr(0, n), "A");
+    }
+    EXPECT_TRUE(ParseJson(json).ok());
+    EXPECT_FALSE(ParseJson(json.substr(0, json.size() - 1)).ok());
+}
+
 }  // namespace
 }  // namespace kickvane::engine
