@@ -68,6 +68,65 @@ long ReadHex(std::string_view text, size_t& pos, int maxDigits) {
     return code;
 }
 
+// The line that starts at `start` (without its line break, also a "\r\n" one); `start` moves to
+// the next line.
+std::string_view NextLine(std::string_view text, size_t& start) {
+    size_t end = text.find('\n', start);
+    if (end == std::string_view::npos) {
+        end = text.size();
+    }
+    std::string_view line = text.substr(start, end - start);
+    start = end + 1;
+    if (!line.empty() && line.back() == '\r') {
+        line.remove_suffix(1);
+    }
+    return line;
+}
+
+// Decodes backslash escapes: \n \r \t \0, \xH.. (up to `xDigits` hex digits), \uHHHH and
+// \UHHHHHHHH as UTF-8; any other escaped character stands for itself (\\ and \").
+std::string DecodeEscapes(std::string_view text, int xDigits) {
+    std::string out;
+    out.reserve(text.size());
+    for (size_t i = 0; i < text.size(); ++i) {
+        if (text[i] != '\\' || i + 1 == text.size()) {
+            out += text[i];
+            continue;
+        }
+        const char e = text[++i];
+        size_t pos = i + 1;
+        switch (e) {
+            case 'n':
+                out += '\n';
+                break;
+            case 'r':
+                out += '\r';
+                break;
+            case 't':
+                out += '\t';
+                break;
+            case '0':
+                out += '\0';
+                break;
+            case 'x':
+            case 'u':
+            case 'U': {
+                const long code = ReadHex(text, pos, e == 'x' ? xDigits : (e == 'u' ? 4 : 8));
+                if (code >= 0) {
+                    AppendUtf8(out, static_cast<unsigned>(code));
+                    i = pos - 1;
+                } else {
+                    out += e;
+                }
+                break;
+            }
+            default:
+                out += e;
+        }
+    }
+    return out;
+}
+
 // ---- YAML subset ----
 
 // Removes a comment: '#' at the start or after a blank, outside quotes.
@@ -105,37 +164,7 @@ std::string YamlScalar(std::string_view text) {
         return out;
     }
     if (text.size() >= 2 && text.front() == '"' && text.back() == '"') {
-        std::string out;
-        const std::string_view inner = text.substr(1, text.size() - 2);
-        for (size_t i = 0; i < inner.size(); ++i) {
-            if (inner[i] != '\\' || i + 1 == inner.size()) {
-                out += inner[i];
-                continue;
-            }
-            const char e = inner[++i];
-            size_t pos = i + 1;
-            switch (e) {
-                case 'n':
-                    out += '\n';
-                    break;
-                case 't':
-                    out += '\t';
-                    break;
-                case 'x':
-                case 'u':
-                case 'U': {
-                    const long code = ReadHex(inner, pos, e == 'x' ? 2 : (e == 'u' ? 4 : 8));
-                    if (code >= 0) {
-                        AppendUtf8(out, static_cast<unsigned>(code));
-                        i = pos - 1;
-                    }
-                    break;
-                }
-                default:
-                    out += e;
-            }
-        }
-        return out;
+        return DecodeEscapes(text.substr(1, text.size() - 2), 2);
     }
     return std::string(text);
 }
@@ -223,12 +252,7 @@ Parsed ParseYamlSubset(std::string_view text) {
     size_t entries = 0;
     size_t start = 0;
     while (start < text.size()) {
-        size_t end = text.find('\n', start);
-        if (end == std::string_view::npos) {
-            end = text.size();
-        }
-        std::string_view line = text.substr(start, end - start);
-        start = end + 1;
+        const std::string_view line = NextLine(text, start);
         ++lineNumber;
 
         int indent = 0;
@@ -249,8 +273,9 @@ Parsed ParseYamlSubset(std::string_view text) {
         // A list may stand at its key's own column ("key:\n- item"), so an item closes only the
         // previous item of that column, not the key.
         const bool item = content == "-" || content.starts_with("- ");
-        while (levels.size() > 1 && (levels.back().indent > indent ||
-                                     (levels.back().indent == indent && (!item || levels.back().isItem)))) {
+        while (levels.size() > 1 &&
+               (levels.back().indent > indent ||
+                (levels.back().indent == indent && (!item || levels.back().isItem)))) {
             levels.pop_back();
         }
         // "- " items: a scalar item gets the next index; an item that opens a mapping becomes a
@@ -581,46 +606,9 @@ Parsed ParseVdf(std::string_view text) {
 
 namespace {
 
-// Decodes the escapes of a registry key name or value; `text` excludes the quotes.
+// Wine writes characters outside ASCII as \x with up to four hex digits.
 std::string DecodeRegistryText(std::string_view text) {
-    std::string out;
-    out.reserve(text.size());
-    for (size_t i = 0; i < text.size(); ++i) {
-        if (text[i] != '\\' || i + 1 == text.size()) {
-            out += text[i];
-            continue;
-        }
-        const char e = text[++i];
-        size_t pos = i + 1;
-        switch (e) {
-            case 'n':
-                out += '\n';
-                break;
-            case 'r':
-                out += '\r';
-                break;
-            case 't':
-                out += '\t';
-                break;
-            case '0':
-                out += '\0';
-                break;
-            case 'x':
-            case 'u': {
-                const long code = ReadHex(text, pos, 4);
-                if (code >= 0) {
-                    AppendUtf8(out, static_cast<unsigned>(code));
-                    i = pos - 1;
-                } else {
-                    out += e;
-                }
-                break;
-            }
-            default:
-                out += e;  // \\ and \" and anything else stand for themselves
-        }
-    }
-    return out;
+    return DecodeEscapes(text, 4);
 }
 
 // The end of a quoted text that starts after `open`: the next quote not escaped.
@@ -652,15 +640,7 @@ RegistryFile ParseWineRegistry(std::string_view text, const std::vector<std::str
     std::string key;
     size_t start = 0;
     while (start < text.size()) {
-        size_t end = text.find('\n', start);
-        if (end == std::string_view::npos) {
-            end = text.size();
-        }
-        std::string_view line = text.substr(start, end - start);
-        start = end + 1;
-        if (!line.empty() && line.back() == '\r') {
-            line.remove_suffix(1);
-        }
+        const std::string_view line = NextLine(text, start);
         if (line.starts_with("#arch=")) {
             file.arch = std::string(Trim(line.substr(6)));
             continue;
@@ -696,16 +676,7 @@ RegistryFile ParseWineRegistry(std::string_view text, const std::vector<std::str
         while (valueEnd == std::string::npos && !joined.empty() && joined.back() == '\\' &&
                start < text.size()) {
             joined.pop_back();
-            size_t nextEnd = text.find('\n', start);
-            if (nextEnd == std::string_view::npos) {
-                nextEnd = text.size();
-            }
-            std::string_view next = text.substr(start, nextEnd - start);
-            start = nextEnd + 1;
-            if (!next.empty() && next.back() == '\r') {
-                next.remove_suffix(1);
-            }
-            joined += Trim(next);
+            joined += Trim(NextLine(text, start));
             valueEnd = QuotedEnd(joined, valueOpen);
         }
         if (valueEnd == std::string::npos) {
@@ -723,12 +694,7 @@ std::string DesktopEntryValue(std::string_view text, std::string_view key) {
     bool inMainGroup = false;
     size_t start = 0;
     while (start < text.size()) {
-        size_t end = text.find('\n', start);
-        if (end == std::string_view::npos) {
-            end = text.size();
-        }
-        const std::string_view line = Trim(text.substr(start, end - start));
-        start = end + 1;
+        const std::string_view line = Trim(NextLine(text, start));
         if (line.starts_with("[")) {
             inMainGroup = line == "[Desktop Entry]";
             continue;

@@ -12,18 +12,6 @@ namespace {
 constexpr std::string_view kLutrisFlatpakId = "net.lutris.Lutris";
 constexpr std::string_view kBottlesFlatpakId = "com.usebottles.bottles";
 
-fs::path Canonical(const fs::path& path) {
-    std::error_code error;
-    fs::path canonical = fs::weakly_canonical(path, error);
-    return error ? path.lexically_normal() : canonical;
-}
-
-bool IsWithin(const fs::path& folder, const fs::path& parent) {
-    const std::string f = folder.string();
-    const std::string p = parent.string();
-    return !p.empty() && (f == p || (f.starts_with(p) && (p.back() == '/' || f[p.size()] == '/')));
-}
-
 bool SameFile(const fs::path& a, const fs::path& b) {
     std::error_code error;
     return !a.empty() && !b.empty() && fs::equivalent(a, b, error) && !error;
@@ -57,7 +45,7 @@ std::optional<LaunchPlan> ThroughLutris(const ManagedPrefix& game, const fs::pat
 // Bottles runs any program of a bottle with the bottle's Wine and settings.
 std::optional<LaunchPlan> ThroughBottles(const ManagedPrefix& bottle, const fs::path& launcher,
                                          const ProgramLookup& findProgram) {
-    if (!IsWithin(launcher, Canonical(bottle.prefix))) {
+    if (!IsWithinFolder(launcher, CanonicalOrNormal(bottle.prefix))) {
         return std::nullopt;
     }
     const std::vector<std::string> run{"run", "-b", bottle.id, "-e", launcher.string()};
@@ -95,7 +83,7 @@ LaunchDecision PlanLaunch(std::string_view gameFolder, const UserFolders& folder
         return decision;
     }
 
-    const fs::path canonicalLauncher = Canonical(launcher);
+    const fs::path canonicalLauncher = CanonicalOrNormal(launcher);
     const ManagerScan scan = ScanGameManagers(folders);
     for (const ManagedPrefix& entry : scan.entries) {
         std::optional<LaunchPlan> managed;
@@ -125,10 +113,10 @@ LaunchDecision PlanLaunch(std::string_view gameFolder, const UserFolders& folder
     }
     fs::path wine;
     if (prefix) {
-        const fs::path canonicalPrefix = Canonical(*prefix);
+        const fs::path canonicalPrefix = CanonicalOrNormal(*prefix);
         for (const ManagedPrefix& entry : scan.entries) {
             if (!entry.wineProgram.empty() && !entry.prefix.empty() &&
-                Canonical(entry.prefix) == canonicalPrefix) {
+                CanonicalOrNormal(entry.prefix) == canonicalPrefix) {
                 wine = entry.wineProgram;
                 plan.description = std::string(ManagerName(entry.manager)) + "'s Wine ";
                 break;

@@ -16,25 +16,6 @@ constexpr std::string_view kUninstallKeys[] = {
     "Software\\Wow6432Node\\Microsoft\\Windows\\CurrentVersion\\Uninstall\\",
 };
 
-bool IsWithin(const fs::path& folder, const fs::path& parent) {
-    auto f = folder.begin();
-    for (auto p = parent.begin(); p != parent.end(); ++p, ++f) {
-        if (p->empty()) {
-            continue;  // a trailing separator
-        }
-        if (f == folder.end() || *f != *p) {
-            return false;
-        }
-    }
-    return true;
-}
-
-fs::path Canonical(const fs::path& path) {
-    std::error_code error;
-    fs::path canonical = fs::weakly_canonical(path, error);
-    return error ? path.lexically_normal() : canonical;
-}
-
 // "C:\Games\FIFA\Gameloader.exe,0" or "\"C:\...\icon.ico\"": the folder of the file named.
 std::string FolderOfIconValue(std::string value) {
     if (value.size() >= 2 && value.front() == '"') {
@@ -48,6 +29,28 @@ std::string FolderOfIconValue(std::string value) {
 }
 
 }  // namespace
+
+fs::path CanonicalOrNormal(const fs::path& path) {
+    std::error_code error;
+    fs::path canonical = fs::weakly_canonical(path, error);
+    return error ? path.lexically_normal() : canonical;
+}
+
+bool IsWithinFolder(const fs::path& folder, const fs::path& parent) {
+    if (parent.empty()) {
+        return false;
+    }
+    auto f = folder.begin();
+    for (auto p = parent.begin(); p != parent.end(); ++p, ++f) {
+        if (p->empty()) {
+            continue;  // a trailing separator
+        }
+        if (f == folder.end() || *f != *p) {
+            return false;
+        }
+    }
+    return true;
+}
 
 UserFolders UserFolders::FromEnvironment() {
     UserFolders folders;
@@ -70,7 +73,7 @@ bool IsWinePrefix(const fs::path& folder) {
 }
 
 std::optional<fs::path> FindPrefixHolding(const fs::path& folder) {
-    fs::path current = Canonical(folder);
+    fs::path current = CanonicalOrNormal(folder);
     while (true) {
         if (IsWinePrefix(current)) {
             return current;
@@ -84,7 +87,7 @@ std::optional<fs::path> FindPrefixHolding(const fs::path& folder) {
 
 std::optional<fs::path> FindPrefixMapping(const fs::path& folder,
                                           const std::vector<fs::path>& prefixes) {
-    const fs::path target = Canonical(folder);
+    const fs::path target = CanonicalOrNormal(folder);
     for (const fs::path& prefix : prefixes) {
         std::error_code error;
         fs::directory_iterator drives(prefix / "dosdevices", error);
@@ -93,8 +96,8 @@ std::optional<fs::path> FindPrefixMapping(const fs::path& folder,
             if (name.size() != 2 || name[1] != ':' || name == "z:") {
                 continue;
             }
-            const fs::path mapped = Canonical(drives->path());
-            if (mapped.has_relative_path() && IsWithin(target, mapped)) {
+            const fs::path mapped = CanonicalOrNormal(drives->path());
+            if (mapped.has_relative_path() && IsWithinFolder(target, mapped)) {
                 return prefix;
             }
         }

@@ -28,6 +28,12 @@ struct UserFolders {
 // Registry files larger than this are skipped rather than read.
 inline constexpr size_t kMaxRegistryBytes = 64u << 20;
 
+// The path with links and "." and ".." resolved as far as it exists; lexically normal otherwise.
+fs::path CanonicalOrNormal(const fs::path& path);
+
+// True when `folder` is `parent` or lies below it (both canonical).
+bool IsWithinFolder(const fs::path& folder, const fs::path& parent);
+
 // A folder with "drive_c" and at least one of "system.reg" and "user.reg".
 bool IsWinePrefix(const fs::path& folder);
 
