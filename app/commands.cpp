@@ -38,7 +38,7 @@ private:
 };
 
 struct Options {
-    fs::path toolFolder = platform::ProgramFolder();
+    fs::path toolFolder;
     std::optional<std::string> game;
     std::vector<std::string_view> positional;
 };
@@ -65,6 +65,9 @@ std::optional<Options> ParseOptions(Args args, bool allowGame) {
         } else {
             options.positional.push_back(arg);
         }
+    }
+    if (options.toolFolder.empty()) {
+        options.toolFolder = DefaultToolFolder();
     }
     return options;
 }
@@ -118,6 +121,9 @@ void PrintUsage(std::ostream& out) {
            "  ini set FILE SECTION KEY VALUE            write one settings value\n"
            "  trigger                                   make the running window apply the sets "
            "now\n"
+           "  launch [--tool-folder DIR]                start the game where it lives (its game\n"
+           "                                            manager, or Wine in its own prefix)\n"
+           "  find-game                                 list the folders that hold Gameloader.exe\n"
            "  skin-gallery OUT.png                      draw every themed control into a sheet\n"
            "\n"
            "The tool folder defaults to the program's folder; the selection and the game folder\n"

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <filesystem>
 #include <iosfwd>
 #include <span>
 #include <string_view>
@@ -16,6 +17,12 @@ int RunQuickLoad(Args args);
 int RunVni(Args args);
 int RunIni(Args args);
 int RunTrigger(Args args);
+int RunLaunch(Args args);
+int RunFindGame(Args args);
+
+// The tool folder when none is given: beside the program when it may write there, else the
+// user's own data folder, set up from the installed sets on first use.
+std::filesystem::path DefaultToolFolder();
 
 // Commands that need the window system; in a build without it they say so.
 int RunWindowCommand(int& argc, char** argv, Args args);

@@ -9,12 +9,14 @@
 namespace kickvane::app {
 
 int RunWindowCommand(int& argc, char** argv, Args args) {
-    std::filesystem::path toolFolder = platform::ProgramFolder();
+    std::filesystem::path toolFolder;
     if (args.size() == 2 && args[0] == "--tool-folder") {
         toolFolder = std::filesystem::absolute(std::filesystem::path(std::string(args[1])));
     } else if (!args.empty()) {
         PrintUsage(std::cerr);
         return 2;
+    } else {
+        toolFolder = DefaultToolFolder();
     }
     return shell::RunWindow(argc, argv, toolFolder);
 }

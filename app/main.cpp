@@ -31,6 +31,12 @@ int main(int argc, char** argv) {
     if (command == "trigger") {
         return RunTrigger(rest);
     }
+    if (command == "launch") {
+        return RunLaunch(rest);
+    }
+    if (command == "find-game") {
+        return RunFindGame(rest);
+    }
     if (command == "skin-gallery") {
         return RunSkinGallery(rest);
     }

@@ -14,6 +14,8 @@ packages=(
   xvfb xauth xdotool x11-utils trayer imagemagick
   # fonts with Vietnamese glyphs for the window and the artwork
   fonts-dejavu-core
+  # Lutris's game database (read-only); desktop entry check and packages of the install test
+  libsqlite3-dev desktop-file-utils dpkg-dev
 )
 
 missing=()

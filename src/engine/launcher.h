@@ -16,9 +16,9 @@ inline constexpr std::string_view kStartFailedText = "Không chạy được Gam
 enum class LaunchResult { Started, LauncherMissing, WineMissing, StartFailed };
 
 // Starts "Gameloader.exe" from the game folder without waiting, with the game folder as the
-// working folder. A Windows program runs through Wine (the `wine` on PATH, with the WINEPREFIX of
-// the environment); a file that this system can run itself is started directly. When it cannot
-// start, the user is told why and the result says so.
+// working folder, the way PlanLaunch decides (through the game's manager, or Wine in the game's
+// own prefix; a file that this system can run itself directly). When it cannot start, the user
+// is told why and the result says so.
 LaunchResult LaunchGame(std::string_view gameFolder, EngineUi& ui);
 
 }  // namespace kickvane::engine

@@ -14,6 +14,8 @@
 
 #include "platform/process.h"
 
+extern char** environ;
+
 namespace kickvane::platform {
 
 namespace fs = std::filesystem;
@@ -44,8 +46,8 @@ Status FailureOf(const StartFailure& failure, const fs::path& program, const fs:
 
 // Runs in the forked child: only async-signal-safe calls until exec, since the parent may have
 // other threads whose locks were copied in whatever state they were.
-[[noreturn]] void RunChild(const char* program, char* const* argv, const char* folder,
-                           int reportFd) {
+[[noreturn]] void RunChild(const char* program, char* const* argv, char* const* envp,
+                           const char* folder, int reportFd) {
     auto report = [reportFd](int step) {
         const StartFailure failure{step, errno};
         ssize_t ignored = ::write(reportFd, &failure, sizeof failure);
@@ -96,7 +98,7 @@ Status FailureOf(const StartFailure& failure, const fs::path& program, const fs:
     ::close_range(3, ~0u, CLOSE_RANGE_CLOEXEC);
 #endif
 
-    ::execv(program, argv);
+    ::execve(program, argv, envp);
     report(kStepExec);
     ::_exit(127);  // not reached: report() exits
 }
@@ -107,10 +109,37 @@ bool IsExecutableFile(const fs::path& path) {
            ::access(path.c_str(), X_OK) == 0;
 }
 
+// The tool's environment with the additions put in: a variable named there is replaced, the others
+// are kept in their order.
+std::vector<std::string> EnvironmentWith(const EnvironmentAdditions& additions) {
+    std::vector<std::string> entries;
+    for (char** entry = environ; entry != nullptr && *entry != nullptr; ++entry) {
+        const std::string_view text(*entry);
+        const std::string_view name = text.substr(0, text.find('='));
+        bool replaced = false;
+        for (const auto& [addedName, value] : additions) {
+            replaced = replaced || addedName == name;
+        }
+        if (!replaced) {
+            entries.emplace_back(text);
+        }
+    }
+    for (const auto& [name, value] : additions) {
+        entries.push_back(name + "=" + value);
+    }
+    return entries;
+}
+
 }  // namespace
 
 Status StartDetached(const fs::path& program, const std::vector<std::string>& arguments,
-                     const fs::path& workingFolder, bool /*minimised: no such state here*/) {
+                     const fs::path& workingFolder, bool /*minimised: no such state here*/,
+                     const EnvironmentAdditions& environment) {
+    for (const auto& [name, value] : environment) {
+        if (name.empty() || name.find('=') != std::string::npos) {
+            return Status::Fail("cannot start " + program.string() + ": bad variable name " + name);
+        }
+    }
     if (program.empty()) {
         return Status::Fail("no program given");
     }
@@ -136,6 +165,13 @@ Status StartDetached(const fs::path& program, const std::vector<std::string>& ar
         argv.push_back(text.data());
     }
     argv.push_back(nullptr);
+    std::vector<std::string> environmentTexts = EnvironmentWith(environment);
+    std::vector<char*> envp;
+    envp.reserve(environmentTexts.size() + 1);
+    for (std::string& text : environmentTexts) {
+        envp.push_back(text.data());
+    }
+    envp.push_back(nullptr);
 
     // The grandchild writes a StartFailure here when it cannot exec; a successful exec closes
     // the pipe (close-on-exec) and the parent reads end-of-file.
@@ -153,7 +189,7 @@ Status StartDetached(const fs::path& program, const std::vector<std::string>& ar
     }
     if (child == 0) {
         ::close(pipe[0]);
-        RunChild(programText.c_str(), argv.data(), folderText.c_str(), pipe[1]);
+        RunChild(programText.c_str(), argv.data(), envp.data(), folderText.c_str(), pipe[1]);
     }
 
     ::close(pipe[1]);

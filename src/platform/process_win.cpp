@@ -2,7 +2,9 @@
 #include <windows.h>
 
 #include <array>
+#include <cwchar>
 #include <fstream>
+#include <string_view>
 #include <system_error>
 
 #include "platform/process.h"
@@ -54,10 +56,47 @@ void AppendQuoted(std::wstring& line, const std::wstring& argument) {
     line += L'"';
 }
 
+// The tool's environment block with the additions put in (a variable named there is replaced;
+// names compare without regard to case, as Windows does). Empty when there is nothing to add, so
+// the program inherits the tool's block unchanged.
+std::wstring EnvironmentBlockWith(const EnvironmentAdditions& additions) {
+    std::wstring block;
+    if (additions.empty()) {
+        return block;
+    }
+    auto sameName = [](std::wstring_view a, std::wstring_view b) {
+        return CompareStringOrdinal(a.data(), static_cast<int>(a.size()), b.data(),
+                                    static_cast<int>(b.size()), TRUE) == CSTR_EQUAL;
+    };
+    if (wchar_t* current = GetEnvironmentStringsW()) {
+        for (const wchar_t* entry = current; *entry != L'\0'; entry += wcslen(entry) + 1) {
+            const std::wstring_view text(entry);
+            // Entries such as "=C:=C:\\" name a drive's folder; their name starts after the '='.
+            const std::wstring_view name = text.substr(0, text.find(L'=', 1));
+            bool replaced = false;
+            for (const auto& [addedName, value] : additions) {
+                replaced = replaced || sameName(Widen(addedName), name);
+            }
+            if (!replaced) {
+                block.append(text);
+                block += L'\0';
+            }
+        }
+        FreeEnvironmentStringsW(current);
+    }
+    for (const auto& [name, value] : additions) {
+        block += Widen(name) + L"=" + Widen(value);
+        block += L'\0';
+    }
+    block += L'\0';
+    return block;
+}
+
 }  // namespace
 
 Status StartDetached(const fs::path& program, const std::vector<std::string>& arguments,
-                     const fs::path& workingFolder, bool minimised) {
+                     const fs::path& workingFolder, bool minimised,
+                     const EnvironmentAdditions& environment) {
     std::error_code error;
     const fs::path absoluteProgram = fs::absolute(program, error);
     if (program.empty() || error) {
@@ -78,8 +117,10 @@ Status StartDetached(const fs::path& program, const std::vector<std::string>& ar
     }
     PROCESS_INFORMATION process{};
     const std::wstring folder = workingFolder.wstring();
+    std::wstring environmentBlock = EnvironmentBlockWith(environment);
     if (!CreateProcessW(absoluteProgram.c_str(), commandLine.data(), nullptr, nullptr, FALSE,
-                        CREATE_NEW_PROCESS_GROUP, nullptr,
+                        CREATE_NEW_PROCESS_GROUP | CREATE_UNICODE_ENVIRONMENT,
+                        environmentBlock.empty() ? nullptr : environmentBlock.data(),
                         folder.empty() ? nullptr : folder.c_str(), &startup, &process)) {
         return Status::Fail("cannot run " + program.string() + ": " +
                             SystemMessage(GetLastError()));

@@ -11,6 +11,7 @@
 #include "engine/quick_load.h"
 #include "engine/run_summary.h"
 #include "platform/filesystem.h"
+#include "shell/game_finder.h"
 
 namespace kickvane::shell {
 
@@ -182,6 +183,7 @@ void MainWindow::buildCategoryPanel(QWidget* panel) {
     browse_ = new QPushButton(QStringLiteral("Đổi thư mục"), panel);
     browse_->setGeometry(226, 27, 86, 27);
     connect(browse_, &QPushButton::clicked, this, &MainWindow::browseGameFolder);
+    AddGameFinder(gameFolder_, browse_);
 
     for (const catalog::PatchCategory& category : catalog::Categories()) {
         const int i = category.switchIndex;

@@ -6,6 +6,7 @@
 
 #include <cerrno>
 
+#include "platform/filesystem.h"
 #include "platform/scoped_env.h"
 #include "platform/wait_until.h"
 #include "support/temp_dir.h"
@@ -101,6 +102,25 @@ TEST(FindOnPath, FindsExecutablesInPathFolders_NeverInTheCurrentFolder) {
         EXPECT_TRUE(FindOnPath(name).empty()) << name;
     }
     fs::current_path(previous);
+}
+
+TEST(StartDetached, EnvironmentAdditionsReplaceOrAddVariables_AndLeaveTheRestAlone) {
+    TempDir dir;
+    const ScopedEnv kept("KICKVANE_TEST_KEPT", "kept");
+    const ScopedEnv replaced("WINEPREFIX", "/old/prefix");
+    WriteExecutable(
+        dir / "env.sh",
+        "#!/bin/sh\n"
+        "printf '%s|%s|%s\\n' \"$KICKVANE_TEST_KEPT\" \"$WINEPREFIX\" \"$WINEARCH\" > r.tmp\n"
+        "mv r.tmp r.txt\n");
+    const Status started = StartDetached(dir / "env.sh", {}, dir.path(), false,
+                                         {{"WINEPREFIX", "/new prefix"}, {"WINEARCH", "win32"}});
+    ASSERT_TRUE(started.ok()) << started.reason();
+    ASSERT_TRUE(WaitUntil([&] { return fs::exists(dir / "r.txt"); }, std::chrono::seconds(30)));
+    EXPECT_EQ(ReadText(dir / "r.txt"), "kept|/new prefix|win32\n");
+    EXPECT_EQ(GetEnv("WINEPREFIX"), "/old/prefix");  // the tool's own environment is unchanged
+
+    EXPECT_FALSE(StartDetached(dir / "env.sh", {}, dir.path(), false, {{"A=B", "x"}}).ok());
 }
 
 }  // namespace

@@ -1,0 +1,34 @@
+#pragma once
+
+#include <atomic>
+#include <filesystem>
+#include <string>
+#include <vector>
+
+#include "engine/wine_prefix.h"
+
+namespace kickvane::engine {
+
+// A folder that holds the game's launcher, and how it was found.
+struct FoundGame {
+    fs::path folder;
+    fs::path prefix;     // the Wine prefix it lies in; empty when none
+    std::string source;  // e.g. "Lutris: FIFA Online 2 (~/.config/lutris/games/fifa.yml)"
+};
+
+struct FindOutcome {
+    std::vector<FoundGame> games;      // in the search order, each folder once
+    std::vector<std::string> looked;   // prefixes and configuration files looked at
+    std::vector<std::string> skipped;  // "file: reason" for what could not be read
+    bool cutShort = false;             // a prefix's search reached its limits
+    bool cancelled = false;
+};
+
+// Looks for "Gameloader.exe" where Linux players keep Windows games: $WINEPREFIX, ~/.wine, Lutris,
+// Bottles, Heroic, PlayOnLinux, Steam's prefixes, Wine's menu entries. In each prefix the install
+// folders that its registry records come first, then a bounded search of drive_c. Nothing is
+// written anywhere. `cancel`, when given, ends the search early.
+FindOutcome FindGame(const UserFolders& folders, const SearchLimits& limits,
+                     const std::atomic<bool>* cancel = nullptr);
+
+}  // namespace kickvane::engine

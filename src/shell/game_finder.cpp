@@ -1,0 +1,154 @@
+#include "shell/game_finder.h"
+
+#include <QApplication>
+#include <QDialog>
+#include <QDialogButtonBox>
+#include <QLabel>
+#include <QLineEdit>
+#include <QListWidget>
+#include <QMessageBox>
+#include <QVBoxLayout>
+#include <memory>
+
+namespace kickvane::shell {
+
+namespace {
+
+constexpr int kButtonWidth = 40;
+constexpr int kGap = 4;
+const QString kTitle = QStringLiteral("Tìm FIFA Online 2");
+
+QString FromStd(const std::string& text) {
+    return QString::fromStdString(text);
+}
+
+// The list of several finds; the chosen folder goes into the box.
+void OpenChoice(QWidget* owner, QLineEdit* box, const std::vector<engine::FoundGame>& games) {
+    auto* dialog = new QDialog(owner);
+    dialog->setAttribute(Qt::WA_DeleteOnClose);
+    dialog->setWindowTitle(kTitle);
+    auto* layout = new QVBoxLayout(dialog);
+    layout->addWidget(
+        new QLabel(QStringLiteral("Tìm thấy nhiều bản FIFA Online 2. Chọn một:"), dialog));
+    auto* list = new QListWidget(dialog);
+    list->setAccessibleName(QStringLiteral("Các thư mục tìm thấy"));
+    for (const engine::FoundGame& game : games) {
+        auto* item = new QListWidgetItem(FromStd(game.folder.string()) + QStringLiteral("\n    ") +
+                                         FromStd(game.source));
+        item->setData(Qt::UserRole, FromStd(game.folder.string()));
+        list->addItem(item);
+    }
+    list->setCurrentRow(0);
+    list->setMinimumWidth(520);
+    layout->addWidget(list);
+    auto* buttons = new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel, dialog);
+    buttons->button(QDialogButtonBox::Ok)->setText(QStringLiteral("Chọn"));
+    buttons->button(QDialogButtonBox::Cancel)->setText(QStringLiteral("Huỷ"));
+    layout->addWidget(buttons);
+    QObject::connect(buttons, &QDialogButtonBox::accepted, dialog, &QDialog::accept);
+    QObject::connect(buttons, &QDialogButtonBox::rejected, dialog, &QDialog::reject);
+    QObject::connect(list, &QListWidget::itemDoubleClicked, dialog, &QDialog::accept);
+    QObject::connect(dialog, &QDialog::accepted, box, [box, list] {
+        if (const QListWidgetItem* item = list->currentItem()) {
+            box->setText(item->data(Qt::UserRole).toString());
+        }
+    });
+    dialog->open();
+}
+
+void OpenNothingFound(QWidget* owner, const engine::FindOutcome& outcome) {
+    QString text = QStringLiteral("Không tìm thấy Gameloader.exe.\n\nĐã tìm trong:");
+    for (const std::string& place : outcome.looked) {
+        text += QStringLiteral("\n  ") + FromStd(place);
+    }
+    if (!outcome.skipped.empty()) {
+        text += QStringLiteral("\n\nBỏ qua (không đọc được):");
+        for (const std::string& skipped : outcome.skipped) {
+            text += QStringLiteral("\n  ") + FromStd(skipped);
+        }
+    }
+    auto* box = new QMessageBox(QMessageBox::Information, kTitle, text, QMessageBox::Ok, owner);
+    box->setAttribute(Qt::WA_DeleteOnClose);
+    box->open();
+}
+
+}  // namespace
+
+GameFinderButton::GameFinderButton(QLineEdit* gameFolderBox, engine::UserFolders folders,
+                                   engine::SearchLimits limits)
+    : QPushButton(QStringLiteral("Tìm"), gameFolderBox->parentWidget()),
+      gameFolderBox_(gameFolderBox),
+      folders_(std::move(folders)),
+      limits_(limits) {
+    setToolTip(
+        QStringLiteral("Tìm thư mục cài FIFA Online 2 trong Wine và các trình quản lý game"));
+    setAccessibleName(QStringLiteral("Tìm thư mục game"));
+    connect(this, &QPushButton::clicked, this, &GameFinderButton::start);
+}
+
+GameFinderButton::~GameFinderButton() {
+    const bool running = !finished_;
+    stopWorker();
+    if (running) {
+        QApplication::restoreOverrideCursor();
+    }
+}
+
+void GameFinderButton::stopWorker() {
+    cancel_ = true;
+    if (worker_.joinable()) {
+        worker_.join();
+    }
+}
+
+void GameFinderButton::start() {
+    if (searching()) {
+        return;
+    }
+    stopWorker();
+    cancel_ = false;
+    finished_ = false;
+    setEnabled(false);
+    setText(QStringLiteral("…"));
+    QApplication::setOverrideCursor(Qt::BusyCursor);
+    // The search reads folders that may be slow or huge; the window goes on meanwhile. Its
+    // result comes back to the window's thread through the event queue.
+    worker_ = std::thread([this, folders = folders_, limits = limits_] {
+        auto outcome =
+            std::make_shared<engine::FindOutcome>(engine::FindGame(folders, limits, &cancel_));
+        QMetaObject::invokeMethod(
+            this, [this, outcome] { finish(*outcome); }, Qt::QueuedConnection);
+    });
+}
+
+void GameFinderButton::finish(const engine::FindOutcome& outcome) {
+    finished_ = true;
+    if (worker_.joinable()) {
+        worker_.join();
+    }
+    QApplication::restoreOverrideCursor();
+    setText(QStringLiteral("Tìm"));
+    setEnabled(true);
+    if (outcome.games.size() == 1) {
+        gameFolderBox_->setText(FromStd(outcome.games.front().folder.string()));
+    } else if (outcome.games.size() > 1) {
+        OpenChoice(window(), gameFolderBox_, outcome.games);
+    } else {
+        OpenNothingFound(window(), outcome);
+    }
+    emit searchFinished();
+}
+
+GameFinderButton* AddGameFinder(QLineEdit* gameFolderBox, QPushButton* browseButton) {
+    auto* button = new GameFinderButton(gameFolderBox, engine::UserFolders::FromEnvironment());
+    QRect box = gameFolderBox->geometry();
+    box.setWidth(box.width() - kButtonWidth - kGap);
+    gameFolderBox->setGeometry(box);
+    button->setGeometry(box.right() + 1 + kGap, browseButton->y(), kButtonWidth,
+                        browseButton->height());
+    QWidget::setTabOrder(gameFolderBox, button);
+    QWidget::setTabOrder(button, browseButton);
+    return button;
+}
+
+}  // namespace kickvane::shell

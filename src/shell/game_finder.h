@@ -1,0 +1,46 @@
+#pragma once
+
+#include <QPushButton>
+#include <atomic>
+#include <thread>
+
+#include "engine/find_game.h"
+
+class QLineEdit;
+
+namespace kickvane::shell {
+
+// The "Tìm" button: looks for the game's launcher off the window's thread and fills the game
+// folder box with what it found (the user still saves). Several finds open a list to pick from,
+// none a message that says where it looked.
+class GameFinderButton final : public QPushButton {
+    Q_OBJECT
+public:
+    GameFinderButton(QLineEdit* gameFolderBox, engine::UserFolders folders,
+                     engine::SearchLimits limits = {});
+    ~GameFinderButton() override;
+
+    bool searching() const { return worker_.joinable() && !finished_; }
+
+signals:
+    // The search has ended and its result is shown (box filled, list or message opened).
+    void searchFinished();
+
+private:
+    void start();
+    void finish(const engine::FindOutcome& outcome);
+    void stopWorker();
+
+    QLineEdit* gameFolderBox_;
+    engine::UserFolders folders_;
+    engine::SearchLimits limits_;
+    std::thread worker_;
+    std::atomic<bool> cancel_{false};
+    bool finished_ = true;
+};
+
+// Puts a "Tìm" button between the game folder box and the change-folder button (the box gives
+// up the room) and returns it.
+GameFinderButton* AddGameFinder(QLineEdit* gameFolderBox, QPushButton* browseButton);
+
+}  // namespace kickvane::shell

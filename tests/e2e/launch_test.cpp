@@ -1,0 +1,163 @@
+// `kickvane launch` and `kickvane find-game` on a home of their own, with fake `wine`, `lutris`,
+// `bottles-cli` and `flatpak` programs on a PATH of their own that record how they were started.
+#include <gtest/gtest.h>
+#include <sys/wait.h>
+
+#include <cstdlib>
+
+#include "engine/fake_home.h"
+#include "platform/scoped_env.h"
+#include "support/process.h"
+#include "support/temp_dir.h"
+
+namespace kickvane::testing {
+namespace {
+
+struct Result {
+    int exitCode;
+    std::string out;
+    std::string err;
+};
+
+class LaunchTest : public ::testing::Test {
+protected:
+    LaunchTest()
+        : home_("HOME", home().string()),
+          path_("PATH", (dir_ / "bin").string() + ":/usr/bin:/bin"),
+          record_("KICKVANE_TEST_RECORD", (dir_ / "record.txt").string()),
+          prefix_("WINEPREFIX", std::nullopt),
+          xdgConfig_("XDG_CONFIG_HOME", std::nullopt),
+          xdgData_("XDG_DATA_HOME", std::nullopt) {
+        for (const char* name : {"wine", "lutris", "bottles-cli", "flatpak"}) {
+            Install(name);
+        }
+    }
+
+    fs::path home() const { return dir_ / "home"; }
+
+    // A fake program that writes its name, folder, Wine variables and arguments to the record.
+    void Install(const std::string& name) {
+        WriteProgram(
+            dir_ / "bin" / name,
+            "#!/bin/sh\n"
+            "{ echo \"program=$(basename \"$0\")\"; echo \"pwd=$(pwd)\";\n"
+            "  echo \"WINEPREFIX=${WINEPREFIX-unset}\"; echo \"WINEARCH=${WINEARCH-unset}\";\n"
+            "  for a in \"$@\"; do echo \"arg=$a\"; done; } > \"$KICKVANE_TEST_RECORD.tmp\"\n"
+            "mv \"$KICKVANE_TEST_RECORD.tmp\" \"$KICKVANE_TEST_RECORD\"\n");
+    }
+
+    Result Kickvane(const std::string& args) {
+        const std::string command = std::string("'") + KICKVANE_BINARY + "' " + args + " > '" +
+                                    (dir_ / "stdout").string() + "' 2> '" +
+                                    (dir_ / "stderr").string() + "' < /dev/null";
+        const int status = std::system(command.c_str());
+        return {WIFEXITED(status) ? WEXITSTATUS(status) : -1, ReadText(dir_ / "stdout"),
+                ReadText(dir_ / "stderr")};
+    }
+
+    // Runs `kickvane launch` for `gameFolder` and returns what the started program recorded.
+    std::string Launch(const fs::path& gameFolder, Result* result = nullptr) {
+        fs::remove(dir_ / "record.txt");
+        WriteFile(dir_ / "tool/ThietLap.ini",
+                  "[Thiet lap]\nDuongDan=" + gameFolder.string() + "\n");
+        const Result launched = Kickvane("launch --tool-folder '" + (dir_ / "tool").string() + "'");
+        if (result != nullptr) {
+            *result = launched;
+        }
+        EXPECT_EQ(launched.exitCode, 0) << launched.err;
+        if (launched.exitCode != 0 || !WaitFor([&] { return fs::exists(dir_ / "record.txt"); })) {
+            return {};
+        }
+        return ReadText(dir_ / "record.txt");
+    }
+
+    fs::path MakePrefix(const std::string& relative, const std::string& arch) {
+        const fs::path prefix = home() / relative;
+        fs::create_directories(prefix / "drive_c");
+        WriteFile(prefix / "system.reg", "WINE REGISTRY Version 2\n#arch=" + arch + "\n");
+        return prefix;
+    }
+
+    TempDir dir_;
+    ScopedEnv home_, path_, record_, prefix_, xdgConfig_, xdgData_;
+};
+
+TEST_F(LaunchTest, WineRunsTheLauncherInItsOwnPrefixAndFolder_AndSaysSo) {
+    const fs::path prefix = MakePrefix("Games/fo2", "win32");
+    WriteFile(prefix / "drive_c/FIFA Online 2/GameLoader.exe", "MZ");
+    Result result;
+    const std::string record = Launch(prefix / "drive_c/FIFA Online 2", &result);
+    EXPECT_EQ(record, "program=wine\npwd=" + (prefix / "drive_c/FIFA Online 2").string() +
+                          "\nWINEPREFIX=" + prefix.string() + "\nWINEARCH=win32\narg=" +
+                          (prefix / "drive_c/FIFA Online 2/GameLoader.exe").string() + "\n");
+    EXPECT_EQ(result.out, "started wine through Wine in prefix " + prefix.string() + " (win32)\n");
+}
+
+TEST_F(LaunchTest, ManagersStartTheirOwnGames_LutrisBottlesAndTheirFlatpaks) {
+    const fs::path lutrisPrefix = MakePrefix("Games/lutris-fifa", "win64");
+    const fs::path lutrisGame = lutrisPrefix / "drive_c/FIFA";
+    WriteFile(lutrisGame / "Gameloader.exe", "MZ");
+    WriteFile(home() / ".config/lutris/games/fifa-online-2-1700000000.yml",
+              "game:\n  exe: " + (lutrisGame / "Gameloader.exe").string() +
+                  "\n  prefix: " + lutrisPrefix.string() + "\n");
+    std::string record = Launch(lutrisGame);
+    EXPECT_NE(record.find("program=lutris\n"), std::string::npos) << record;
+    EXPECT_NE(record.find("arg=lutris:rungame/fifa-online-2\n"), std::string::npos) << record;
+    EXPECT_NE(record.find("WINEPREFIX=unset\n"), std::string::npos) << record;
+
+    const fs::path bottle = MakePrefix(".local/share/bottles/bottles/fifa", "win64");
+    WriteFile(bottle / "bottle.yml", "Name: fifa\n");
+    WriteFile(bottle / "drive_c/FO2/Gameloader.exe", "MZ");
+    record = Launch(bottle / "drive_c/FO2");
+    EXPECT_EQ(record,
+              "program=bottles-cli\npwd=" + (bottle / "drive_c/FO2").string() +
+                  "\nWINEPREFIX=unset\nWINEARCH=unset\narg=run\narg=-b\narg=fifa\narg=-e\narg=" +
+                  (bottle / "drive_c/FO2/Gameloader.exe").string() + "\n");
+
+    const fs::path flatpakBottle =
+        MakePrefix(".var/app/com.usebottles.bottles/data/bottles/bottles/fp", "win64");
+    WriteFile(flatpakBottle / "bottle.yml", "Name: fp\n");
+    WriteFile(flatpakBottle / "drive_c/FO2/Gameloader.exe", "MZ");
+    record = Launch(flatpakBottle / "drive_c/FO2");
+    EXPECT_NE(record.find("program=flatpak\n"), std::string::npos) << record;
+    EXPECT_NE(
+        record.find("arg=run\narg=--command=bottles-cli\narg=com.usebottles.bottles\narg=run\n"
+                    "arg=-b\narg=fp\n"),
+        std::string::npos)
+        << record;
+}
+
+TEST_F(LaunchTest, MissingLauncherOrWineFailsWithAReason) {
+    Result result;
+    WriteFile(dir_ / "tool/ThietLap.ini",
+              "[Thiet lap]\nDuongDan=" + (dir_ / "none").string() + "\n");
+    result = Kickvane("launch --tool-folder '" + (dir_ / "tool").string() + "'");
+    EXPECT_EQ(result.exitCode, 1);
+    EXPECT_NE(result.err.find("Gameloader.exe"), std::string::npos);
+
+    WriteFile(dir_ / "game/Gameloader.exe", "MZ");
+    fs::remove(dir_ / "bin/wine");
+    const ScopedEnv noSystemWine("PATH", (dir_ / "bin").string());
+    WriteFile(dir_ / "tool/ThietLap.ini",
+              "[Thiet lap]\nDuongDan=" + (dir_ / "game").string() + "\n");
+    result = Kickvane("launch --tool-folder '" + (dir_ / "tool").string() + "'");
+    EXPECT_EQ(result.exitCode, 1);
+    EXPECT_NE(result.err.find("Wine"), std::string::npos) << result.err;
+}
+
+TEST_F(LaunchTest, FindGameListsFoldersWithTheirSources_OrSaysWhereItLooked) {
+    Result result = Kickvane("find-game");
+    EXPECT_EQ(result.exitCode, 1);
+    EXPECT_NE(result.err.find("looked in:"), std::string::npos);
+    EXPECT_NE(result.err.find(".wine"), std::string::npos);
+
+    const fs::path prefix = MakePrefix(".PlayOnLinux/wineprefix/FO2", "win32");
+    WriteFile(prefix / "drive_c/Games/FIFA/gameloader.EXE", "MZ");
+    result = Kickvane("find-game");
+    EXPECT_EQ(result.exitCode, 0) << result.err;
+    EXPECT_EQ(result.out, (prefix / "drive_c/Games/FIFA").string() +
+                              "\tPlayOnLinux: FO2 (~/.PlayOnLinux/wineprefix/FO2), drive_c\n");
+}
+
+}  // namespace
+}  // namespace kickvane::testing

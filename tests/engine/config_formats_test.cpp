@@ -1,0 +1,156 @@
+#include "engine/config_formats.h"
+
+#include <gtest/gtest.h>
+
+namespace kickvane::engine {
+namespace {
+
+TEST(ParseYamlSubset, ReadsLutrisAndBottlesShapes_WithQuotesListsCommentsAndBlockText) {
+    const Parsed parsed = ParseYamlSubset(
+        "game:\n"
+        "  exe: /home/u/Games/fifa/drive_c/FIFA Online 2/Gameloader.exe  # the launcher\n"
+        "  prefix: '/home/u/Games/it''s here'\n"
+        "  args: \"-a \\\"b\\\" \\u00e9\"\n"
+        "system:\n"
+        "  env:\n"
+        "    DXVK_HUD: fps\n"
+        "script: |\n"
+        "  not: a key\n"
+        "  - nor an item\n"
+        "Name: fifa\n"
+        "External_Programs:\n"
+        "  6f0c:\n"
+        "    path: /b/Gameloader.exe\n"
+        "items:\n"
+        "- one\n"
+        "- name: two\n"
+        "  value: 2\n"
+        "url: http://x/#no-comment\n");
+    ASSERT_TRUE(parsed.ok()) << parsed.problem;
+    const FlatValues& v = parsed.values;
+    EXPECT_EQ(v.Find("game.exe"), "/home/u/Games/fifa/drive_c/FIFA Online 2/Gameloader.exe");
+    EXPECT_EQ(v.Find("game.prefix"), "/home/u/Games/it's here");
+    EXPECT_EQ(v.Find("game.args"), "-a \"b\" \xC3\xA9");
+    EXPECT_EQ(v.Find("system.env.DXVK_HUD"), "fps");
+    EXPECT_EQ(v.Find("Name"), "fifa");
+    EXPECT_EQ(v.Find("External_Programs.6f0c.path"), "/b/Gameloader.exe");
+    EXPECT_EQ(v.Find("items.0"), "one");
+    EXPECT_EQ(v.Find("items.1.name"), "two");
+    EXPECT_EQ(v.Find("items.1.value"), "2");
+    EXPECT_EQ(v.Find("url"), "http://x/#no-comment");
+    EXPECT_FALSE(v.Find("script.not"));
+    EXPECT_FALSE(v.Find("not"));
+}
+
+TEST(ParseYamlSubset, BinaryOrKeylessTextIsMalformed) {
+    EXPECT_FALSE(ParseYamlSubset(std::string("game:\n  exe: a\0b\n", 16)).ok());
+    EXPECT_FALSE(ParseYamlSubset("just some words\nand more\n").ok());
+    EXPECT_TRUE(ParseYamlSubset("").ok());
+}
+
+TEST(ParseJson, FlattensNestedValues_DecodesEscapes_AndRejectsBrokenOrTooDeepText) {
+    const Parsed parsed = ParseJson(
+        R"({"fifa": {"winePrefix": "/p/x", "wineVersion": {"bin": "/w/bin/wine", "type": "wine"},
+            "n": 12.5e1, "on": true, "off": false, "none": null},
+            "games": [{"app_name": "a\u00e9\ud83d\ude00", "t": "q\"\\/"}, []]})");
+    ASSERT_TRUE(parsed.ok()) << parsed.problem;
+    EXPECT_EQ(parsed.values.Find("fifa.winePrefix"), "/p/x");
+    EXPECT_EQ(parsed.values.Find("fifa.wineVersion.bin"), "/w/bin/wine");
+    EXPECT_EQ(parsed.values.Find("fifa.n"), "12.5e1");
+    EXPECT_EQ(parsed.values.Find("fifa.on"), "true");
+    EXPECT_FALSE(parsed.values.Find("fifa.none"));
+    EXPECT_EQ(parsed.values.Find("games.0.app_name"), "a\xC3\xA9\xF0\x9F\x98\x80");
+    EXPECT_EQ(parsed.values.Find("games.0.t"), "q\"\\/");
+
+    for (const std::string& broken :
+         {std::string("{\"a\": }"), std::string("{\"a\": \"unterminated}"), std::string("[1, 2"),
+          std::string("{} trailing"), std::string("{\"a\": \"\\u12\"}"), std::string(100, '['),
+          std::string("")}) {
+        EXPECT_FALSE(ParseJson(broken).ok()) << broken;
+    }
+}
+
+TEST(ParseVdf, ReadsLibraryPaths_AndRejectsUnbalancedText) {
+    const Parsed parsed = ParseVdf(
+        "\"libraryfolders\"\n{\n  \"0\"\n  {\n    \"path\"\t\t\"/home/u/.local/share/Steam\"\n"
+        "    \"apps\" { \"228980\" \"123\" }\n  }\n  // comment\n  \"1\" { \"path\" "
+        "\"/mnt/g\\\\s\" }\n}\n");
+    ASSERT_TRUE(parsed.ok()) << parsed.problem;
+    EXPECT_EQ(parsed.values.Find("libraryfolders.0.path"), "/home/u/.local/share/Steam");
+    EXPECT_EQ(parsed.values.Find("libraryfolders.0.apps.228980"), "123");
+    EXPECT_EQ(parsed.values.Find("libraryfolders.1.path"), "/mnt/g\\s");
+    EXPECT_FALSE(ParseVdf("\"a\" { \"b\" \"c\"").ok());
+    EXPECT_FALSE(ParseVdf("\"a\" } ").ok());
+    EXPECT_FALSE(ParseVdf("junk").ok());
+}
+
+TEST(ParseWineRegistry, ReadsWantedKeysOnly_WithEscapesContinuationsAndArch) {
+    const std::string text =
+        "WINE REGISTRY Version 2\n"
+        ";; All keys relative to \\\\Machine\n"
+        "#arch=win32\n"
+        "\n"
+        "[Software\\\\Microsoft\\\\Windows\\\\CurrentVersion\\\\Uninstall\\\\FIFA Online 2] "
+        "1700000000\n"
+        "#time=1d9\n"
+        "\"DisplayIcon\"=\"C:\\\\Games\\\\FIFA \\\"2\\\"\\\\Gameloader.exe,0\"\n"
+        "\"InstallLocation\"=str(2):\"D:\\\\Tr\\x00f2 ch\\x01a1i\\\\FIFA\"\n"
+        "\"Long\"=\"C:\\\\a very long value that Wine \\\n"
+        "  continues\\\\here\"\n"
+        "\"EstimatedSize\"=dword:00001000\n"
+        "\"Name\\u00e9\"=\"\\u1ea0\"\n"
+        "[Software\\\\Wow6432Node\\\\Microsoft\\\\Windows\\\\CurrentVersion\\\\Uninstall\\\\X] 1\n"
+        "\"InstallLocation\"=\"C:\\\\X\"\n"
+        "[Software\\\\Other] 1\n"
+        "\"InstallLocation\"=\"C:\\\\Not wanted\"\n";
+    const RegistryFile file = ParseWineRegistry(
+        text, {"Software\\Microsoft\\Windows\\CurrentVersion\\Uninstall\\",
+               "software\\wow6432node\\microsoft\\windows\\currentversion\\uninstall\\"});
+    ASSERT_TRUE(file.problem.empty());
+    EXPECT_EQ(file.arch, "win32");
+    ASSERT_EQ(file.values.size(), 5u);
+    EXPECT_EQ(file.values[0].key,
+              "Software\\Microsoft\\Windows\\CurrentVersion\\Uninstall\\FIFA Online 2");
+    EXPECT_EQ(file.values[0].value, "C:\\Games\\FIFA \"2\"\\Gameloader.exe,0");
+    EXPECT_EQ(file.values[1].name, "InstallLocation");
+    EXPECT_EQ(file.values[1].value, "D:\\Tr\xC3\xB2 ch\xC6\xA1i\\FIFA");
+    EXPECT_EQ(file.values[2].value, "C:\\a very long value that Wine continues\\here");
+    EXPECT_EQ(file.values[3].name, "Name\xC3\xA9");
+    EXPECT_EQ(file.values[3].value, "\xE1\xBA\xA0");
+    EXPECT_EQ(file.values[4].value, "C:\\X");
+
+    EXPECT_FALSE(ParseWineRegistry("REGEDIT4\n", {""}).problem.empty());
+    // A value cut off at the end of the file is dropped, not read past the end.
+    EXPECT_TRUE(
+        ParseWineRegistry("WINE REGISTRY Version 2\n[A] 1\n\"x\"=\"abc\\\n", {"A"}).values.empty());
+}
+
+TEST(DesktopEntryValue, ReadsTheMainGroupOnly) {
+    const std::string text =
+        "[Desktop Action x]\nExec=other\n[Desktop Entry]\nName=FIFA\n"
+        "Exec=env WINEPREFIX=\"/h/.wine\" wine C:\\\\x.lnk\n";
+    EXPECT_EQ(DesktopEntryValue(text, "Exec"), "env WINEPREFIX=\"/h/.wine\" wine C:\\\\x.lnk");
+    EXPECT_EQ(DesktopEntryValue(text, "Icon"), "");
+}
+
+// Files cut off anywhere (a manager writing them, a full disk) are read or refused, never read
+// past their end; the sanitizer build checks that.
+TEST(ConfigReaders, EveryTruncationOfAFileIsHandled) {
+    const std::string yaml = "game:\n  exe: \"a\\u00e9\"\n  prefix: 'b''c'\nlist:\n- x\n- k: v\n";
+    const std::string json = R"({"a": {"b": ["\ud83d\ude00", 1.5e3, true, null]}})";
+    const std::string vdf = "\"a\" { \"path\" \"x\\\\y\" } // c\n";
+    const std::string reg =
+        "WINE REGISTRY Version 2\n#arch=win64\n[Software\\\\X] 1\n\"A\"=\"\\x00e9\\u1ea0\\\n b\"\n";
+    for (size_t n = 0; n <= reg.size(); ++n) {
+        (void)ParseYamlSubset(yaml.substr(0, std::min(n, yaml.size())));
+        (void)ParseJson(json.substr(0, std::min(n, json.size())));
+        (void)ParseVdf(vdf.substr(0, std::min(n, vdf.size())));
+        (void)ParseWineRegistry(reg.substr(0, n), {"Software"});
+        (void)DesktopEntryValue(reg.substr(0, n), "A");
+    }
+    EXPECT_TRUE(ParseJson(json).ok());
+    EXPECT_FALSE(ParseJson(json.substr(0, json.size() - 1)).ok());
+}
+
+}  // namespace
+}  // namespace kickvane::engine

@@ -1,0 +1,193 @@
+#include "engine/launch_plan.h"
+
+#include <gtest/gtest.h>
+#include <sqlite3.h>
+
+#include "engine/fake_home.h"
+#include "engine/tool_folder.h"
+
+namespace kickvane::engine {
+namespace {
+
+namespace fs = std::filesystem;
+using testing::FakeHome;
+using testing::WriteFile;
+using Args = std::vector<std::string>;
+
+// Programs are "found" in a fake bin folder when the test says they are installed.
+struct Installed {
+    std::vector<std::string> names;
+    ProgramLookup lookup() const {
+        return [names = names](const std::string& name) {
+            for (const std::string& installed : names) {
+                if (installed == name) {
+                    return fs::path("/fake/bin") / name;
+                }
+            }
+            return fs::path();
+        };
+    }
+};
+
+void MakeLutrisDatabase(const fs::path& file, const std::string& configName) {
+    fs::create_directories(file.parent_path());
+    sqlite3* db = nullptr;
+    ASSERT_EQ(sqlite3_open(file.c_str(), &db), SQLITE_OK);
+    const std::string sql =
+        "CREATE TABLE games (id INTEGER PRIMARY KEY, name TEXT, slug TEXT, configpath TEXT);"
+        "INSERT INTO games VALUES (7, 'Other', 'other', 'other-1');"
+        "INSERT INTO games VALUES (42, 'FIFA Online 2', 'fifa-online-2', '" +
+        configName + "');";
+    ASSERT_EQ(sqlite3_exec(db, sql.c_str(), nullptr, nullptr, nullptr), SQLITE_OK);
+    sqlite3_close(db);
+}
+
+TEST(PlanLaunch, LutrisGameStartsThroughLutris_ByItsNumber_OrFlatpak_OrFallsBackToItsWine) {
+    FakeHome home;
+    const fs::path prefix = home.MakePrefix("Games/fifa");
+    const fs::path game = FakeHome::MakeGame(prefix / "drive_c/FIFA");
+    const std::string yml = "game:\n  exe: " + (game / "Gameloader.exe").string() +
+                            "\n  prefix: " + prefix.string() + "\nwine:\n  version: lutris-8\n";
+    WriteFile(home / ".config/lutris/games/fifa-online-2-1700.yml", yml);
+    MakeLutrisDatabase(home / ".local/share/lutris/pga.db", "fifa-online-2-1700");
+    testing::WriteProgram(home / ".local/share/lutris/runners/wine/lutris-8/bin/wine",
+                          "#!/bin/sh\n");
+
+    LaunchDecision decision =
+        PlanLaunch(game.string(), home.folders(), Installed{{"lutris", "wine"}}.lookup());
+    ASSERT_EQ(decision.problem, LaunchProblem::None);
+    EXPECT_EQ(decision.plan.program, "/fake/bin/lutris");
+    EXPECT_EQ(decision.plan.arguments, Args{"lutris:rungameid/42"});
+    EXPECT_EQ(decision.plan.workingFolder, game);
+    EXPECT_EQ(decision.plan.description, "Lutris: FIFA Online 2 (game 42)");
+
+    // Without Lutris installed: Wine in the prefix, with the Wine build Lutris keeps for it.
+    decision = PlanLaunch(game.string(), home.folders(), Installed{{"wine"}}.lookup());
+    EXPECT_EQ(decision.plan.program, home / ".local/share/lutris/runners/wine/lutris-8/bin/wine");
+    EXPECT_EQ(decision.plan.arguments, Args{(game / "Gameloader.exe").string()});
+
+    // The Flatpak build's files, without a database: started by the short name.
+    fs::remove_all(home / ".config/lutris");
+    WriteFile(home / ".var/app/net.lutris.Lutris/data/lutris/games/fifa-online-2-1700.yml", yml);
+    decision = PlanLaunch(game.string(), home.folders(),
+                          Installed{{"lutris", "flatpak", "wine"}}.lookup());
+    EXPECT_EQ(decision.plan.program, "/fake/bin/flatpak");
+    EXPECT_EQ(decision.plan.arguments,
+              (Args{"run", "net.lutris.Lutris", "lutris:rungame/fifa-online-2"}));
+}
+
+TEST(PlanLaunch, BottleThatHoldsTheGameStartsThroughBottlesCli_NativeOrFlatpak) {
+    FakeHome home;
+    const fs::path bottle = home.MakePrefix(".local/share/bottles/bottles/FIFA");
+    WriteFile(bottle / "bottle.yml", "Name: FIFA Bottle\nArch: win64\n");
+    const fs::path game =
+        FakeHome::MakeGame(bottle / "drive_c/Program Files/FO2", "gameLoader.exe");
+    const std::string launcher = (game / "gameLoader.exe").string();
+
+    LaunchDecision decision =
+        PlanLaunch(game.string(), home.folders(), Installed{{"bottles-cli", "wine"}}.lookup());
+    EXPECT_EQ(decision.plan.program, "/fake/bin/bottles-cli");
+    EXPECT_EQ(decision.plan.arguments, (Args{"run", "-b", "FIFA Bottle", "-e", launcher}));
+    EXPECT_TRUE(decision.plan.environment.empty());
+
+    fs::rename(home / ".local/share/bottles", home / "moved");
+    // The Flatpak's placeholder names where the bottle is kept now.
+    const fs::path moved = home / "moved/bottles/FIFA/drive_c/Program Files/FO2";
+    WriteFile(home / ".var/app/com.usebottles.bottles/data/bottles/bottles/FIFA/placeholder.yml",
+              "Path: " + (home / "moved/bottles/FIFA").string() + "\n");
+    decision = PlanLaunch(moved.string(), home.folders(), Installed{{"flatpak", "wine"}}.lookup());
+    EXPECT_EQ(decision.plan.program, "/fake/bin/flatpak");
+    EXPECT_EQ(decision.plan.arguments,
+              (Args{"run", "--command=bottles-cli", "com.usebottles.bottles", "run", "-b",
+                    "FIFA Bottle", "-e", (moved / "gameLoader.exe").string()}));
+}
+
+TEST(PlanLaunch, OtherwiseWineRunsInTheGamesOwnPrefix_WithItsArch) {
+    FakeHome home;
+    const fs::path prefix = home.MakePrefix("Games/fo2", "win32");
+    const fs::path game = FakeHome::MakeGame(prefix / "drive_c/FIFA");
+    const ProgramLookup wineOnly = Installed{{"wine", "lutris", "bottles-cli"}}.lookup();
+
+    LaunchDecision decision = PlanLaunch(game.string(), home.folders(), wineOnly);
+    ASSERT_EQ(decision.problem, LaunchProblem::None);
+    EXPECT_EQ(decision.plan.program, "/fake/bin/wine");
+    EXPECT_EQ(decision.plan.environment,
+              (platform::EnvironmentAdditions{{"WINEPREFIX", fs::canonical(prefix).string()},
+                                              {"WINEARCH", "win32"}}));
+    EXPECT_EQ(decision.plan.workingFolder, game);
+
+    // A game folder on a drive that a prefix maps, outside the prefix itself.
+    const fs::path wine = home.MakePrefix(".wine", "win64");
+    const fs::path outside = FakeHome::MakeGame(home / "disk/FIFA");
+    fs::create_directory_symlink(home / "disk", wine / "dosdevices/d:");
+    decision = PlanLaunch(outside.string(), home.folders(), wineOnly);
+    EXPECT_EQ(
+        decision.plan.environment,
+        (platform::EnvironmentAdditions{{"WINEPREFIX", wine.string()}, {"WINEARCH", "win64"}}));
+    EXPECT_EQ(decision.plan.description, "Wine in prefix " + wine.string() + " (win64)");
+}
+
+TEST(PlanLaunch, MissingLauncherOrWineIsSaid_AndANativeLauncherRunsDirectly) {
+    FakeHome home;
+    const fs::path game = FakeHome::MakeGame(home / "game");
+    EXPECT_EQ(
+        PlanLaunch((home / "empty").string(), home.folders(), Installed{{"wine"}}.lookup()).problem,
+        LaunchProblem::LauncherMissing);
+    EXPECT_EQ(PlanLaunch(game.string(), home.folders(), Installed{}.lookup()).problem,
+              LaunchProblem::WineMissing);
+    const LaunchDecision outside =
+        PlanLaunch(game.string(), home.folders(), Installed{{"wine"}}.lookup());
+    EXPECT_TRUE(outside.plan.environment.empty());
+    EXPECT_EQ(outside.plan.description, "Wine in the prefix of the environment");
+
+    testing::WriteProgram(game / "Gameloader.exe", "#!/bin/sh\n");
+    const LaunchDecision native = PlanLaunch(game.string(), home.folders(), Installed{}.lookup());
+    EXPECT_EQ(native.plan.program, game / "Gameloader.exe");
+    EXPECT_EQ(native.plan.description, "directly");
+}
+
+TEST(ToolFolder, PortableWhenWritable_ElseUserFolderSeededOnceWithoutOverwriting) {
+    FakeHome home;
+    const fs::path portable = home / "portable";
+    WriteFile(portable / "data/data2/ball/ball.dds", "ball");
+    WriteFile(portable / "sound.wav", "RIFF");
+    const fs::path user = home / ".local/share";
+    auto writable = [](const fs::path&) { return true; };
+    auto readOnly = [](const fs::path&) { return false; };
+    EXPECT_EQ(ChooseToolFolder(portable, user, writable).folder, portable);
+    EXPECT_TRUE(ChooseToolFolder(portable, user, writable).seedFrom.empty());
+    EXPECT_EQ(ChooseToolFolder(portable, user, readOnly).folder, user / "kickvane");
+    EXPECT_EQ(ChooseToolFolder(portable, user, readOnly).seedFrom, portable);
+
+    // A system install: the program in bin/, its sets in share/kickvane.
+    const fs::path installed = home / "usr/share/kickvane";
+    WriteFile(installed / "data/data2/ball/ball.dds", "ball");
+    WriteFile(installed / "skin/skin1/a.jpg", "skin");
+    WriteFile(installed / "sound.wav", "RIFF");
+    fs::create_directories(home / "usr/bin");
+    const ToolFolderChoice system = ChooseToolFolder(home / "usr/bin", user, writable);
+    EXPECT_EQ(system.folder, user / "kickvane");
+    EXPECT_EQ(system.seedFrom, installed);
+    // Neither layout: the program's own folder, as before.
+    EXPECT_EQ(ChooseToolFolder(home / "bare", user).folder, home / "bare");
+
+    // The user changed a file before the first seeding ended; it is kept. Once seeded, nothing
+    // is copied again, not even files the user removed.
+    WriteFile(user / "kickvane/sound.wav", "mine");
+    ASSERT_TRUE(SeedToolFolder(installed, user / "kickvane").ok());
+    EXPECT_EQ(testing::ReadText(user / "kickvane/data/data2/ball/ball.dds"), "ball");
+    EXPECT_EQ(testing::ReadText(user / "kickvane/skin/skin1/a.jpg"), "skin");
+    EXPECT_EQ(testing::ReadText(user / "kickvane/sound.wav"), "mine");
+    fs::remove(user / "kickvane/skin/skin1/a.jpg");
+    WriteFile(installed / "data/data2/ball/ball.dds", "new ball");
+    ASSERT_TRUE(SeedToolFolder(installed, user / "kickvane").ok());
+    EXPECT_FALSE(fs::exists(user / "kickvane/skin/skin1/a.jpg"));
+    EXPECT_EQ(testing::ReadText(user / "kickvane/data/data2/ball/ball.dds"), "ball");
+
+    // A folder that cannot be created is a failure with a reason.
+    WriteFile(home / "file", "x");
+    EXPECT_FALSE(SeedToolFolder(installed, home / "file/kickvane").ok());
+}
+
+}  // namespace
+}  // namespace kickvane::engine

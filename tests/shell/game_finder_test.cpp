@@ -1,0 +1,127 @@
+#include "shell/game_finder.h"
+
+#include <gtest/gtest.h>
+
+#include <QApplication>
+#include <QDialog>
+#include <QLineEdit>
+#include <QListWidget>
+#include <QMessageBox>
+#include <QSignalSpy>
+#include <QTest>
+
+#include "support/temp_dir.h"
+
+namespace kickvane::shell {
+namespace {
+
+namespace fs = std::filesystem;
+using testing::TempDir;
+using testing::WriteFile;
+
+// A panel with the game folder box and the change-folder button as the window lays them out,
+// and a home folder of its own.
+class GameFinderTest : public ::testing::Test {
+protected:
+    GameFinderTest() {
+        panel_.resize(321, 357);
+        box_ = new QLineEdit(&panel_);
+        box_->setGeometry(10, 28, 212, 25);
+        browse_ = new QPushButton(QStringLiteral("Đổi thư mục"), &panel_);
+        browse_->setGeometry(226, 27, 86, 27);
+    }
+
+    engine::UserFolders folders() const {
+        return {dir_ / "home", dir_ / "home/.config", dir_ / "home/.local/share", {}};
+    }
+
+    fs::path AddGame(const std::string& prefix) {
+        WriteFile(dir_ / "home" / prefix / "system.reg", "WINE REGISTRY Version 2\n");
+        WriteFile(dir_ / "home" / prefix / "drive_c/FIFA/Gameloader.exe", "MZ");
+        return dir_ / "home" / prefix / "drive_c/FIFA";
+    }
+
+    // Clicks the button and waits for the search's result on the window's thread.
+    void Search(GameFinderButton& button) {
+        QSignalSpy finished(&button, &GameFinderButton::searchFinished);
+        QTest::mouseClick(&button, Qt::LeftButton);
+        // Meanwhile the window goes on: the button waits, the pointer says so.
+        EXPECT_FALSE(button.isEnabled());
+        EXPECT_NE(QApplication::overrideCursor(), nullptr);
+        ASSERT_TRUE(finished.wait(20000));
+        EXPECT_TRUE(button.isEnabled());
+        EXPECT_EQ(QApplication::overrideCursor(), nullptr);
+    }
+
+    template <typename T>
+    T* OpenDialog() {
+        QApplication::processEvents();
+        for (QWidget* widget : QApplication::topLevelWidgets()) {
+            if (auto* dialog = qobject_cast<T*>(widget); dialog != nullptr && dialog->isVisible()) {
+                return dialog;
+            }
+        }
+        return nullptr;
+    }
+
+    TempDir dir_;
+    QWidget panel_;
+    QLineEdit* box_;
+    QPushButton* browse_;
+};
+
+TEST_F(GameFinderTest, SitsBetweenTheBoxAndTheChangeFolderButton) {
+    GameFinderButton* button = AddGameFinder(box_, browse_);
+    EXPECT_EQ(button->text(), QStringLiteral("Tìm"));
+    EXPECT_EQ(button->parentWidget(), &panel_);
+    EXPECT_LT(box_->geometry().right(), button->geometry().left());
+    EXPECT_LT(button->geometry().right(), browse_->geometry().left());
+    EXPECT_EQ(button->geometry().top(), browse_->geometry().top());
+    EXPECT_EQ(box_->x(), 10);
+}
+
+TEST_F(GameFinderTest, OneFindFillsTheBox_SeveralOpenAListWithSources_NoneSaysWhereItLooked) {
+    GameFinderButton button(box_, folders());
+
+    Search(button);
+    auto* message = OpenDialog<QMessageBox>();
+    ASSERT_NE(message, nullptr);
+    EXPECT_TRUE(message->text().contains(QStringLiteral("Đã tìm trong")));
+    EXPECT_TRUE(message->text().contains(QStringLiteral(".wine")));
+    message->close();
+    EXPECT_TRUE(box_->text().isEmpty());
+
+    const fs::path first = AddGame(".wine");
+    Search(button);
+    EXPECT_EQ(box_->text().toStdString(), fs::canonical(first).string());
+
+    const fs::path second = AddGame(".PlayOnLinux/wineprefix/FO2");
+    box_->clear();
+    Search(button);
+    EXPECT_TRUE(box_->text().isEmpty());  // nothing chosen yet
+    auto* dialog = OpenDialog<QDialog>();
+    ASSERT_NE(dialog, nullptr);
+    auto* list = dialog->findChild<QListWidget*>();
+    ASSERT_NE(list, nullptr);
+    ASSERT_EQ(list->count(), 2);
+    EXPECT_TRUE(list->item(1)->text().contains(QStringLiteral("PlayOnLinux: FO2")));
+    list->setCurrentRow(1);
+    dialog->accept();
+    EXPECT_EQ(box_->text().toStdString(), fs::canonical(second).string());
+}
+
+TEST_F(GameFinderTest, ClosingTheWindowDuringASearchEndsItCleanly) {
+    for (int i = 0; i < 200; ++i) {
+        WriteFile(dir_ / "home/.wine/drive_c/d" / std::to_string(i) / "f.txt", "x");
+    }
+    AddGame(".wine");
+    auto* button = new GameFinderButton(box_, folders());
+    QTest::mouseClick(button, Qt::LeftButton);
+    delete button;  // stops and joins the search; its late result is dropped
+    QApplication::processEvents();
+    EXPECT_EQ(QApplication::overrideCursor(), nullptr);
+    EXPECT_TRUE(box_->text().isEmpty());
+}
+
+}  // namespace
+}  // namespace kickvane::shell
