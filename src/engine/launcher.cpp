@@ -3,16 +3,25 @@
 #include "engine/file_ops.h"
 #include "platform/filesystem.h"
 #include "platform/process.h"
+#include "text/vni.h"
 
 namespace kickvane::engine {
 
-LaunchResult LaunchGame(std::string_view gameFolder, EngineUi& ui) {
+namespace {
+
+LaunchOutcome NotStarted(LaunchResult result, std::string text) {
+    return {result, text::Message{text::Message::Kind::Component, std::move(text), {}}};
+}
+
+}  // namespace
+
+LaunchOutcome LaunchGame(std::string_view gameFolder) {
     const std::string folderText(gameFolder);
     const std::filesystem::path launcher = platform::ResolveCaseInsensitive(
         platform::NativePathFromUserText(folderText + "\\Gameloader.exe"));
     if (!FileExists(launcher)) {
-        ui.Messages().ShowText(ui.Messages().ConvertText(kLauncherMissingVni));
-        return LaunchResult::LauncherMissing;
+        return NotStarted(LaunchResult::LauncherMissing,
+                          text::VniToUnicodeUtf8(kLauncherMissingVni));
     }
     const std::filesystem::path workingFolder =
         platform::ResolveCaseInsensitive(platform::NativePathFromUserText(folderText));
@@ -23,16 +32,15 @@ LaunchResult LaunchGame(std::string_view gameFolder, EngineUi& ui) {
     } else {
         const std::filesystem::path wine = platform::FindOnPath("wine");
         if (wine.empty()) {
-            ui.Messages().ShowText(kWineMissingText);
-            return LaunchResult::WineMissing;
+            return NotStarted(LaunchResult::WineMissing, std::string(kWineMissingText));
         }
         started = platform::StartDetached(wine, {launcher.string()}, workingFolder, true);
     }
     if (!started) {
-        ui.Messages().ShowText(std::string(kStartFailedText) + started.reason());
-        return LaunchResult::StartFailed;
+        return NotStarted(LaunchResult::StartFailed,
+                          std::string(kStartFailedText) + started.reason());
     }
-    return LaunchResult::Started;
+    return {};
 }
 
 }  // namespace kickvane::engine

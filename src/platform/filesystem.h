@@ -7,16 +7,13 @@
 #include <vector>
 
 #include "platform/status.h"
+#include "platform/text.h"
 
 // File system operations of the core. The game's folders follow Windows rules (letter case does
 // not matter), so on a case-sensitive file system every lookup goes through ResolveCaseInsensitive.
 namespace kickvane::platform {
 
 namespace fs = std::filesystem;
-
-// ASCII letters compared without regard to case, as Windows compares file names.
-bool NamesEqualIgnoringCase(std::string_view a, std::string_view b);
-std::string FoldCase(std::string_view name);
 
 // Returns `path` with every component that does not exist in its exact spelling replaced by an
 // existing entry of its parent that differs only in letter case. Components below the first one

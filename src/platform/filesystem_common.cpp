@@ -8,26 +8,6 @@
 
 namespace kickvane::platform {
 
-namespace {
-
-char FoldChar(char c) {
-    return (c >= 'A' && c <= 'Z') ? static_cast<char>(c - 'A' + 'a') : c;
-}
-
-}  // namespace
-
-bool NamesEqualIgnoringCase(std::string_view a, std::string_view b) {
-    return a.size() == b.size() && std::equal(a.begin(), a.end(), b.begin(), [](char x, char y) {
-               return FoldChar(x) == FoldChar(y);
-           });
-}
-
-std::string FoldCase(std::string_view name) {
-    std::string folded(name);
-    std::transform(folded.begin(), folded.end(), folded.begin(), FoldChar);
-    return folded;
-}
-
 std::optional<fs::path> FindEntryIgnoringCase(const fs::path& folder, std::string_view name) {
     std::error_code ec;
     fs::path exact = folder / fs::path(std::string(name));
