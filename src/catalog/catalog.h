@@ -25,6 +25,9 @@ struct PatchOption {
     std::string_view label;  // shown beside the option button
     int index;               // index in the group's option array (and label array)
     bool isDefault;
+    // The variant's set below the tool's "extras" folder ("\Ball\UCL 2011"); empty for the
+    // option that restores the base set.
+    std::string_view sourceFolder = {};
 };
 
 struct VariantGroup {
