@@ -187,7 +187,7 @@ TEST_F(ShellPartsTest, PopupWindowFollowsItsModelAndClosesWhenItFinishes) {
     for (int i = 0; i < 5; ++i) {
         popup->Tick();
     }
-    const text::PixelRect rect = popup->model().WindowPixels();
+    const popup::PixelRect rect = popup->model().WindowPixels();
     EXPECT_EQ(popup->geometry(), QRect(rect.left, rect.top, rect.width, rect.height));
     // Rising, resting, leaving: it closes and deletes itself at the end.
     for (int i = 0; i < 2000 && popup && popup->isVisible(); ++i) {
