@@ -4,6 +4,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <unordered_map>
 #include <vector>
 
 #include "platform/status.h"
@@ -20,7 +21,12 @@ namespace fs = std::filesystem;
 // that exists in no spelling keep the spelling given. Identity on case-insensitive systems.
 fs::path ResolveCaseInsensitive(const fs::path& path);
 
+// The entries of `folder` by their case-folded name. Where several differ only in letter case,
+// the first in name order stands for them all, whatever order the folder lists them in.
+std::unordered_map<std::string, std::string> EntriesByFoldedName(const fs::path& folder);
+
 // Finds the entry of `folder` named `name` in any letter case; nullopt when there is none.
+// The exact spelling wins, else the first in name order.
 std::optional<fs::path> FindEntryIgnoringCase(const fs::path& folder, std::string_view name);
 
 bool IsDirectory(const fs::path& path);

@@ -96,7 +96,7 @@ TEST(Settings, FailedSaveIsReported) {
     EXPECT_FALSE(SaveSettings(tool.path(), Settings{}).ok());
 }
 
-TEST(Settings, ValueParsing) {
+TEST(Settings, NumbersRoundHalvesToEvenAndTruthValuesIgnoreLetterCase) {
     const std::pair<const char*, std::optional<int>> numbers[] = {
         {" 1 ", 1}, {"-3", -3}, {"1.5", 2}, {"2.5", 2}, {"abc", {}}, {"", {}}, {"1e99", {}}};
     for (const auto& [text, value] : numbers) {
