@@ -92,10 +92,10 @@ PatchSelection EverythingOn() {
     for (int i = 0; i < kickvane::catalog::kCategoryCount; ++i) {
         selection.setSwitchValue(i, 1);
     }
-    selection.setOptionValue(OptionArray::UniOption, 3, true);
-    selection.setOptionValue(OptionArray::UniOption1, 3, true);
-    selection.setOptionValue(OptionArray::UniOption1, 5, true);
-    selection.setOptionValue(OptionArray::UniOption3, 2, true);
+    selection.setOptionValue(OptionArray::Ball, 3, true);
+    selection.setOptionValue(OptionArray::Other, 3, true);
+    selection.setOptionValue(OptionArray::Other, 5, true);
+    selection.setOptionValue(OptionArray::Scoreboard, 2, true);
     return selection;
 }
 

@@ -43,7 +43,7 @@ constexpr std::array<PatchOption, 8> kScoreboard{{
     {"SSUCLRed", "Supa Strikas UCL Red", 7, false, "\\scoreboard\\SupaStrikas UCL Red"},
 }};
 
-// Adboard, pitch and mark share the option array UniOption1 (indices 0-10) and section "Khac".
+// Adboard, pitch and mark share the row of the "Khác" tab (indices 0-10) and section "Khac".
 constexpr std::array<PatchOption, 4> kAdboard{{
     {"QcaoMacDinh", "Quảng cáo mặc định", 0, true},
     {"QcaoUCL", "Quảng cáo UCL", 1, false, "\\adboard\\UCL"},
@@ -65,12 +65,12 @@ constexpr std::array<PatchOption, 3> kMark{{
 }};
 
 constexpr std::array<VariantGroup, kGroupCount> kGroups{{
-    {GroupId::Ball, 0, "Bong", OptionArray::UniOption, LabelArray::UniLabel1, 1, 0, kBall},
-    {GroupId::Scoreboard, 10, "Bang Ti So", OptionArray::UniOption3, LabelArray::UniLabel2, 2, 1,
+    {GroupId::Ball, 0, "Bong", OptionArray::Ball, LabelArray::Ball, 1, 0, kBall},
+    {GroupId::Scoreboard, 10, "Bang Ti So", OptionArray::Scoreboard, LabelArray::Scoreboard, 2, 1,
      kScoreboard},
-    {GroupId::Adboard, 2, "Khac", OptionArray::UniOption1, LabelArray::UniLabel3, 3, 2, kAdboard},
-    {GroupId::Pitch, 1, "Khac", OptionArray::UniOption1, LabelArray::UniLabel3, 3, 3, kPitch},
-    {GroupId::Mark, 11, "Khac", OptionArray::UniOption1, LabelArray::UniLabel3, 3, 4, kMark},
+    {GroupId::Adboard, 2, "Khac", OptionArray::Other, LabelArray::Other, 3, 2, kAdboard},
+    {GroupId::Pitch, 1, "Khac", OptionArray::Other, LabelArray::Other, 3, 3, kPitch},
+    {GroupId::Mark, 11, "Khac", OptionArray::Other, LabelArray::Other, 3, 4, kMark},
 }};
 
 }  // namespace

@@ -93,7 +93,7 @@ void CatalogPanels::buildCategoryPanel(QWidget* panel) {
 
         auto* label = MakeLabel(category.label, panel, QRect(x + 22, y, 128, 24));
         connect(label, &ClickableLabel::clicked, this,
-                [this, i] { emit labelClicked(catalog::LabelArray::UniLabel, i); });
+                [this, i] { emit labelClicked(catalog::LabelArray::Category, i); });
         categoryLabels_[static_cast<size_t>(i)] = label;
     }
 }

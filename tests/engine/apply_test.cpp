@@ -107,7 +107,7 @@ TEST_F(ApplyTest, FailedStepsAreListedWithAReasonAndTheRunGoesOn) {
     PatchSelection selection = PatchSelection::Defaults();
     selection.setSwitchValue(12, 1);
     selection.setSwitchValue(13, 1);
-    selection.setOptionValue(OptionArray::UniOption1, 5, true);  // pitch Caro
+    selection.setOptionValue(OptionArray::Other, 5, true);  // pitch Caro
     const ApplyOutcome outcome = Apply(selection);
 
     ASSERT_FALSE(outcome.stopped());
@@ -123,7 +123,7 @@ TEST_F(ApplyTest, FailedStepsAreListedWithAReasonAndTheRunGoesOn) {
 
 TEST_F(ApplyTest, PitchVariantEndsWithTheBaseSetsDirtAndLines) {
     PatchSelection selection = Only({1});
-    selection.setOptionValue(OptionArray::UniOption1, 5, true);
+    selection.setOptionValue(OptionArray::Other, 5, true);
     // A trailing separator on the game folder names the same folders.
     EXPECT_TRUE(Apply(selection, "/").Failures().empty());
     const fs::path textures = game() / "data2/pitch/textures";

@@ -98,7 +98,7 @@ TEST_F(SessionTest, SaveConfirmsWithThePopupOrWarnsWithTheReason) {
     auto session = Open();
     session->setGameFolder("D:\\FO2");
     session->setCategoryOn(12, true);
-    session->chooseOption(catalog::OptionArray::UniOption1, 9);
+    session->chooseOption(catalog::OptionArray::Other, 9);
     const Outcome saved = session->Save();
     EXPECT_EQ(saved.popup, (Popup{"Đã lưu thiết lập!", 2}));
     const catalog::Settings reread = catalog::LoadSettings(tool());

@@ -70,12 +70,12 @@ TEST_F(MainWindowTest, OptionButtonsFollowTheContainerRule) {
     auto window = Open();
     CatalogPanels& panels = window->panels();
     Click(panels.tabHead(3));
-    Click(panels.optionButton(OptionArray::UniOption1, 5));
-    EXPECT_FALSE(panels.optionButton(OptionArray::UniOption1, 4)->isChecked());
-    EXPECT_TRUE(panels.optionButton(OptionArray::UniOption1, 0)->isChecked());
+    Click(panels.optionButton(OptionArray::Other, 5));
+    EXPECT_FALSE(panels.optionButton(OptionArray::Other, 4)->isChecked());
+    EXPECT_TRUE(panels.optionButton(OptionArray::Other, 0)->isChecked());
     // Clicking the chosen button again keeps it chosen.
-    Click(panels.optionButton(OptionArray::UniOption1, 5));
-    EXPECT_TRUE(panels.optionButton(OptionArray::UniOption1, 5)->isChecked());
+    Click(panels.optionButton(OptionArray::Other, 5));
+    EXPECT_TRUE(panels.optionButton(OptionArray::Other, 5)->isChecked());
     EXPECT_EQ(window->session().selection().chosen(GroupId::Pitch), 5);
 }
 
@@ -89,11 +89,11 @@ TEST_F(MainWindowTest, SettingsLoadIntoTheWidgetsAndSaveRoundTrips) {
         EXPECT_EQ(panels.gameFolderBox()->text(), "D:\\Games\\FO2");
         EXPECT_EQ(window->buttons().hotkeyBox()->currentText(), "F10");
         EXPECT_EQ(panels.categoryCheck(3)->checkState(), Qt::PartiallyChecked);
-        EXPECT_TRUE(panels.optionButton(OptionArray::UniOption, 3)->isChecked());
+        EXPECT_TRUE(panels.optionButton(OptionArray::Ball, 3)->isChecked());
 
         Click(panels.categoryCheck(0));
         Click(panels.tabHead(2));
-        Click(panels.optionButton(OptionArray::UniOption3, 6));
+        Click(panels.optionButton(OptionArray::Scoreboard, 6));
         panels.gameFolderBox()->setText("/home/player/FIFA Online 2");
         window->buttons().hotkeyBox()->setCurrentText("F2");
         Click(window->buttons().save());
@@ -201,7 +201,7 @@ TEST_F(MainWindowTest, EveryButtonHasAMnemonicAndEveryEntryAnAccessibleName) {
         }
     }
     EXPECT_EQ(window->panels().categoryCheck(12)->accessibleName(), "Thay đổi Cổ động viên");
-    EXPECT_EQ(window->panels().optionButton(OptionArray::UniOption3, 4)->accessibleName(),
+    EXPECT_EQ(window->panels().optionButton(OptionArray::Scoreboard, 4)->accessibleName(),
               "K+ Nhịp sống");
 }
 

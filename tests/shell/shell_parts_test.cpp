@@ -121,7 +121,7 @@ TEST_F(ShellPartsTest, SkinsRecolourTheEntriesAndUseTheirPicturesKeepingTheTab) 
     auto window = Show();
     CatalogPanels& panels = window->panels();
     const auto labelColour = [&] {
-        return panels.optionLabel(catalog::OptionArray::UniOption1, 10)
+        return panels.optionLabel(catalog::OptionArray::Other, 10)
             ->palette()
             .color(QPalette::WindowText);
     };
@@ -154,16 +154,16 @@ TEST_F(ShellPartsTest, LabelClicksShowTheirPreviewInOneSharedWindow) {
     ASSERT_NE(preview, nullptr);
     EXPECT_TRUE(preview->pictureFile().endsWith("img/t1_img_12.jpg"));
     Click(panels.tabHead(1));
-    Click(panels.optionLabel(catalog::OptionArray::UniOption, 3));
+    Click(panels.optionLabel(catalog::OptionArray::Ball, 3));
     EXPECT_EQ(window->sideWindows().preview(), preview);
     EXPECT_TRUE(preview->pictureFile().endsWith("img/t2_img_3.jpg"));
     EXPECT_EQ(preview->windowTitle(), "Xem truoc");
 
     Click(panels.tabHead(3));
-    Click(panels.optionLabel(catalog::OptionArray::UniOption1, 10));
+    Click(panels.optionLabel(catalog::OptionArray::Other, 10));
     EXPECT_TRUE(preview->pictureFile().endsWith("img/t4_img_10.jpg"));
     // No t4_img_9.jpg: the window keeps the picture it shows.
-    Click(panels.optionLabel(catalog::OptionArray::UniOption1, 9));
+    Click(panels.optionLabel(catalog::OptionArray::Other, 9));
     EXPECT_TRUE(preview->pictureFile().endsWith("img/t4_img_10.jpg"));
     EXPECT_TRUE(preview->isVisible());
 }
@@ -227,7 +227,7 @@ TEST_F(ShellPartsTest, HeaderButtonsLeaveTheBannerTitleVisibleInBothSkins) {
         SavePicture(*window, QStringLiteral("window-%1.png").arg(look.name));
     }
     Click(window->panels().tabHead(1));
-    Click(window->panels().optionLabel(catalog::OptionArray::UniOption, 3));
+    Click(window->panels().optionLabel(catalog::OptionArray::Ball, 3));
     ASSERT_NE(window->sideWindows().preview(), nullptr);
     EXPECT_FALSE(window->sideWindows().preview()->pictureFile().isEmpty());
     SavePicture(*window->sideWindows().preview(), "preview-ball-3.png");
