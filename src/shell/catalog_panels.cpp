@@ -2,6 +2,7 @@
 
 #include <QLabel>
 
+#include "platform/text.h"
 #include "shell/qt_text.h"
 #include "shell/skins.h"
 
@@ -83,7 +84,7 @@ void CatalogPanels::buildCategoryPanel(QWidget* panel) {
         const int y = 68 + (i % 7) * 40;
         auto* check = new QCheckBox(panel);
         check->setGeometry(x, y + 2, 20, 20);
-        check->setAccessibleName(ToQString(category.label).trimmed());
+        check->setAccessibleName(ToQString(platform::TrimBlanks(category.label)));
         Paint(check, kEntryBackground);
         connect(check, &QCheckBox::clicked, this, [this, check, i](bool checked) {
             check->setTristate(false);

@@ -55,24 +55,10 @@ public:
     // One tick of the hotkey poll.
     void pollHotkey();
 
-    void saveSettings();
-    void launchGame(session::LaunchFrom from);
-    void quickLoad();
-    void browseGameFolder();
     void applySkin(const SkinLook& look);
-
-    // Starts a fade of the window's opacity towards `target` by `step` every 20 ms.
-    void startFade(int target, int step);
     // Sets the window's opacity at once; the fade goes on from where it stood.
     TranslucentResult makeTranslucent(int alpha);
     void fadeTick();
-
-    // "Chạy ẩn": fades towards 150, hides to the tray and says so.
-    void runHidden();
-    // "Hiện chương trình": shows the window and fades it in.
-    void showFromTray();
-    // "Thoát": the tray icon goes first, then the program ends.
-    void exitFromTray();
 
 signals:
     // The user chose to end the program from the tray menu.
@@ -85,6 +71,19 @@ protected:
     void closeEvent(QCloseEvent* event) override;
 
 private:
+    void saveSettings();
+    void launchGame(session::LaunchFrom from);
+    void quickLoad();
+    void browseGameFolder();
+    // Starts a fade of the window's opacity towards `target` by `step` every 20 ms.
+    void startFade(int target, int step);
+    // "Chạy ẩn": fades towards 150, hides to the tray and says so.
+    void runHidden();
+    // "Hiện chương trình": shows the window and fades it in.
+    void showFromTray();
+    // "Thoát": the tray icon goes first, then the program ends.
+    void exitFromTray();
+
     void connectPanels();
     void connectButtons();
     void connectTray();
