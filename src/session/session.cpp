@@ -47,7 +47,12 @@ void Session::setHotkeyText(std::string text) {
 
 std::string Session::activeHotkey() const {
     const std::optional<int> key = poll_.key();
-    return key ? "F" + std::to_string(*key - platform::kVirtualKeyF1 + 1) : std::string();
+    if (!key) {
+        return {};
+    }
+    std::string name = "F";
+    name += std::to_string(*key - platform::kVirtualKeyF1 + 1);
+    return name;
 }
 
 std::string Session::hotkeyProblem() const {
@@ -74,10 +79,12 @@ ApplyRun Session::Apply() {
     run.shown.signalSound = run.apply.signalSound;
     const std::vector<engine::StepOutcome> failures = run.apply.Failures();
     if (!failures.empty()) {
-        std::string text =
-            "Đã chép xong, nhưng " + std::to_string(failures.size()) + " bước không thành công:";
+        std::string text = "Đã chép xong, nhưng ";
+        text += std::to_string(failures.size());
+        text += " bước không thành công:";
         for (const engine::StepOutcome& failure : failures) {
-            text += "\n" + FailedStepLine(failure);
+            text += '\n';
+            text += FailedStepLine(failure);
         }
         run.shown.messages.push_back(Notice(std::move(text)));
     }
