@@ -15,16 +15,8 @@ using testing::ReadText;
 using testing::TempDir;
 using testing::WriteFile;
 
-class ApplyTest : public ::testing::Test {
+class ApplyTest : public testing::ToolAndGameTest {
 protected:
-    void SetUp() override {
-        testing::MakeToolFolder(tool());
-        testing::MakeGameFolder(game());
-    }
-
-    fs::path tool() const { return dir_ / "tool"; }
-    fs::path game() const { return dir_ / "game"; }
-
     ApplyOutcome Apply(const PatchSelection& selection, const std::string& suffix = "") {
         return ApplyPatches(tool(), game().string() + suffix, selection);
     }
@@ -38,8 +30,6 @@ protected:
         }
         return selection;
     }
-
-    TempDir dir_;
 };
 
 TEST_F(ApplyTest, FolderChecksStopTheRunWithTheirMessageBeforeAnyCopyOrSound) {

@@ -15,16 +15,8 @@ namespace fs = std::filesystem;
 
 constexpr int kF7 = 0x76;
 
-class SessionTest : public ::testing::Test {
+class SessionTest : public testing::ToolAndGameTest {
 protected:
-    void SetUp() override {
-        testing::MakeToolFolder(tool());
-        testing::MakeGameFolder(game());
-    }
-
-    fs::path tool() const { return dir_ / "tool"; }
-    fs::path game() const { return dir_ / "game"; }
-
     void WriteSettings(const std::string& hotkey) {
         WriteFile(tool() / "ThietLap.ini",
                   "[Thiet lap]\r\nDuongDan=" + game().string() + "\r\nPhimTat=" + hotkey + "\r\n");
@@ -36,7 +28,6 @@ protected:
         return std::make_unique<Session>(tool(), std::move(keys), std::move(launch));
     }
 
-    testing::TempDir dir_;
     FakeKeySampler* keys_ = nullptr;
 };
 
