@@ -5,11 +5,9 @@
 #include <string>
 
 #include "catalog/ini.h"
-#include "catalog/settings.h"
-#include "engine/apply.h"
-#include "engine/quick_load.h"
 #include "platform/filesystem.h"
 #include "platform/single_instance.h"
+#include "session/session.h"
 #include "text/vni.h"
 
 namespace kickvane::app {
@@ -22,20 +20,20 @@ constexpr int kExitOk = 0;
 constexpr int kExitFailedSteps = 1;
 constexpr int kExitStopped = 2;
 
-// The command line's face of the engine: messages on standard error, popups on standard output,
-// no sound.
-class ConsoleUi final : public engine::EngineUi {
-public:
-    text::MessageHelper& Messages() override { return messages_; }
-    void ShowPlainMessage(std::string_view text, std::string_view title) override {
-        std::cerr << title << ": " << text << '\n';
+// The command line's face of a command's outcome: messages on standard error, the popup on
+// standard output, no sound.
+void Print(const session::Outcome& shown) {
+    for (const text::Message& message : shown.messages) {
+        if (message.kind == text::Message::Kind::Component) {
+            std::cerr << message.text << '\n';
+        } else {
+            std::cerr << message.title << ": " << message.text << '\n';
+        }
     }
-    void PlaySound(const fs::path&) override {}
-    void ShowPopup(const engine::PopupRequest& popup) override { std::cout << popup.text << '\n'; }
-
-private:
-    text::ConsoleMessageHelper messages_{std::cerr};
-};
+    if (shown.popup) {
+        std::cout << shown.popup->text << '\n';
+    }
+}
 
 struct Options {
     fs::path toolFolder;
@@ -72,12 +70,12 @@ std::optional<Options> ParseOptions(Args args, bool allowGame) {
     return options;
 }
 
-catalog::Settings LoadFor(const Options& options) {
-    catalog::Settings settings = catalog::LoadSettings(options.toolFolder);
+session::Session SessionFor(const Options& options) {
+    session::Session session(options.toolFolder);
     if (options.game) {
-        settings.gameFolder = *options.game;
+        session.setGameFolder(*options.game);
     }
-    return settings;
+    return session;
 }
 
 std::string_view CategoryKey(int switchIndex) {
@@ -136,12 +134,15 @@ int RunApply(Args args) {
         PrintUsage(std::cerr);
         return kExitStopped;
     }
-    const catalog::Settings settings = LoadFor(*options);
-    ConsoleUi ui;
-    const engine::ApplyOutcome outcome = engine::ApplyPatches(
-        options->toolFolder, settings.gameFolder, settings.selection, ui, PrintStep);
+    session::Session session = SessionFor(*options);
+    const session::ApplyRun run = session.Apply();
+    const engine::ApplyOutcome& outcome = run.apply;
     if (outcome.stopped()) {
+        Print(run.shown);
         return kExitStopped;
+    }
+    for (const engine::StepOutcome& step : outcome.steps) {
+        PrintStep(step);
     }
     const std::vector<engine::StepOutcome> failures = outcome.Failures();
     std::cout << outcome.steps.size() << " steps, " << failures.size() << " failed\n";
@@ -158,14 +159,15 @@ int RunPlan(Args args) {
         PrintUsage(std::cerr);
         return kExitStopped;
     }
-    const catalog::Settings settings = LoadFor(*options);
-    const engine::Roots roots = engine::ResolveRoots(options->toolFolder, settings.gameFolder);
+    const session::Session session = SessionFor(*options);
+    const engine::Roots roots =
+        engine::ResolveRoots(options->toolFolder, session.settings().gameFolder);
     for (engine::Root root : {engine::Root::Data, engine::Root::ZData, engine::Root::ToolData,
                               engine::Root::ToolZData, engine::Root::Extras}) {
         std::cout << engine::RootName(root) << " = "
                   << platform::ResolveCaseInsensitive(roots.Of(root)).string() << '\n';
     }
-    for (const engine::PlanStep& step : engine::BuildPlan(settings.selection)) {
+    for (const engine::PlanStep& step : session.Plan()) {
         std::cout << CategoryKey(step.category) << ": " << engine::Describe(step) << '\n';
     }
     return kExitOk;
@@ -177,12 +179,15 @@ int RunQuickLoad(Args args) {
         PrintUsage(std::cerr);
         return kExitStopped;
     }
-    ConsoleUi ui;
-    const engine::QuickLoadOutcome outcome =
-        engine::QuickLoad(options->toolFolder, fs::path(std::string(options->positional[0])), ui);
+    session::Session session(options->toolFolder);
+    const session::QuickLoadRun run =
+        session.QuickLoad(fs::path(std::string(options->positional[0])));
+    const engine::QuickLoadOutcome& outcome = run.load;
     if (outcome.stopped) {
+        Print(run.shown);
         return kExitStopped;
     }
+    std::cout << run.shown.popup->text << '\n';
     for (const std::string& failure : outcome.failures) {
         std::cerr << "failed: " << failure << '\n';
     }

@@ -25,21 +25,6 @@ using Clock = std::chrono::steady_clock;
 using kickvane::catalog::OptionArray;
 using kickvane::catalog::PatchSelection;
 
-class SilentUi final : public kickvane::engine::EngineUi {
-public:
-    kickvane::text::MessageHelper& Messages() override { return messages_; }
-    void ShowPlainMessage(std::string_view, std::string_view) override {}
-    void PlaySound(const fs::path&) override {}
-    void ShowPopup(const kickvane::engine::PopupRequest&) override {}
-
-private:
-    class Quiet final : public kickvane::text::MessageHelper {
-    public:
-        void ShowText(std::string_view text) override { std::cerr << text << '\n'; }
-        std::string ReadWindowText(std::uintptr_t) const override { return {}; }
-    } messages_;
-};
-
 struct TreeSize {
     int files = 0;
     std::uintmax_t bytes = 0;
@@ -107,10 +92,10 @@ PatchSelection EverythingOn() {
     for (int i = 0; i < kickvane::catalog::kCategoryCount; ++i) {
         selection.setSwitchValue(i, 1);
     }
-    selection.setOptionValue(OptionArray::UniOption, 3, true);
-    selection.setOptionValue(OptionArray::UniOption1, 3, true);
-    selection.setOptionValue(OptionArray::UniOption1, 5, true);
-    selection.setOptionValue(OptionArray::UniOption3, 2, true);
+    selection.setOptionValue(OptionArray::Ball, 3, true);
+    selection.setOptionValue(OptionArray::Other, 3, true);
+    selection.setOptionValue(OptionArray::Other, 5, true);
+    selection.setOptionValue(OptionArray::Scoreboard, 2, true);
     return selection;
 }
 
@@ -150,11 +135,13 @@ double TimeCopyBaseline(const fs::path& tool, const fs::path& into,
 }
 
 double TimeApply(const fs::path& tool, const fs::path& game, const PatchSelection& selection) {
-    SilentUi ui;
     ::sync();
     const auto start = Clock::now();
-    const auto outcome = kickvane::engine::ApplyPatches(tool, game.string(), selection, ui);
+    const auto outcome = kickvane::engine::ApplyPatches(tool, game.string(), selection);
     const double elapsed = Seconds(Clock::now() - start);
+    if (outcome.message) {
+        std::cerr << outcome.message->text << '\n';
+    }
     if (outcome.stopped() || !outcome.Failures().empty()) {
         for (const auto& failure : outcome.Failures()) {
             std::cerr << "failed: " << kickvane::engine::Describe(failure.step) << ": "

@@ -23,53 +23,54 @@ constexpr std::array<PatchCategory, kCategoryCount> kCategories{{
     {"SVD", "Thay đổi Sân vận động", 13, 0, std::nullopt},
 }};
 
+// Each variant names its set below "\extras"; the option without one restores the base set.
 // The default ball is a variant, not the base set: with no settings "Europa League 2011" is on.
 constexpr std::array<PatchOption, 4> kBall{{
     {"MacDinh", "Mặc định", 0, false},
-    {"Europa League 2011", "Europa League 2011", 1, true},
-    {"Teamgeist Blue White", "Teamgeist Blue White", 2, false},
-    {"UCL 2011", "UCL 2011", 3, false},
+    {"Europa League 2011", "Europa League 2011", 1, true, "\\Ball\\Europa League 2011"},
+    {"Teamgeist Blue White", "Teamgeist Blue White", 2, false, "\\Ball\\Teamgeist Blue White"},
+    {"UCL 2011", "UCL 2011", 3, false, "\\Ball\\UCL 2011"},
 }};
 
 constexpr std::array<PatchOption, 8> kScoreboard{{
     {"MacDinh", "Mặc định", 0, true},
-    {"SkySportHDBlue", "Sky Sport HD Blue", 1, false},
-    {"ESPNHD", "ESPN HD", 2, false},
-    {"StarSportsBlue", "Star Sports Blue", 3, false},
-    {"K+NS", "K+ Nhịp sống", 4, false},
-    {"VTCHDVIP", "VTC HD VIP", 5, false},
-    {"VTV3UCL", "VTV3 UCL", 6, false},
-    {"SSUCLRed", "Supa Strikas UCL Red", 7, false},
+    {"SkySportHDBlue", "Sky Sport HD Blue", 1, false, "\\scoreboard\\SkySport Blue"},
+    {"ESPNHD", "ESPN HD", 2, false, "\\scoreboard\\ESPN HD"},
+    {"StarSportsBlue", "Star Sports Blue", 3, false, "\\scoreboard\\StarSports Blue"},
+    {"K+NS", "K+ Nhịp sống", 4, false, "\\scoreboard\\K+ NS"},
+    {"VTCHDVIP", "VTC HD VIP", 5, false, "\\scoreboard\\VTC HD VIP"},
+    {"VTV3UCL", "VTV3 UCL", 6, false, "\\scoreboard\\VTV3 UCL"},
+    {"SSUCLRed", "Supa Strikas UCL Red", 7, false, "\\scoreboard\\SupaStrikas UCL Red"},
 }};
 
-// Adboard, pitch and mark share the option array UniOption1 (indices 0-10) and section "Khac".
+// Adboard, pitch and mark share the row of the "Khác" tab (indices 0-10) and section "Khac".
 constexpr std::array<PatchOption, 4> kAdboard{{
     {"QcaoMacDinh", "Quảng cáo mặc định", 0, true},
-    {"QcaoUCL", "Quảng cáo UCL", 1, false},
-    {"QcaoVN", "Quảng cáo Việt Nam", 2, false},
-    {"QcaoWC2010", "Quảng cáo WC 2010", 3, false},
+    {"QcaoUCL", "Quảng cáo UCL", 1, false, "\\adboard\\UCL"},
+    {"QcaoVN", "Quảng cáo Việt Nam", 2, false, "\\adboard\\Viet Nam"},
+    {"QcaoWC2010", "Quảng cáo WC 2010", 3, false, "\\adboard\\WC 2010"},
 }};
 
 constexpr std::array<PatchOption, 4> kPitch{{
     {"CoMacDinh", "Mặt cỏ mặc định", 4, true},
-    {"CoCaro", "Mặt cỏ Caro", 5, false},
-    {"CoOvalUCL", "Mặt cỏ Oval UCL", 6, false},
-    {"CoCaroUCL", "Mặt cỏ Caro UCL", 7, false},
+    {"CoCaro", "Mặt cỏ Caro", 5, false, "\\pitch\\Caro"},
+    {"CoOvalUCL", "Mặt cỏ Oval UCL", 6, false, "\\pitch\\Oval UCL"},
+    {"CoCaroUCL", "Mặt cỏ Caro UCL", 7, false, "\\pitch\\Caro UCL"},
 }};
 
 constexpr std::array<PatchOption, 3> kMark{{
     {"MarkMacDinh", "Mark mặc định", 8, true},
-    {"MarkMatCuoi", "Mark Mặt cười", 9, false},
-    {"MarkPESvang", "Mark PES (Vàng)", 10, false},
+    {"MarkMatCuoi", "Mark Mặt cười", 9, false, "\\Indicator\\Mat cuoi"},
+    {"MarkPESvang", "Mark PES (Vàng)", 10, false, "\\Indicator\\PES vang"},
 }};
 
 constexpr std::array<VariantGroup, kGroupCount> kGroups{{
-    {GroupId::Ball, 0, "Bong", OptionArray::UniOption, LabelArray::UniLabel1, 1, 0, kBall},
-    {GroupId::Scoreboard, 10, "Bang Ti So", OptionArray::UniOption3, LabelArray::UniLabel2, 2, 1,
+    {GroupId::Ball, 0, "Bong", OptionArray::Ball, LabelArray::Ball, 1, 0, kBall},
+    {GroupId::Scoreboard, 10, "Bang Ti So", OptionArray::Scoreboard, LabelArray::Scoreboard, 2, 1,
      kScoreboard},
-    {GroupId::Adboard, 2, "Khac", OptionArray::UniOption1, LabelArray::UniLabel3, 3, 2, kAdboard},
-    {GroupId::Pitch, 1, "Khac", OptionArray::UniOption1, LabelArray::UniLabel3, 3, 3, kPitch},
-    {GroupId::Mark, 11, "Khac", OptionArray::UniOption1, LabelArray::UniLabel3, 3, 4, kMark},
+    {GroupId::Adboard, 2, "Khac", OptionArray::Other, LabelArray::Other, 3, 2, kAdboard},
+    {GroupId::Pitch, 1, "Khac", OptionArray::Other, LabelArray::Other, 3, 3, kPitch},
+    {GroupId::Mark, 11, "Khac", OptionArray::Other, LabelArray::Other, 3, 4, kMark},
 }};
 
 }  // namespace

@@ -10,12 +10,12 @@ namespace kickvane::catalog {
 
 inline constexpr int kCategoryCount = 14;
 
-// The widget arrays that hold the option buttons. Three groups share UniOption1 and are kept
-// apart by their containers.
-enum class OptionArray { UniOption, UniOption1, UniOption3 };
+// The rows of option buttons, one per tab. The three groups of the "Khác" tab share one row and
+// are kept apart by their containers.
+enum class OptionArray { Ball, Scoreboard, Other };
 
-// The label arrays, which also name the preview pictures of their entries.
-enum class LabelArray { UniLabel, UniLabel1, UniLabel2, UniLabel3 };
+// The rows of labels, one per tab, which also name the preview pictures of their entries.
+enum class LabelArray { Category, Ball, Scoreboard, Other };
 
 enum class GroupId { Ball, Scoreboard, Adboard, Pitch, Mark };
 inline constexpr int kGroupCount = 5;
@@ -25,6 +25,9 @@ struct PatchOption {
     std::string_view label;  // shown beside the option button
     int index;               // index in the group's option array (and label array)
     bool isDefault;
+    // The variant's set below the tool's "extras" folder ("\Ball\UCL 2011"); empty for the
+    // option that restores the base set.
+    std::string_view sourceFolder = {};
 };
 
 struct VariantGroup {
@@ -41,7 +44,7 @@ struct VariantGroup {
 struct PatchCategory {
     std::string_view key;  // key in section "Thay doi"
     std::string_view label;
-    int switchIndex;  // index in UniCheck and UniLabel
+    int switchIndex;  // index among the check boxes and their labels
     int defaultValue;
     std::optional<GroupId> group;
 };

@@ -17,20 +17,6 @@ namespace {
 
 constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
 
-bool IsBlank(char c) {
-    return c == ' ' || c == '\t';
-}
-
-std::string_view TrimBlanks(std::string_view text) {
-    while (!text.empty() && IsBlank(text.front())) {
-        text.remove_prefix(1);
-    }
-    while (!text.empty() && IsBlank(text.back())) {
-        text.remove_suffix(1);
-    }
-    return text;
-}
-
 std::string WithoutLineBreaks(std::string_view text) {
     std::string out;
     out.reserve(text.size());
@@ -44,7 +30,7 @@ std::string WithoutLineBreaks(std::string_view text) {
 
 // A section or key name as it is compared and stored.
 std::string NormalizeName(std::string_view name) {
-    return std::string(TrimBlanks(WithoutLineBreaks(text::LegacyTextToUtf8(name))));
+    return std::string(platform::TrimBlanks(WithoutLineBreaks(text::LegacyTextToUtf8(name))));
 }
 
 enum class LineKind { kBlank, kComment, kSection, kEntry, kOther };
@@ -56,7 +42,7 @@ struct ParsedLine {
 };
 
 ParsedLine ParseLine(std::string_view line) {
-    const std::string_view text = TrimBlanks(line);
+    const std::string_view text = platform::TrimBlanks(line);
     if (text.empty()) {
         return {LineKind::kBlank, {}, {}};
     }
@@ -67,7 +53,7 @@ ParsedLine ParseLine(std::string_view line) {
         // The last ']' closes the name, as in the platform's reader; text after it is ignored.
         const size_t close = text.rfind(']');
         if (close != 0 && close != std::string_view::npos) {
-            return {LineKind::kSection, TrimBlanks(text.substr(1, close - 1)), {}};
+            return {LineKind::kSection, platform::TrimBlanks(text.substr(1, close - 1)), {}};
         }
         // An unclosed section line falls through and is taken like any other line.
     }
@@ -75,8 +61,8 @@ ParsedLine ParseLine(std::string_view line) {
     if (equals == std::string_view::npos) {
         return {LineKind::kOther, {}, {}};
     }
-    return {LineKind::kEntry, TrimBlanks(text.substr(0, equals)),
-            TrimBlanks(text.substr(equals + 1))};
+    return {LineKind::kEntry, platform::TrimBlanks(text.substr(0, equals)),
+            platform::TrimBlanks(text.substr(equals + 1))};
 }
 
 std::string Unquote(std::string_view value) {
@@ -231,10 +217,9 @@ std::string ReadIni(const fs::path& file, std::string_view section, std::string_
     } catch (const std::exception&) {
         // Unreadable counts as missing, as for the platform's reader.
     }
-    while (!defaultValue.empty() && IsBlank(defaultValue.back())) {
-        defaultValue.remove_suffix(1);
-    }
-    return std::string(defaultValue);
+    // Only trailing blanks go: leading ones stay, as the platform's reader keeps them.
+    const size_t end = defaultValue.find_last_not_of(" \t");
+    return std::string(defaultValue.substr(0, end == std::string_view::npos ? 0 : end + 1));
 }
 
 Status WriteIni(const fs::path& file, std::string_view section, std::string_view key,

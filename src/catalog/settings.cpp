@@ -16,15 +16,6 @@ constexpr std::string_view kMainSection = "Thiet lap";
 constexpr std::string_view kFolderKey = "DuongDan";
 constexpr std::string_view kHotkeyKey = "PhimTat";
 
-std::string_view Trim(std::string_view text) {
-    const size_t first = text.find_first_not_of(" \t");
-    if (first == std::string_view::npos) {
-        return {};
-    }
-    const size_t last = text.find_last_not_of(" \t");
-    return text.substr(first, last - first + 1);
-}
-
 bool EqualsIgnoringCase(std::string_view a, std::string_view b) {
     return platform::NamesEqualIgnoringCase(a, b);
 }
@@ -42,7 +33,7 @@ std::filesystem::path SettingsFile(const std::filesystem::path& toolFolder) {
 }
 
 std::optional<int> ParseWholeNumber(std::string_view text) {
-    text = Trim(text);
+    text = platform::TrimBlanks(text);
     if (text.empty()) {
         return std::nullopt;
     }
@@ -67,7 +58,7 @@ std::optional<int> ParseWholeNumber(std::string_view text) {
 }
 
 std::optional<bool> ParseTruthValue(std::string_view text) {
-    text = Trim(text);
+    text = platform::TrimBlanks(text);
     if (EqualsIgnoringCase(text, "True")) {
         return true;
     }

@@ -1,6 +1,7 @@
 #include "engine/apply.h"
 
 #include "platform/filesystem.h"
+#include "text/vni.h"
 
 namespace kickvane::engine {
 
@@ -72,28 +73,26 @@ std::filesystem::path SignalSoundPath(const std::filesystem::path& toolFolder) {
 }
 
 ApplyOutcome ApplyPatches(const std::filesystem::path& toolFolder, std::string_view gameFolder,
-                          const catalog::PatchSelection& selection, EngineUi& ui,
-                          const StepObserver& observer) {
+                          const catalog::PatchSelection& selection) {
     ApplyOutcome outcome;
     const Roots roots = ResolveRoots(toolFolder, gameFolder);
     outcome.stoppedBy = CheckRoots(roots);
     switch (outcome.stoppedBy) {
         case RootProblem::ToolDataMissing:
-            ui.ShowPlainMessage(ToolDataMissingText(roots), kToolDataMissingTitle);
+            outcome.message = text::Message{text::Message::Kind::Plain, ToolDataMissingText(roots),
+                                            std::string(kToolDataMissingTitle)};
             return outcome;
         case RootProblem::DataMissing:
-            ui.Messages().ShowText(ui.Messages().ConvertText(kDataMissingVni));
+            outcome.message = text::Message{
+                text::Message::Kind::Component, text::VniToUnicodeUtf8(kDataMissingVni), {}};
             return outcome;
         case RootProblem::None:
             break;
     }
     for (const PlanStep& step : BuildPlan(selection)) {
         outcome.steps.push_back(RunStep(step, roots));
-        if (observer) {
-            observer(outcome.steps.back());
-        }
     }
-    ui.PlaySound(SignalSoundPath(toolFolder));
+    outcome.signalSound = SignalSoundPath(toolFolder);
     return outcome;
 }
 

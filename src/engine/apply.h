@@ -1,16 +1,16 @@
 #pragma once
 
 #include <filesystem>
-#include <functional>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
 
 #include "catalog/selection.h"
-#include "engine/engine_ui.h"
 #include "engine/file_ops.h"
 #include "engine/plan.h"
 #include "engine/roots.h"
+#include "text/message.h"
 
 namespace kickvane::engine {
 
@@ -29,14 +29,13 @@ struct StepOutcome {
 
 struct ApplyOutcome {
     RootProblem stoppedBy = RootProblem::None;  // a folder check stopped the run: nothing copied
+    std::optional<text::Message> message;       // the folder check's message
     std::vector<StepOutcome> steps;
+    std::filesystem::path signalSound;  // to play once the copies are done; empty when stopped
 
     bool stopped() const { return stoppedBy != RootProblem::None; }
     std::vector<StepOutcome> Failures() const;
 };
-
-// Called after each step, for progress output.
-using StepObserver = std::function<void(const StepOutcome&)>;
 
 // Messages of the two folder checks, as stored (the second one VNI-typed).
 inline constexpr std::string_view kToolDataMissingTitle = "Thu muc nguon";
@@ -46,11 +45,11 @@ inline constexpr std::string_view kDataMissingVni =
     "da64n";
 
 // Copies the chosen sets from the tool folder into the game folder. The folder checks come first
-// and stop the run with their message. Then every step runs in plan order; a step that fails is
-// recorded and the run goes on. The run ends with the signal sound.
+// and stop the run with their message, before anything is copied. Then every step runs in plan
+// order; a step that fails is recorded and the run goes on. A run that was not stopped names the
+// signal sound to play.
 ApplyOutcome ApplyPatches(const std::filesystem::path& toolFolder, std::string_view gameFolder,
-                          const catalog::PatchSelection& selection, EngineUi& ui,
-                          const StepObserver& observer = {});
+                          const catalog::PatchSelection& selection);
 
 // The path of the signal sound in the tool folder.
 std::filesystem::path SignalSoundPath(const std::filesystem::path& toolFolder);

@@ -16,16 +16,8 @@ using platform::ResolveCaseInsensitive;
 // merge of many files does not scan the folder for each of them.
 class FolderIndex {
 public:
-    explicit FolderIndex(const fs::path& folder) : folder_(folder) {
-        std::error_code ec;
-        for (fs::directory_iterator it(folder, ec), end; !ec && it != end; it.increment(ec)) {
-            const std::string name = it->path().filename().string();
-            auto [pos, inserted] = names_.emplace(platform::FoldCase(name), name);
-            if (!inserted && name < pos->second) {
-                pos->second = name;  // Same rule as the single lookup: first in name order.
-            }
-        }
-    }
+    explicit FolderIndex(const fs::path& folder)
+        : folder_(folder), names_(platform::EntriesByFoldedName(folder)) {}
 
     // The existing entry for `name` in any letter case, else `name` as given.
     fs::path Entry(const std::string& name) const {

@@ -15,9 +15,17 @@ std::optional<int> HotkeyVirtualKey(std::string_view name) {
     return std::nullopt;
 }
 
-bool HotkeyPoll::Tick(std::string_view hotkeyText) {
-    const std::optional<int> key = HotkeyVirtualKey(hotkeyText);
-    return key && sampler_.Sample(*key).any();
+bool HotkeyPoll::SetHotkey(std::string_view name) {
+    const std::optional<int> key = HotkeyVirtualKey(name);
+    if (!key) {
+        return false;
+    }
+    key_ = key;
+    return true;
+}
+
+bool HotkeyPoll::Tick() {
+    return key_ && sampler_ && sampler_->Sample(*key_).any();
 }
 
 }  // namespace kickvane::engine

@@ -11,20 +11,28 @@ namespace kickvane::engine {
 // The virtual key of a hotkey name: "F1" to "F12", compared exactly ("f7" and "" name no key).
 std::optional<int> HotkeyVirtualKey(std::string_view name);
 
-// The hotkey poll: on every tick the window reads its hotkey box and asks whether the patches
+// The hotkey poll: it keeps the key the user chose and, on every tick, asks whether the patches
 // should be applied now. The key counts when it is down now or was pressed since the last
 // sample, so a short press between two ticks is not missed and a held key runs on every tick.
 class HotkeyPoll {
 public:
     static constexpr std::chrono::milliseconds kInterval{100};
 
-    explicit HotkeyPoll(platform::KeySampler& sampler) : sampler_(sampler) {}
+    // Without a sampler (no global key state here) no tick ever says yes.
+    explicit HotkeyPoll(platform::KeySampler* sampler) : sampler_(sampler) {}
 
-    // Samples the key named `hotkeyText` once; true when the patches should be applied.
-    bool Tick(std::string_view hotkeyText);
+    // Takes the key that `name` names. A name that names no key leaves the key in use as it was
+    // and returns false.
+    bool SetHotkey(std::string_view name);
+    // The virtual key in use; none until a name that names a key has been set.
+    std::optional<int> key() const { return key_; }
+
+    // Samples the key once; true when the patches should be applied.
+    bool Tick();
 
 private:
-    platform::KeySampler& sampler_;
+    platform::KeySampler* sampler_;
+    std::optional<int> key_;
 };
 
 }  // namespace kickvane::engine

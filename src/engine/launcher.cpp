@@ -2,28 +2,36 @@
 
 #include "engine/launch_plan.h"
 #include "platform/process.h"
+#include "text/vni.h"
 
 namespace kickvane::engine {
 
-LaunchResult LaunchGame(std::string_view gameFolder, EngineUi& ui) {
+namespace {
+
+LaunchOutcome NotStarted(LaunchResult result, std::string text) {
+    return {result, text::Message{text::Message::Kind::Component, std::move(text), {}}};
+}
+
+}  // namespace
+
+LaunchOutcome LaunchGame(std::string_view gameFolder) {
     const LaunchDecision decision =
         PlanLaunch(gameFolder, UserFolders::FromEnvironment(), platform::FindOnPath);
     if (decision.problem == LaunchProblem::LauncherMissing) {
-        ui.Messages().ShowText(ui.Messages().ConvertText(kLauncherMissingVni));
-        return LaunchResult::LauncherMissing;
+        return NotStarted(LaunchResult::LauncherMissing,
+                          text::VniToUnicodeUtf8(kLauncherMissingVni));
     }
     if (decision.problem == LaunchProblem::WineMissing) {
-        ui.Messages().ShowText(kWineMissingText);
-        return LaunchResult::WineMissing;
+        return NotStarted(LaunchResult::WineMissing, std::string(kWineMissingText));
     }
     const LaunchPlan& plan = decision.plan;
     const Status started = platform::StartDetached(plan.program, plan.arguments, plan.workingFolder,
                                                    true, plan.environment);
     if (!started) {
-        ui.Messages().ShowText(std::string(kStartFailedText) + started.reason());
-        return LaunchResult::StartFailed;
+        return NotStarted(LaunchResult::StartFailed,
+                          std::string(kStartFailedText) + started.reason());
     }
-    return LaunchResult::Started;
+    return {};
 }
 
 }  // namespace kickvane::engine

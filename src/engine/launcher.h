@@ -3,7 +3,9 @@
 #include <string>
 #include <string_view>
 
-#include "engine/engine_ui.h"
+#include <optional>
+
+#include "text/message.h"
 
 namespace kickvane::engine {
 
@@ -15,10 +17,17 @@ inline constexpr std::string_view kStartFailedText = "Không chạy được Gam
 
 enum class LaunchResult { Started, LauncherMissing, WineMissing, StartFailed };
 
+struct LaunchOutcome {
+    LaunchResult result = LaunchResult::Started;
+    std::optional<text::Message> message;  // why it did not start
+
+    bool started() const { return result == LaunchResult::Started; }
+};
+
 // Starts "Gameloader.exe" from the game folder without waiting, with the game folder as the
 // working folder, the way PlanLaunch decides (through the game's manager, or Wine in the game's
-// own prefix; a file that this system can run itself directly). When it cannot start, the user
-// is told why and the result says so.
-LaunchResult LaunchGame(std::string_view gameFolder, EngineUi& ui);
+// own prefix; a file that this system can run itself directly). When it cannot start, the
+// outcome says why in a message for the user.
+LaunchOutcome LaunchGame(std::string_view gameFolder);
 
 }  // namespace kickvane::engine

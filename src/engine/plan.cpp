@@ -73,61 +73,38 @@ private:
     int category_ = 0;
 };
 
-constexpr std::array<std::string_view, 4> kBallSets{
-    "", "\\Ball\\Europa League 2011", "\\Ball\\Teamgeist Blue White", "\\Ball\\UCL 2011"};
-
-// Pitch variants, by option index (4 is the default, which has its own steps).
-constexpr std::array<std::string_view, 3> kPitchSets{"\\pitch\\Caro", "\\pitch\\Oval UCL",
-                                                     "\\pitch\\Caro UCL"};
-
-constexpr std::array<std::string_view, 4> kAdboardSets{"", "\\adboard\\UCL", "\\adboard\\Viet Nam",
-                                                       "\\adboard\\WC 2010"};
-
-constexpr std::array<std::string_view, 8> kScoreboardSets{
-    "",
-    "\\scoreboard\\SkySport Blue",
-    "\\scoreboard\\ESPN HD",
-    "\\scoreboard\\StarSports Blue",
-    "\\scoreboard\\K+ NS",
-    "\\scoreboard\\VTC HD VIP",
-    "\\scoreboard\\VTV3 UCL",
-    "\\scoreboard\\SupaStrikas UCL Red",
-};
-
-// Mark variants, by option index (8 is the default).
-constexpr std::array<std::string_view, 2> kMarkSets{"\\Indicator\\Mat cuoi",
-                                                    "\\Indicator\\PES vang"};
-
 constexpr std::array<std::string_view, 8> kInterfaceFolders{
     "\\gui\\hud\\chatting",     "\\gui\\hud\\DistanceToNet", "\\gui\\hud\\PK", "\\gui\\hud\\radar",
     "\\gui\\hud\\RefAdvantage", "\\gui\\hud\\watermark",     "\\gui\\loading", "\\gui\\font",
 };
 
-void AddBall(PlanBuilder& plan, std::optional<int> variant) {
-    if (!variant) {
+// Each function below adds one group's steps for its chosen option: the option's set from the
+// extras folder, or the base set when the option has none.
+
+void AddBall(PlanBuilder& plan, const catalog::PatchOption* chosen) {
+    if (!chosen) {
         return;
     }
-    if (*variant == 0) {
+    if (chosen->sourceFolder.empty()) {
         plan.Mirror(Root::ToolData, Root::Data, "\\ball");
         plan.Mirror(Root::ToolZData, Root::ZData, "\\ball");
     } else {
-        plan.Merge(Root::Extras, kBallSets[static_cast<size_t>(*variant)], Root::ZData, "\\ball");
+        plan.Merge(Root::Extras, chosen->sourceFolder, Root::ZData, "\\ball");
     }
 }
 
-void AddPitch(PlanBuilder& plan, std::optional<int> variant) {
-    if (!variant) {
+void AddPitch(PlanBuilder& plan, const catalog::PatchOption* chosen) {
+    if (!chosen) {
         return;
     }
-    if (*variant == 4) {
+    if (chosen->sourceFolder.empty()) {
         plan.Mirror(Root::ToolData, Root::Data, "\\pitch");
         plan.Mirror(Root::ToolZData, Root::ZData, "\\pitch");
         return;
     }
     // A variant's own grass, then the shared textures, then the base set's dirt and pitch lines
     // over whatever the variant brought, and the second tree's pitch reset to the base set.
-    plan.Merge(Root::Extras, kPitchSets[static_cast<size_t>(*variant - 5)], Root::Data,
-               "\\pitch\\textures");
+    plan.Merge(Root::Extras, chosen->sourceFolder, Root::Data, "\\pitch\\textures");
     plan.Merge(Root::Extras, "\\pitch\\_textures", Root::Data, "\\pitch\\textures");
     plan.File(Root::ToolData, "\\pitch\\textures\\grass_dirt.dds", Root::Data, "\\pitch\\textures");
     plan.File(Root::ToolData, "\\pitch\\textures\\grass_pitchlines.dds", Root::Data,
@@ -135,40 +112,38 @@ void AddPitch(PlanBuilder& plan, std::optional<int> variant) {
     plan.Mirror(Root::ToolZData, Root::ZData, "\\pitch");
 }
 
-void AddAdboard(PlanBuilder& plan, std::optional<int> variant) {
-    if (variant == 0) {
+void AddAdboard(PlanBuilder& plan, const catalog::PatchOption* chosen) {
+    if (chosen && chosen->sourceFolder.empty()) {
         // The default restores only the main tree's adboards.
         plan.Mirror(Root::ToolData, Root::Data, "\\adboard");
-    } else if (variant) {
-        plan.Merge(Root::Extras, kAdboardSets[static_cast<size_t>(*variant)], Root::ZData,
-                   "\\adboard");
+    } else if (chosen) {
+        plan.Merge(Root::Extras, chosen->sourceFolder, Root::ZData, "\\adboard");
     }
     plan.Mirror(Root::ToolData, Root::Data, "\\ingame_ad");
 }
 
-void AddScoreboard(PlanBuilder& plan, std::optional<int> variant) {
-    if (!variant) {
+void AddScoreboard(PlanBuilder& plan, const catalog::PatchOption* chosen) {
+    if (!chosen) {
         return;
     }
-    if (*variant == 0) {
+    if (chosen->sourceFolder.empty()) {
         plan.Mirror(Root::ToolData, Root::Data, "\\gui\\hud\\scoreboard");
         plan.Mirror(Root::ToolData, Root::Data, "\\gui\\hud\\namebar");
         return;
     }
-    const std::string set(kScoreboardSets[static_cast<size_t>(*variant)]);
+    const std::string set(chosen->sourceFolder);
     plan.Merge(Root::Extras, set + "\\scoreboard", Root::Data, "\\gui\\hud\\scoreboard");
     plan.Merge(Root::Extras, set + "\\namebar", Root::Data, "\\gui\\hud\\namebar");
 }
 
-void AddMark(PlanBuilder& plan, std::optional<int> variant) {
-    if (!variant) {
+void AddMark(PlanBuilder& plan, const catalog::PatchOption* chosen) {
+    if (!chosen) {
         return;
     }
-    if (*variant == 8) {
+    if (chosen->sourceFolder.empty()) {
         plan.Mirror(Root::ToolData, Root::Data, "\\gui\\hud\\Indicator");
     } else {
-        plan.Merge(Root::Extras, kMarkSets[static_cast<size_t>(*variant - 9)], Root::Data,
-                   "\\gui\\hud\\Indicator");
+        plan.Merge(Root::Extras, chosen->sourceFolder, Root::Data, "\\gui\\hud\\Indicator");
     }
 }
 
@@ -184,13 +159,13 @@ std::vector<PlanStep> BuildPlan(const PatchSelection& selection) {
         plan.Category(category);
         switch (category) {
             case kBall:
-                AddBall(plan, selection.chosen(GroupId::Ball));
+                AddBall(plan, selection.chosenOption(GroupId::Ball));
                 break;
             case kPitch:
-                AddPitch(plan, selection.chosen(GroupId::Pitch));
+                AddPitch(plan, selection.chosenOption(GroupId::Pitch));
                 break;
             case kAdboard:
-                AddAdboard(plan, selection.chosen(GroupId::Adboard));
+                AddAdboard(plan, selection.chosenOption(GroupId::Adboard));
                 break;
             case kInterface:
                 for (std::string_view folder : kInterfaceFolders) {
@@ -222,10 +197,10 @@ std::vector<PlanStep> BuildPlan(const PatchSelection& selection) {
                 plan.Mirror(Root::ToolData, Root::Data, "\\net\\textures");
                 break;
             case kScoreboard:
-                AddScoreboard(plan, selection.chosen(GroupId::Scoreboard));
+                AddScoreboard(plan, selection.chosenOption(GroupId::Scoreboard));
                 break;
             case kMark:
-                AddMark(plan, selection.chosen(GroupId::Mark));
+                AddMark(plan, selection.chosenOption(GroupId::Mark));
                 break;
             case kCrowd:
                 plan.Mirror(Root::ToolZData, Root::ZData, "\\crowd\\textures");

@@ -6,6 +6,8 @@
 #include "engine/file_ops.h"
 #include "engine/roots.h"
 #include "platform/filesystem.h"
+#include "platform/text.h"
+#include "text/vni.h"
 
 namespace kickvane::engine {
 
@@ -29,10 +31,6 @@ constexpr std::array<Pattern, 7> kPatterns{{
     {"ball10.dds", "textures", "\\zdata\\data2\\ball\\textures"},
 }};
 
-char Fold(char c) {
-    return (c >= 'A' && c <= 'Z') ? static_cast<char>(c - 'A' + 'a') : c;
-}
-
 std::vector<fs::path> MatchingFiles(const fs::path& folder, std::string_view pattern) {
     std::vector<fs::path> matches;
     for (const fs::path& file : platform::ListPlainFiles(folder)) {
@@ -52,7 +50,8 @@ bool MatchesWildcard(std::string_view name, std::string_view pattern) {
     std::optional<size_t> star;
     size_t starName = 0;
     while (n < name.size()) {
-        if (p < pattern.size() && (pattern[p] == '?' || Fold(pattern[p]) == Fold(name[n]))) {
+        if (p < pattern.size() && (pattern[p] == '?' || platform::FoldAscii(pattern[p]) ==
+                                                            platform::FoldAscii(name[n]))) {
             ++n;
             ++p;
         } else if (p < pattern.size() && pattern[p] == '*') {
@@ -71,12 +70,13 @@ bool MatchesWildcard(std::string_view name, std::string_view pattern) {
     return p == pattern.size();
 }
 
-QuickLoadOutcome QuickLoad(const fs::path& toolFolder, const fs::path& source, EngineUi& ui) {
+QuickLoadOutcome QuickLoad(const fs::path& toolFolder, const fs::path& source) {
     QuickLoadOutcome outcome;
     const fs::path from = source.empty() ? fs::path() : platform::ResolveCaseInsensitive(source);
     if (from.empty() || platform::ListPlainFiles(from).empty()) {
-        ui.Messages().ShowText(ui.Messages().ConvertText(kNoFolderChosenVni));
         outcome.stopped = true;
+        outcome.message = text::Message{
+            text::Message::Kind::Component, text::VniToUnicodeUtf8(kNoFolderChosenVni), {}};
         return outcome;
     }
     const fs::path dataFolder = toolFolder / "data";
@@ -96,7 +96,6 @@ QuickLoadOutcome QuickLoad(const fs::path& toolFolder, const fs::path& source, E
             outcome.copied.push_back(fs::relative(file, from).generic_string());
         }
     }
-    ui.ShowPopup({kQuickLoadDoneText, 2});
     return outcome;
 }
 

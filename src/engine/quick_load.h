@@ -4,17 +4,20 @@
 #include <string>
 #include <vector>
 
-#include "engine/engine_ui.h"
+#include <optional>
+#include <string_view>
+
+#include "text/message.h"
 
 namespace kickvane::engine {
 
 inline constexpr std::string_view kNoFolderChosenVni = "Ba5n chu7a cho5n thu7 mu5c na2o!";
-inline constexpr std::string_view kQuickLoadDoneText = "Hoàn tất!";
 
 struct QuickLoadOutcome {
-    bool stopped = false;               // no folder, or no plain file in it: message shown
-    std::vector<std::string> copied;    // source files copied, relative to the source folder
-    std::vector<std::string> failures;  // one line per pattern whose copy failed
+    bool stopped = false;                  // no folder, or no plain file in it: nothing copied
+    std::optional<text::Message> message;  // why it stopped
+    std::vector<std::string> copied;       // source files copied, relative to the source folder
+    std::vector<std::string> failures;     // one line per pattern whose copy failed
 
     bool ok() const { return !stopped && failures.empty(); }
 };
@@ -22,9 +25,9 @@ struct QuickLoadOutcome {
 // Copies face and ball files from `source` into the tool's base set by seven name patterns, in
 // order. For each pattern the files at the top of `source` are taken; only when there are none,
 // the files of the pattern's subfolder. Names match regardless of letter case. When a copy fails
-// that pattern stops, the others go on, and the outcome names it. Ends with the completion popup.
+// that pattern stops, the others go on, and the outcome names it.
 QuickLoadOutcome QuickLoad(const std::filesystem::path& toolFolder,
-                           const std::filesystem::path& source, EngineUi& ui);
+                           const std::filesystem::path& source);
 
 // Windows wildcard match of a file name: '*' any run, '?' one character, letters in any case.
 bool MatchesWildcard(std::string_view name, std::string_view pattern);

@@ -4,9 +4,11 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <unordered_map>
 #include <vector>
 
 #include "platform/status.h"
+#include "platform/text.h"
 
 // File system operations of the core. The game's folders follow Windows rules (letter case does
 // not matter), so on a case-sensitive file system every lookup goes through ResolveCaseInsensitive.
@@ -14,16 +16,17 @@ namespace kickvane::platform {
 
 namespace fs = std::filesystem;
 
-// ASCII letters compared without regard to case, as Windows compares file names.
-bool NamesEqualIgnoringCase(std::string_view a, std::string_view b);
-std::string FoldCase(std::string_view name);
-
 // Returns `path` with every component that does not exist in its exact spelling replaced by an
 // existing entry of its parent that differs only in letter case. Components below the first one
 // that exists in no spelling keep the spelling given. Identity on case-insensitive systems.
 fs::path ResolveCaseInsensitive(const fs::path& path);
 
+// The entries of `folder` by their case-folded name. Where several differ only in letter case,
+// the first in name order stands for them all, whatever order the folder lists them in.
+std::unordered_map<std::string, std::string> EntriesByFoldedName(const fs::path& folder);
+
 // Finds the entry of `folder` named `name` in any letter case; nullopt when there is none.
+// The exact spelling wins, else the first in name order.
 std::optional<fs::path> FindEntryIgnoringCase(const fs::path& folder, std::string_view name);
 
 bool IsDirectory(const fs::path& path);

@@ -5,27 +5,22 @@
 #include <sstream>
 
 #include "platform/filesystem.h"
+#include "platform/sound.h"
 
 namespace kickvane::platform {
 
-namespace {
-
-char FoldChar(char c) {
-    return (c >= 'A' && c <= 'Z') ? static_cast<char>(c - 'A' + 'a') : c;
-}
-
-}  // namespace
-
-bool NamesEqualIgnoringCase(std::string_view a, std::string_view b) {
-    return a.size() == b.size() && std::equal(a.begin(), a.end(), b.begin(), [](char x, char y) {
-               return FoldChar(x) == FoldChar(y);
-           });
-}
-
-std::string FoldCase(std::string_view name) {
-    std::string folded(name);
-    std::transform(folded.begin(), folded.end(), folded.begin(), FoldChar);
-    return folded;
+std::unordered_map<std::string, std::string> EntriesByFoldedName(const fs::path& folder) {
+    std::unordered_map<std::string, std::string> names;
+    std::error_code ec;
+    for (fs::directory_iterator it(folder.empty() ? fs::path(".") : folder, ec), end;
+         !ec && it != end; it.increment(ec)) {
+        std::string name = it->path().filename().string();
+        auto [pos, inserted] = names.emplace(FoldCase(name), name);
+        if (!inserted && name < pos->second) {
+            pos->second = std::move(name);
+        }
+    }
+    return names;
 }
 
 std::optional<fs::path> FindEntryIgnoringCase(const fs::path& folder, std::string_view name) {
@@ -34,18 +29,12 @@ std::optional<fs::path> FindEntryIgnoringCase(const fs::path& folder, std::strin
     if (fs::exists(fs::symlink_status(exact, ec))) {
         return exact;
     }
-    // Several entries may differ only in case on a case-sensitive system; take the first in
-    // name order so that the choice does not depend on the directory's internal order.
-    std::optional<fs::path> best;
-    for (fs::directory_iterator it(folder.empty() ? fs::path(".") : folder, ec), end;
-         !ec && it != end; it.increment(ec)) {
-        fs::path entry = it->path();
-        if (NamesEqualIgnoringCase(entry.filename().string(), name) &&
-            (!best || entry.filename() < best->filename())) {
-            best = folder / entry.filename();
-        }
+    const auto names = EntriesByFoldedName(folder);
+    const auto found = names.find(FoldCase(name));
+    if (found == names.end()) {
+        return std::nullopt;
     }
-    return best;
+    return folder / found->second;
 }
 
 bool IsDirectory(const fs::path& path) {
@@ -88,6 +77,18 @@ std::vector<fs::path> ListPlainFiles(const fs::path& folder) {
 std::string GetEnv(const char* name) {
     const char* value = std::getenv(name);
     return value ? std::string(value) : std::string();
+}
+
+std::optional<fs::path> SoundFileToPlay(const fs::path& wav) {
+    std::error_code error;
+    if (!fs::is_regular_file(wav, error)) {
+        return std::nullopt;
+    }
+    fs::path absolute = fs::absolute(wav, error);
+    if (error) {
+        return std::nullopt;
+    }
+    return absolute;
 }
 
 }  // namespace kickvane::platform

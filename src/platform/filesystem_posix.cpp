@@ -9,6 +9,7 @@
 #include <cstring>
 
 #include "platform/filesystem.h"
+#include "platform/posix_fd.h"
 
 namespace kickvane::platform {
 
@@ -21,29 +22,6 @@ std::string ErrnoText(int error) {
 Status Failure(const std::string& what, const fs::path& path, int error) {
     return Status::Fail(what + " " + path.string() + ": " + ErrnoText(error));
 }
-
-// Closes a descriptor when it goes out of scope.
-class Fd {
-public:
-    explicit Fd(int fd) : fd_(fd) {}
-    Fd(const Fd&) = delete;
-    Fd& operator=(const Fd&) = delete;
-    ~Fd() {
-        if (fd_ >= 0) {
-            ::close(fd_);
-        }
-    }
-    int get() const { return fd_; }
-    // Closes now and reports the error that a deferred write may only show at close.
-    int Close() {
-        int result = ::close(fd_);
-        fd_ = -1;
-        return result;
-    }
-
-private:
-    int fd_;
-};
 
 // A temporary file beside its final place; removed unless it was renamed into place.
 class TempFile {

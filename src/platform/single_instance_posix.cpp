@@ -20,6 +20,7 @@
 #include <filesystem>
 #include <string_view>
 
+#include "platform/posix_fd.h"
 #include "platform/single_instance.h"
 
 namespace kickvane::platform {
@@ -34,37 +35,6 @@ constexpr size_t kMaxCommandLength = 256;
 constexpr auto kCommandReadTimeout = std::chrono::milliseconds(200);
 // How long a sender waits for a running copy that does not accept.
 constexpr int kSendTimeoutSeconds = 2;
-
-class Fd {
-public:
-    Fd() = default;
-    explicit Fd(int fd) : fd_(fd) {}
-    Fd(Fd&& other) noexcept : fd_(other.Release()) {}
-    Fd& operator=(Fd&& other) noexcept {
-        if (this != &other) {
-            Reset(other.Release());
-        }
-        return *this;
-    }
-    ~Fd() { Reset(); }
-
-    int get() const { return fd_; }
-    bool valid() const { return fd_ >= 0; }
-    int Release() {
-        int fd = fd_;
-        fd_ = -1;
-        return fd;
-    }
-    void Reset(int fd = -1) {
-        if (fd_ >= 0) {
-            ::close(fd_);
-        }
-        fd_ = fd;
-    }
-
-private:
-    int fd_ = -1;
-};
 
 // True when `st` describes a folder that only the current user can change.
 bool IsPrivateFolder(const struct stat& st) {

@@ -3,8 +3,6 @@
 // quickly where there is no audio device.
 #include <canberra.h>
 
-#include <system_error>
-
 #include "platform/sound.h"
 
 namespace kickvane::platform {
@@ -28,16 +26,9 @@ ca_context* SoundContext() {
 }
 
 bool PlayFile(ca_context* context, const std::filesystem::path& wav) {
-    std::error_code error;
-    if (!std::filesystem::is_regular_file(wav, error)) {
-        return false;
-    }
-    const std::filesystem::path absolute = std::filesystem::absolute(wav, error);
-    if (error) {
-        return false;
-    }
-    return ca_context_play(context, 0, CA_PROP_MEDIA_FILENAME, absolute.c_str(), CA_PROP_MEDIA_ROLE,
-                           "event", nullptr) == CA_SUCCESS;
+    const std::optional<std::filesystem::path> file = SoundFileToPlay(wav);
+    return file && ca_context_play(context, 0, CA_PROP_MEDIA_FILENAME, file->c_str(),
+                                   CA_PROP_MEDIA_ROLE, "event", nullptr) == CA_SUCCESS;
 }
 
 // The desktop's default event sound from its sound theme; the first name the theme knows plays.

@@ -8,12 +8,14 @@
 #include <QScreen>
 #include <chrono>
 
+#include "shell/qt_text.h"
+
 namespace kickvane::shell {
 
 namespace {
 
-QColor ToQColor(text::Colour colour, const QPalette& palette) {
-    if (colour == text::kButtonFaceColour) {
+QColor ToQColor(popup::Colour colour, const QPalette& palette) {
+    if (colour == popup::kButtonFaceColour) {
         return palette.color(QPalette::Button);
     }
     return QColor(static_cast<int>(colour & 0xFF), static_cast<int>((colour >> 8) & 0xFF),
@@ -21,22 +23,21 @@ QColor ToQColor(text::Colour colour, const QPalette& palette) {
 }
 
 QFont PopupFont() {
-    QFont font(QString::fromUtf8(text::kPopupFontFamily.data(),
-                                 static_cast<qsizetype>(text::kPopupFontFamily.size())));
-    font.setPointSizeF(text::kPopupFontPointSize);
+    QFont font(ToQString(popup::kPopupFontFamily));
+    font.setPointSizeF(popup::kPopupFontPointSize);
     return font;
 }
 
 QString DisplayText(const std::string& text) {
-    QString shown = QString::fromStdString(text);
+    QString shown = ToQString(text);
     shown.replace(QStringLiteral("\r\n"), QStringLiteral("\n"));
     return shown;
 }
 
 }  // namespace
 
-text::PopupEnvironment AlertPopup::ScreenEnvironment() {
-    text::PopupEnvironment environment;
+popup::PopupEnvironment AlertPopup::ScreenEnvironment() {
+    popup::PopupEnvironment environment;
     if (QScreen* screen = QGuiApplication::primaryScreen()) {
         const QRect work = screen->availableGeometry();
         environment.screen.workAreaRightPx = work.x() + work.width();
@@ -57,30 +58,29 @@ text::PopupEnvironment AlertPopup::ScreenEnvironment() {
     return environment;
 }
 
-AlertPopup::AlertPopup(text::PopupEnvironment environment)
+AlertPopup::AlertPopup(popup::PopupEnvironment environment)
     : QWidget(nullptr, Qt::Tool | Qt::FramelessWindowHint | Qt::WindowStaysOnTopHint |
                            Qt::WindowDoesNotAcceptFocus),
       model_(std::move(environment)) {
     setAttribute(Qt::WA_DeleteOnClose);
     setAttribute(Qt::WA_ShowWithoutActivating);
-    setWindowTitle(QString::fromUtf8(text::kPopupCaption.data(),
-                                     static_cast<qsizetype>(text::kPopupCaption.size())));
+    setWindowTitle(ToQString(popup::kPopupCaption));
     setFont(PopupFont());
     timer_.setTimerType(Qt::PreciseTimer);
     timer_.setInterval(
-        std::chrono::duration_cast<std::chrono::milliseconds>(text::kPopupTickInterval));
+        std::chrono::duration_cast<std::chrono::milliseconds>(popup::kPopupTickInterval));
     connect(&timer_, &QTimer::timeout, this, &AlertPopup::CatchUp);
 }
 
 AlertPopup* AlertPopup::Show(const QString& text, int displaySeconds) {
     auto* popup = new AlertPopup(ScreenEnvironment());
-    popup->DisplayMessage(text, displaySeconds, false, true, true, kToolFrameColour);
+    popup->DisplayMessage(text, displaySeconds);
     return popup;
 }
 
-void AlertPopup::DisplayMessage(const QString& text, int displaySeconds, bool fade, bool autoFit,
-                                bool square, text::Colour backColour) {
-    model_.DisplayMessage(text.toStdString(), displaySeconds, fade, autoFit, square, backColour);
+void AlertPopup::DisplayMessage(const QString& text, int displaySeconds,
+                                const popup::PopupStyle& style) {
+    model_.DisplayMessage(ToUtf8(text), displaySeconds, style);
     if (const auto& shape = model_.Frame().windowShape) {
         QPainterPath path;
         path.addRoundedRect(
@@ -98,7 +98,7 @@ void AlertPopup::DisplayMessage(const QString& text, int displaySeconds, bool fa
 void AlertPopup::CatchUp() {
     const qint64 due =
         clock_.nsecsElapsed() /
-        std::chrono::duration_cast<std::chrono::nanoseconds>(text::kPopupTickInterval).count();
+        std::chrono::duration_cast<std::chrono::nanoseconds>(popup::kPopupTickInterval).count();
     while (ticksRun_ < due && !model_.Finished()) {
         ++ticksRun_;
         Tick();
@@ -116,7 +116,7 @@ void AlertPopup::Tick() {
 }
 
 void AlertPopup::Follow() {
-    const text::PixelRect rect = model_.WindowPixels();
+    const popup::PixelRect rect = model_.WindowPixels();
     setGeometry(rect.left, rect.top, rect.width, rect.height);
     if (const auto alpha = model_.Alpha()) {
         setWindowOpacity(*alpha / 255.0);
@@ -125,22 +125,22 @@ void AlertPopup::Follow() {
 
 void AlertPopup::paintEvent(QPaintEvent*) {
     QPainter painter(this);
-    const QColor green = ToQColor(text::kPopupBackgroundColour, palette());
+    const QColor green = ToQColor(popup::kPopupBackgroundColour, palette());
     painter.fillRect(rect(), green);
-    const text::PopupFrame& frame = model_.Frame();
-    for (const text::RoundedRect& shape : frame.shapes) {
+    const popup::PopupFrame& frame = model_.Frame();
+    for (const popup::RoundedRect& shape : frame.shapes) {
         painter.setPen(ToQColor(shape.colour, palette()));
         painter.setBrush(Qt::NoBrush);
         painter.drawRoundedRect(
             QRect(QPoint(shape.left, shape.top), QPoint(shape.right, shape.bottom)),
             shape.ellipseWidth / 2.0, shape.ellipseHeight / 2.0);
     }
-    for (const text::FrameLine& line : frame.lines) {
+    for (const popup::FrameLine& line : frame.lines) {
         painter.setPen(ToQColor(line.colour, palette()));
         painter.drawLine(line.x1, line.y1, line.x2, line.y2);
     }
-    const text::PixelRect label = model_.LabelPixels();
-    painter.setPen(ToQColor(text::kPopupTextColour, palette()));
+    const popup::PixelRect label = model_.LabelPixels();
+    painter.setPen(ToQColor(popup::kPopupTextColour, palette()));
     painter.setFont(PopupFont());
     painter.drawText(QRect(label.left, label.top, label.width, label.height),
                      Qt::TextWordWrap | Qt::AlignLeft | Qt::AlignTop, DisplayText(model_.Text()));

@@ -4,7 +4,7 @@
 #include <QTimer>
 #include <QWidget>
 
-#include "text/popup_model.h"
+#include "popup/popup_model.h"
 
 namespace kickvane::shell {
 
@@ -13,23 +13,20 @@ namespace kickvane::shell {
 class AlertPopup final : public QWidget {
     Q_OBJECT
 public:
-    // The colour every caller of the tool gives the inner frame line: RGB(255, 255, 192).
-    static constexpr text::Colour kToolFrameColour = 0x00C0FFFF;
-
-    explicit AlertPopup(text::PopupEnvironment environment);
+    explicit AlertPopup(popup::PopupEnvironment environment);
 
     // Opens a popup the way the tool's callers do: timed, sliding, fitted, square frame.
     static AlertPopup* Show(const QString& text, int displaySeconds);
 
-    void DisplayMessage(const QString& text, int displaySeconds, bool fade, bool autoFit,
-                        bool square, text::Colour backColour);
+    void DisplayMessage(const QString& text, int displaySeconds,
+                        const popup::PopupStyle& style = {});
 
-    const text::AlertPopupModel& model() const { return model_; }
+    const popup::AlertPopupModel& model() const { return model_; }
     // One tick of the motion; the timer calls it, tests may too.
     void Tick();
 
     // The screen and text measures the model needs, from the primary screen and the popup font.
-    static text::PopupEnvironment ScreenEnvironment();
+    static popup::PopupEnvironment ScreenEnvironment();
 
 protected:
     void paintEvent(QPaintEvent* event) override;
@@ -41,7 +38,7 @@ private:
     // exactly the system timer fires.
     void CatchUp();
 
-    text::AlertPopupModel model_;
+    popup::AlertPopupModel model_;
     QTimer timer_;
     QElapsedTimer clock_;
     qint64 ticksRun_ = 0;

@@ -10,6 +10,8 @@
 #include <QVBoxLayout>
 #include <memory>
 
+#include "shell/qt_text.h"
+
 namespace kickvane::shell {
 
 namespace {
@@ -18,9 +20,8 @@ constexpr int kButtonWidth = 40;
 constexpr int kGap = 4;
 const QString kTitle = QStringLiteral("Tìm FIFA Online 2");
 
-QString FromStd(const std::string& text) {
-    return QString::fromStdString(text);
-}
+// The button's caption; "m" is its mnemonic.
+const QString kCaption = QStringLiteral("Tì&m");
 
 // The list of several finds; the chosen folder goes into the box.
 void OpenChoice(QWidget* owner, QLineEdit* box, const std::vector<engine::FoundGame>& games) {
@@ -33,9 +34,9 @@ void OpenChoice(QWidget* owner, QLineEdit* box, const std::vector<engine::FoundG
     auto* list = new QListWidget(dialog);
     list->setAccessibleName(QStringLiteral("Các thư mục tìm thấy"));
     for (const engine::FoundGame& game : games) {
-        auto* item = new QListWidgetItem(FromStd(game.folder.string()) + QStringLiteral("\n    ") +
-                                         FromStd(game.source));
-        item->setData(Qt::UserRole, FromStd(game.folder.string()));
+        auto* item = new QListWidgetItem(PathToQString(game.folder) + QStringLiteral("\n    ") +
+                                         ToQString(game.source));
+        item->setData(Qt::UserRole, PathToQString(game.folder));
         list->addItem(item);
     }
     list->setCurrentRow(0);
@@ -59,12 +60,12 @@ void OpenChoice(QWidget* owner, QLineEdit* box, const std::vector<engine::FoundG
 void OpenNothingFound(QWidget* owner, const engine::FindOutcome& outcome) {
     QString text = QStringLiteral("Không tìm thấy Gameloader.exe.\n\nĐã tìm trong:");
     for (const std::string& place : outcome.looked) {
-        text += QStringLiteral("\n  ") + FromStd(place);
+        text += QStringLiteral("\n  ") + ToQString(place);
     }
     if (!outcome.skipped.empty()) {
         text += QStringLiteral("\n\nBỏ qua (không đọc được):");
         for (const std::string& skipped : outcome.skipped) {
-            text += QStringLiteral("\n  ") + FromStd(skipped);
+            text += QStringLiteral("\n  ") + ToQString(skipped);
         }
     }
     auto* box = new QMessageBox(QMessageBox::Information, kTitle, text, QMessageBox::Ok, owner);
@@ -76,7 +77,7 @@ void OpenNothingFound(QWidget* owner, const engine::FindOutcome& outcome) {
 
 GameFinderButton::GameFinderButton(QLineEdit* gameFolderBox, engine::UserFolders folders,
                                    engine::SearchLimits limits)
-    : QPushButton(QStringLiteral("Tìm"), gameFolderBox->parentWidget()),
+    : QPushButton(kCaption, gameFolderBox->parentWidget()),
       gameFolderBox_(gameFolderBox),
       folders_(std::move(folders)),
       limits_(limits) {
@@ -127,10 +128,10 @@ void GameFinderButton::finish(const engine::FindOutcome& outcome) {
         worker_.join();
     }
     QApplication::restoreOverrideCursor();
-    setText(QStringLiteral("Tìm"));
+    setText(kCaption);
     setEnabled(true);
     if (outcome.games.size() == 1) {
-        gameFolderBox_->setText(FromStd(outcome.games.front().folder.string()));
+        gameFolderBox_->setText(PathToQString(outcome.games.front().folder));
     } else if (outcome.games.size() > 1) {
         OpenChoice(window(), gameFolderBox_, outcome.games);
     } else {

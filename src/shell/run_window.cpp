@@ -43,11 +43,10 @@ int RunWindow(int& argc, char** argv, const std::filesystem::path& toolFolder) {
     QtDialogs dialogs;
     ShellServices services;
     services.dialogs = &dialogs;
-    services.keySampler = platform::CreateKeySampler();
     services.playSound = platform::PlaySoundAsync;
-    const bool globalKeys = services.keySampler != nullptr;
+    session::Session session(toolFolder, platform::CreateKeySampler());
 
-    MainWindow window(toolFolder, std::move(services));
+    MainWindow window(session, std::move(services));
     // The tool lives on in the tray while its window is hidden; closing the window or "Thoát"
     // in the tray menu ends it.
     QApplication::setQuitOnLastWindowClosed(false);
@@ -77,7 +76,7 @@ int RunWindow(int& argc, char** argv, const std::filesystem::path& toolFolder) {
 
     CentreOnScreen(window);
     window.show();
-    if (!globalKeys) {
+    if (!session.hasGlobalKeys()) {
         QTimer::singleShot(0, &window,
                            [&] { dialogs.ShowNotice(&window, NoticeTitle(), kNoGlobalKeysText); });
     }

@@ -75,19 +75,19 @@ std::filesystem::path PreviewPicture(const std::filesystem::path& toolFolder,
     int tab = 0;
     int last = 0;
     switch (labels) {
-        case catalog::LabelArray::UniLabel:
+        case catalog::LabelArray::Category:
             tab = 1;
             last = 13;
             break;
-        case catalog::LabelArray::UniLabel1:
+        case catalog::LabelArray::Ball:
             tab = 2;
             last = 3;
             break;
-        case catalog::LabelArray::UniLabel2:
+        case catalog::LabelArray::Scoreboard:
             tab = 3;
             last = 7;
             break;
-        case catalog::LabelArray::UniLabel3:
+        case catalog::LabelArray::Other:
             tab = 4;
             last = 10;
             break;

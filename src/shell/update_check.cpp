@@ -318,7 +318,7 @@ void UpdateCheck::fail(File file, const QString& reason) {
 
 UpdateFlow::UpdateFlow(UpdateCheck::Options options, std::filesystem::path toolFolder,
                        Dialogs& dialogs, QWidget* owner, QPushButton* checkButton,
-                       QPushButton* downloadButton, QString* pban, QString* vlk, UrlOpener openUrl,
+                       QPushButton* downloadButton, session::UpdateState& state, UrlOpener openUrl,
                        QObject* parent)
     : QObject(parent),
       updates_(std::move(options)),
@@ -327,13 +327,12 @@ UpdateFlow::UpdateFlow(UpdateCheck::Options options, std::filesystem::path toolF
       owner_(owner),
       checkButton_(checkButton),
       downloadButton_(downloadButton),
-      pban_(pban),
-      vlk_(vlk),
+      state_(state),
       openUrl_(std::move(openUrl)) {
     connect(&updates_, &UpdateCheck::versionFetched, this, &UpdateFlow::onVersion);
     connect(&updates_, &UpdateCheck::versionFailed, this, &UpdateFlow::onVersionFailed);
     connect(&updates_, &UpdateCheck::linkFetched, this, [this](const QString& text) {
-        *vlk_ = text;
+        state_.downloadLink = text.toStdString();
         link_ = LinkState::Fetched;
         emit linkFinished();
     });
@@ -357,8 +356,8 @@ void UpdateFlow::check() {
 
 void UpdateFlow::onVersion(const QString& text) {
     checking_ = false;
-    *pban_ = text;
     const std::string version = text.toStdString();
+    state_.versionText = version;
     if (checkButton_) {
         checkButton_->setEnabled(true);
     }
@@ -394,7 +393,7 @@ void UpdateFlow::onVersionFailed(const QString& reason) {
 }
 
 void UpdateFlow::download() {
-    const std::optional<std::string> link = DownloadLink(vlk_->toStdString());
+    const std::optional<std::string> link = DownloadLink(state_.downloadLink);
     const QUrl url = link ? QUrl(QString::fromStdString(*link), QUrl::TolerantMode) : QUrl();
     if (!url.isValid() || !IsWebScheme(url.scheme()) || url.host().isEmpty()) {
         if (link_ == LinkState::Pending) {

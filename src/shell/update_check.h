@@ -15,6 +15,7 @@
 #include <string>
 #include <string_view>
 
+#include "session/session.h"
 #include "shell/dialogs.h"
 
 class QNetworkAccessManager;
@@ -113,16 +114,16 @@ private:
 };
 
 // What the window's update buttons do. The window creates the buttons (check visible, download
-// hidden) and connects their clicks to check() and download(). `pban` and `vlk` are the window's
-// holders of the fetched version and link; buttons and holders must outlive the flow.
+// hidden) and connects their clicks to check() and download(). The fetched version and link go
+// into `state`; buttons and state must outlive the flow.
 class UpdateFlow final : public QObject {
     Q_OBJECT
 public:
     using UrlOpener = std::function<bool(const QUrl&)>;
 
     UpdateFlow(UpdateCheck::Options options, std::filesystem::path toolFolder, Dialogs& dialogs,
-               QWidget* owner, QPushButton* checkButton, QPushButton* downloadButton, QString* pban,
-               QString* vlk, UrlOpener openUrl = &QDesktopServices::openUrl,
+               QWidget* owner, QPushButton* checkButton, QPushButton* downloadButton,
+               session::UpdateState& state, UrlOpener openUrl = &QDesktopServices::openUrl,
                QObject* parent = nullptr);
 
     // Asks the host for its version. The check button stays disabled until the answer is in;
@@ -150,8 +151,7 @@ private:
     QPointer<QWidget> owner_;
     QPointer<QPushButton> checkButton_;
     QPointer<QPushButton> downloadButton_;
-    QString* pban_;
-    QString* vlk_;
+    session::UpdateState& state_;
     UrlOpener openUrl_;
     bool checking_ = false;
     LinkState link_ = LinkState::NotAsked;

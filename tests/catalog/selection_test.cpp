@@ -18,23 +18,23 @@ TEST(PatchSelection, DefaultsTurnOnAllButCrowdAndStadiumsAndChooseInEveryGroup) 
 
 TEST(PatchSelection, ChoosingClearsOnlyTheOtherVariantsOfTheSameContainer) {
     PatchSelection selection = PatchSelection::Defaults();
-    // Adboard, pitch and mark share UniOption1 but sit in separate containers.
-    selection.setOptionValue(OptionArray::UniOption1, 5, true);
+    // Adboard, pitch and mark share one row but sit in separate containers.
+    selection.setOptionValue(OptionArray::Other, 5, true);
     EXPECT_EQ(selection.chosen(GroupId::Pitch), 5);
-    EXPECT_FALSE(selection.optionValue(OptionArray::UniOption1, 4));
+    EXPECT_FALSE(selection.optionValue(OptionArray::Other, 4));
     EXPECT_EQ(selection.chosen(GroupId::Adboard), 0);
     EXPECT_EQ(selection.chosen(GroupId::Mark), 8);
 
     // False on a variant that is not chosen changes nothing; on the chosen one it clears it.
-    selection.setOptionValue(OptionArray::UniOption1, 6, false);
+    selection.setOptionValue(OptionArray::Other, 6, false);
     EXPECT_EQ(selection.chosen(GroupId::Pitch), 5);
-    selection.setOptionValue(OptionArray::UniOption1, 5, false);
+    selection.setOptionValue(OptionArray::Other, 5, false);
     EXPECT_FALSE(selection.chosen(GroupId::Pitch).has_value());
     EXPECT_EQ(selection.chosen(GroupId::Adboard), 0);
 
     // Buttons outside the arrays are ignored.
-    selection.setOptionValue(OptionArray::UniOption1, 11, true);
-    selection.setOptionValue(OptionArray::UniOption, -1, true);
+    selection.setOptionValue(OptionArray::Other, 11, true);
+    selection.setOptionValue(OptionArray::Ball, -1, true);
     EXPECT_EQ(selection.chosen(GroupId::Ball), 1);
 }
 

@@ -33,9 +33,9 @@ TEST(Settings, SaveThenLoadRestoresEverySwitchAndVariant) {
                    "F3", PatchSelection::Defaults()};
     saved.selection.setSwitchValue(0, 0);
     saved.selection.setSwitchValue(12, 1);
-    saved.selection.setOptionValue(OptionArray::UniOption, 3, true);
-    saved.selection.setOptionValue(OptionArray::UniOption1, 6, true);
-    saved.selection.setOptionValue(OptionArray::UniOption1, 8, false);  // mark: none chosen
+    saved.selection.setOptionValue(OptionArray::Ball, 3, true);
+    saved.selection.setOptionValue(OptionArray::Other, 6, true);
+    saved.selection.setOptionValue(OptionArray::Other, 8, false);  // mark: none chosen
     ASSERT_TRUE(SaveSettings(tool.path(), saved).ok());
 
     const Settings loaded = LoadSettings(tool.path());
@@ -96,7 +96,7 @@ TEST(Settings, FailedSaveIsReported) {
     EXPECT_FALSE(SaveSettings(tool.path(), Settings{}).ok());
 }
 
-TEST(Settings, ValueParsing) {
+TEST(Settings, NumbersRoundHalvesToEvenAndTruthValuesIgnoreLetterCase) {
     const std::pair<const char*, std::optional<int>> numbers[] = {
         {" 1 ", 1}, {"-3", -3}, {"1.5", 2}, {"2.5", 2}, {"abc", {}}, {"", {}}, {"1e99", {}}};
     for (const auto& [text, value] : numbers) {

@@ -129,15 +129,17 @@ std::string FindTrayIcon() {
         "break; done");
 }
 
-// Clicks the second of the five entries in the open tray menu, a visible window of the tool.
+// Clicks the second of the five entries in the open tray menu, a visible window of the tool that
+// is neither the main window nor a corner popup ("Alert") of about the same size.
 bool ClickSecondTrayMenuEntry() {
     return !Capture(
                 "for id in $(xdotool search --onlyvisible --classname '^kickvane$' "
                 "2>/dev/null); do eval $(xdotool getwindowgeometry --shell $id); "
                 "[ $HEIGHT -gt 60 ] && [ $HEIGHT -lt 300 ] && [ $WIDTH -lt 400 ] && "
-                "! xdotool getwindowname $id | grep -q '" +
+                "! xdotool getwindowname $id | grep -q -e '" +
                 kWindowTitle +
-                "' && xdotool mousemove --window $id $((WIDTH / 2)) $((HEIGHT * 3 / 10)) "
+                "' -e '^Alert$' && "
+                "xdotool mousemove --window $id $((WIDTH / 2)) $((HEIGHT * 3 / 10)) "
                 "click 1 && echo $id && break; done")
                 .empty();
 }
@@ -164,9 +166,15 @@ TEST_F(WindowTest, TrayIconAppearsWhenATrayStartsAndBringsTheHiddenWindowBack) {
     Capture("xdotool key F7");
     EXPECT_TRUE(WaitFor([&] { return fs::exists(applied()); }));
 
-    // The tray menu's second entry, "Hiện chương trình", brings it back.
-    Capture("xdotool mousemove --window " + FindTrayIcon() + " 10 10 click 3");
-    ASSERT_TRUE(WaitFor(ClickSecondTrayMenuEntry));
+    // The tray menu's second entry, "Hiện chương trình", brings it back. A click that reaches the
+    // icon while the tray host is still busy with it can go unanswered: then it clicks again.
+    ASSERT_TRUE(WaitFor([] {
+        Capture("xdotool mousemove --window " + FindTrayIcon() + " 10 10 click 3");
+        return WaitFor(ClickSecondTrayMenuEntry, std::chrono::seconds(3));
+    }))
+        << Capture(
+               "for id in $(xdotool search --onlyvisible --classname '^kickvane$'); do "
+               "xdotool getwindowname $id; xdotool getwindowgeometry $id; done");
     EXPECT_TRUE(WaitFor([] { return WindowVisible(kWindowTitle); }));
     EXPECT_TRUE(kickvane->Running());
 }

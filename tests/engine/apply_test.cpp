@@ -4,7 +4,6 @@
 
 #include <algorithm>
 
-#include "fake_ui.h"
 #include "support/trees.h"
 
 namespace kickvane::engine {
@@ -16,18 +15,10 @@ using testing::ReadText;
 using testing::TempDir;
 using testing::WriteFile;
 
-class ApplyTest : public ::testing::Test {
+class ApplyTest : public testing::ToolAndGameTest {
 protected:
-    void SetUp() override {
-        testing::MakeToolFolder(tool());
-        testing::MakeGameFolder(game());
-    }
-
-    fs::path tool() const { return dir_ / "tool"; }
-    fs::path game() const { return dir_ / "game"; }
-
     ApplyOutcome Apply(const PatchSelection& selection, const std::string& suffix = "") {
-        return ApplyPatches(tool(), game().string() + suffix, selection, ui_);
+        return ApplyPatches(tool(), game().string() + suffix, selection);
     }
 
     // Only the given categories on; the chosen variants stay at their defaults.
@@ -39,34 +30,35 @@ protected:
         }
         return selection;
     }
-
-    TempDir dir_;
-    testing::FakeUi ui_;
 };
 
 TEST_F(ApplyTest, FolderChecksStopTheRunWithTheirMessageBeforeAnyCopyOrSound) {
     fs::remove_all(game() / "data2");
-    EXPECT_EQ(Apply(PatchSelection::Defaults()).stoppedBy, RootProblem::DataMissing);
-    EXPECT_EQ(ui_.messages.shown, std::vector<std::string>{"Không tìm thấy thư mục chứa FIFA "
-                                                           "Online 2\r\nVui lòng kiểm tra lại "
-                                                           "đường dẫn"});
+    const ApplyOutcome noData = Apply(PatchSelection::Defaults());
+    EXPECT_EQ(noData.stoppedBy, RootProblem::DataMissing);
+    EXPECT_EQ(noData.message, (text::Message{text::Message::Kind::Component,
+                                             "Không tìm thấy thư mục chứa FIFA Online 2\r\nVui "
+                                             "lòng kiểm tra lại đường dẫn",
+                                             {}}));
 
     // The tool's own base set is checked first, with a plain message.
     fs::remove_all(tool() / "data");
     const ApplyOutcome outcome = Apply(PatchSelection::Defaults());
     EXPECT_EQ(outcome.stoppedBy, RootProblem::ToolDataMissing);
-    EXPECT_EQ(ui_.plain, std::vector<std::string>{
-                             "Thu muc nguon|Khong tim thay: " + (tool() / "data/data2").string() +
-                             "\r\nKiem tra lai duong dan"});
-    EXPECT_EQ(ui_.messages.shown.size(), 1u);
+    EXPECT_EQ(outcome.message,
+              (text::Message{text::Message::Kind::Plain,
+                             "Khong tim thay: " + (tool() / "data/data2").string() +
+                                 "\r\nKiem tra lai duong dan",
+                             "Thu muc nguon"}));
     EXPECT_TRUE(outcome.steps.empty());
-    EXPECT_TRUE(ui_.sounds.empty());
+    EXPECT_TRUE(outcome.signalSound.empty());
     EXPECT_FALSE(fs::exists(game() / "zdata/data2/ball"));
 }
 
 TEST_F(ApplyTest, NothingChosenStillPlaysTheSound) {
-    EXPECT_TRUE(Apply(Only({})).steps.empty());
-    EXPECT_EQ(ui_.sounds, std::vector<fs::path>{tool() / "sound.wav"});
+    const ApplyOutcome outcome = Apply(Only({}));
+    EXPECT_TRUE(outcome.steps.empty());
+    EXPECT_EQ(outcome.signalSound, tool() / "sound.wav");
 }
 
 TEST_F(ApplyTest, DefaultRunMergesIntoFoldersOfAnyCaseAndASecondRunCopiesNothing) {
@@ -105,7 +97,7 @@ TEST_F(ApplyTest, FailedStepsAreListedWithAReasonAndTheRunGoesOn) {
     PatchSelection selection = PatchSelection::Defaults();
     selection.setSwitchValue(12, 1);
     selection.setSwitchValue(13, 1);
-    selection.setOptionValue(OptionArray::UniOption1, 5, true);  // pitch Caro
+    selection.setOptionValue(OptionArray::Other, 5, true);  // pitch Caro
     const ApplyOutcome outcome = Apply(selection);
 
     ASSERT_FALSE(outcome.stopped());
@@ -116,12 +108,12 @@ TEST_F(ApplyTest, FailedStepsAreListedWithAReasonAndTheRunGoesOn) {
     }
     EXPECT_EQ(outcome.Failures().size(), 5u);
     EXPECT_EQ(ReadText(game() / "data2/gui/hud/Indicator/base.dds"), "base gui/hud/Indicator");
-    EXPECT_EQ(ui_.sounds.size(), 1u);
+    EXPECT_FALSE(outcome.signalSound.empty());
 }
 
 TEST_F(ApplyTest, PitchVariantEndsWithTheBaseSetsDirtAndLines) {
     PatchSelection selection = Only({1});
-    selection.setOptionValue(OptionArray::UniOption1, 5, true);
+    selection.setOptionValue(OptionArray::Other, 5, true);
     // A trailing separator on the game folder names the same folders.
     EXPECT_TRUE(Apply(selection, "/").Failures().empty());
     const fs::path textures = game() / "data2/pitch/textures";

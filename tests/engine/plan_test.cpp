@@ -35,14 +35,14 @@ TEST(BuildPlan, CategoriesRunInSwitchOrderAndOnlyWhenOn) {
 
 TEST(BuildPlan, VariantStepsComeBeforeTheFixedStepsAndAGroupWithoutChoiceHasOnlyThese) {
     PatchSelection ball = OnlyCategory(0);
-    ball.setOptionValue(OptionArray::UniOption, 1, false);
+    ball.setOptionValue(OptionArray::Ball, 1, false);
     EXPECT_TRUE(BuildPlan(ball).empty());
 
     PatchSelection adboard = OnlyCategory(2);
-    adboard.setOptionValue(OptionArray::UniOption1, 0, false);
+    adboard.setOptionValue(OptionArray::Other, 0, false);
     EXPECT_EQ(Describe(BuildPlan(adboard)),
               std::vector<std::string>{"merge ToolDataRoot\\ingame_ad -> DataRoot\\ingame_ad"});
-    adboard.setOptionValue(OptionArray::UniOption1, 3, true);
+    adboard.setOptionValue(OptionArray::Other, 3, true);
     EXPECT_EQ(
         Describe(BuildPlan(adboard)),
         (std::vector<std::string>{"merge ExtrasFolder\\adboard\\WC 2010 -> ZDataRoot\\adboard",
@@ -50,7 +50,7 @@ TEST(BuildPlan, VariantStepsComeBeforeTheFixedStepsAndAGroupWithoutChoiceHasOnly
 
     // The pitch variant is followed by the shared textures, then the base set's dirt and lines.
     PatchSelection pitch = OnlyCategory(1);
-    pitch.setOptionValue(OptionArray::UniOption1, 6, true);
+    pitch.setOptionValue(OptionArray::Other, 6, true);
     EXPECT_EQ(
         Describe(BuildPlan(pitch)),
         (std::vector<std::string>{
@@ -59,6 +59,23 @@ TEST(BuildPlan, VariantStepsComeBeforeTheFixedStepsAndAGroupWithoutChoiceHasOnly
             "copy ToolDataRoot\\pitch\\textures\\grass_dirt.dds -> DataRoot\\pitch\\textures",
             "copy ToolDataRoot\\pitch\\textures\\grass_pitchlines.dds -> DataRoot\\pitch\\textures",
             "merge ToolZDataRoot\\pitch -> ZDataRoot\\pitch"}));
+}
+
+TEST(BuildPlan, EachOptionCopiesTheSetItsCatalogRowNamesAndOnlyTheDefaultsTheBaseSet) {
+    for (const catalog::VariantGroup& group : catalog::Groups()) {
+        for (const catalog::PatchOption& option : group.options) {
+            EXPECT_EQ(option.sourceFolder.empty(), option.key.ends_with("MacDinh")) << option.key;
+            PatchSelection selection = OnlyCategory(group.ownerSwitch);
+            selection.setOptionValue(group.array, option.index, true);
+            const std::vector<PlanStep> steps = BuildPlan(selection);
+            ASSERT_FALSE(steps.empty()) << option.key;
+            const Location& source = steps.front().source;
+            EXPECT_EQ(source.root == Root::Extras, !option.sourceFolder.empty()) << option.key;
+            EXPECT_TRUE(source.root != Root::Extras ||
+                        source.relative.starts_with(option.sourceFolder))
+                << option.key;
+        }
+    }
 }
 
 TEST(BuildPlan, InterfaceStepsRunOnlyWhenTheirSourceExists) {

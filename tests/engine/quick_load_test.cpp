@@ -2,14 +2,12 @@
 
 #include <gtest/gtest.h>
 
-#include "fake_ui.h"
 #include "support/temp_dir.h"
 
 namespace kickvane::engine {
 namespace {
 
 namespace fs = std::filesystem;
-using testing::FakeUi;
 using testing::ReadText;
 using testing::TempDir;
 using testing::WriteFile;
@@ -28,10 +26,9 @@ protected:
     fs::path source() const { return dir_ / "source"; }
     fs::path heads() const { return tool() / "data/data2/players/heads"; }
 
-    QuickLoadOutcome Load() { return QuickLoad(tool(), source(), ui_); }
+    QuickLoadOutcome Load() { return QuickLoad(tool(), source()); }
 
     TempDir dir_;
-    FakeUi ui_;
 };
 
 TEST_F(QuickLoadTest, DirectFilesGoFirstAndNestedFormsOnlyWhereNoDirectFileMatches) {
@@ -42,7 +39,9 @@ TEST_F(QuickLoadTest, DirectFilesGoFirstAndNestedFormsOnlyWhereNoDirectFileMatch
     WriteFile(source() / "Heads/Textures/.face8.dds", "hidden");
     WriteFile(source() / "bodies/textures/skin3.dds", "nested skin");
     WriteFile(source() / "Textures/Ball10.dds", "nested ball");
-    EXPECT_TRUE(Load().ok());
+    const QuickLoadOutcome outcome = Load();
+    EXPECT_TRUE(outcome.ok());
+    EXPECT_FALSE(outcome.message);
 
     EXPECT_EQ(ReadText(heads() / "textures/CM_2.DDS"), "top cm");
     EXPECT_FALSE(fs::exists(heads() / "textures/cm_9.dds"));
@@ -50,19 +49,20 @@ TEST_F(QuickLoadTest, DirectFilesGoFirstAndNestedFormsOnlyWhereNoDirectFileMatch
     EXPECT_FALSE(fs::exists(heads() / "textures/.face8.dds"));
     EXPECT_EQ(ReadText(tool() / "data/data2/players/bodies/textures/skin3.dds"), "nested skin");
     EXPECT_EQ(ReadText(tool() / "data/zdata/data2/ball/textures/Ball10.dds"), "nested ball");
-    EXPECT_EQ(ui_.popups, std::vector<std::string>{"Hoàn tất!"});
-    EXPECT_TRUE(ui_.messages.shown.empty());
 }
 
 TEST_F(QuickLoadTest, NoFolderOrNoPlainFileStopsWithTheMessage) {
-    EXPECT_TRUE(QuickLoad(tool(), fs::path(), ui_).stopped);
+    const QuickLoadOutcome none = QuickLoad(tool(), fs::path());
+    EXPECT_TRUE(none.stopped);
     WriteFile(source() / "heads/textures/face1.dds", "nested only");
     WriteFile(source() / ".hidden", "x");
     const QuickLoadOutcome outcome = Load();
 
     EXPECT_TRUE(outcome.stopped);
-    EXPECT_EQ(ui_.messages.shown, std::vector<std::string>(2, "Bạn chưa chọn thư mục nào!"));
-    EXPECT_TRUE(ui_.popups.empty());
+    for (const QuickLoadOutcome& stopped : {none, outcome}) {
+        ASSERT_TRUE(stopped.message);
+        EXPECT_EQ(stopped.message->text, "Bạn chưa chọn thư mục nào!");
+    }
     EXPECT_FALSE(fs::exists(heads() / "textures/face1.dds"));
 }
 
@@ -77,7 +77,7 @@ TEST_F(QuickLoadTest, FailedPatternIsNamedAndTheOthersGoOn) {
     EXPECT_NE(outcome.failures[0].find("skin*.dds"), std::string::npos);
     EXPECT_TRUE(fs::exists(heads() / "textures/face1.dds"));
     EXPECT_TRUE(fs::exists(heads() / "hhead1.pc.ea3.em"));
-    EXPECT_EQ(ui_.popups.size(), 1u);
+    EXPECT_FALSE(outcome.stopped);
 }
 
 TEST(MatchesWildcard, FollowsWindowsRulesWithoutCase) {

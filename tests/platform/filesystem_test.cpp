@@ -46,12 +46,24 @@ TEST(ResolveCaseInsensitive, MatchesEveryComponentAndKeepsSpellingOfMissingTail)
     // Doubled and trailing separators, as "D:\" + "\data2" gives, name the same folder.
     EXPECT_EQ(ResolveCaseInsensitive(fs::path(dir.path().string() + "//DATA2//ball/")),
               dir / "Data2/Ball");
+}
 
-    // Of several spellings the exact one wins, else the first in name order.
-    fs::create_directories(dir / "Data2/ball");
-    EXPECT_EQ(ResolveCaseInsensitive(dir / "Data2/Ball"), dir / "Data2/Ball");
-    EXPECT_EQ(ResolveCaseInsensitive(dir / "Data2/ball"), dir / "Data2/ball");
-    EXPECT_EQ(ResolveCaseInsensitive(dir / "Data2/BALL"), dir / "Data2/Ball");
+// Of several spellings the exact one wins, else the first in name order. Each folder gets the
+// spellings in another order, so that no order of listing can pick the right one every time.
+TEST(ResolveCaseInsensitive, OfSeveralSpellingsTakesTheExactElseTheFirstInNameOrder) {
+    TempDir dir;
+    const std::vector<std::string> spellings{"ball", "bALL", "BaLL", "Ball"};  // "BaLL" first
+    for (size_t rotation = 0; rotation < spellings.size(); ++rotation) {
+        const fs::path folder = dir / std::to_string(rotation);
+        for (size_t i = 0; i < spellings.size(); ++i) {
+            fs::create_directories(folder / spellings[(i + rotation) % spellings.size()]);
+        }
+        EXPECT_EQ(ResolveCaseInsensitive(folder / "BALL"), folder / "BaLL") << rotation;
+        EXPECT_EQ(EntriesByFoldedName(folder).at("ball"), "BaLL") << rotation;
+        for (const std::string& exact : spellings) {
+            EXPECT_EQ(ResolveCaseInsensitive(folder / exact), folder / exact);
+        }
+    }
 }
 
 TEST(ReplaceFile, ReplacesContentTakesSourceTimeAndLeavesNoTemporaryFile) {

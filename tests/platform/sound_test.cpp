@@ -41,19 +41,26 @@ std::string TinyWav(uint32_t samples) {
     return wav;
 }
 
+// A file goes to the sound system by its absolute path; anything else plays the default sound.
 // Whatever the machine has for audio (often nothing on a build server), playing returns and the
-// process goes on; a second call reuses what the first set up.
-TEST(PlaySoundAsync, ReturnsForMissingValidAndBrokenFiles) {
+// process goes on, and a second call reuses what the first set up.
+TEST(PlaySoundAsync, HandsOverRegularFilesAndOtherwiseFallsBackToTheDefaultSound) {
     TempDir dir;
     WriteFile(dir / "sound.wav", TinyWav(800));
     WriteFile(dir / "broken.wav", "RIFF????WAVE");
 
-    PlaySoundAsync(dir / "missing.wav");
-    PlaySoundAsync(dir / "sound.wav");
-    PlaySoundAsync(dir / "broken.wav");
-    PlaySoundAsync(dir.path());  // a folder, not a file
-    PlaySoundAsync(dir / "sound.wav");
-    SUCCEED();
+    EXPECT_EQ(SoundFileToPlay(dir / "sound.wav"), dir / "sound.wav");
+    EXPECT_EQ(SoundFileToPlay(dir / "broken.wav"), dir / "broken.wav");  // the player decides
+    EXPECT_EQ(SoundFileToPlay(dir / "missing.wav"), std::nullopt);
+    EXPECT_EQ(SoundFileToPlay(dir.path()), std::nullopt);  // a folder, not a file
+    const std::filesystem::path relative =
+        std::filesystem::relative(dir / "sound.wav", std::filesystem::current_path());
+    ASSERT_TRUE(relative.is_relative());
+    EXPECT_EQ(SoundFileToPlay(relative), std::filesystem::absolute(relative));
+
+    for (const char* name : {"missing.wav", "sound.wav", "broken.wav", "", "sound.wav"}) {
+        PlaySoundAsync(dir / name);
+    }
 }
 
 }  // namespace

@@ -32,7 +32,7 @@ TEST(FadeModel, StartUpFadesFromFifteenToTwoFortyInSixteenTicks) {
 
 // Each fade starts where the last one stopped; one already at or beyond its target still takes
 // one step, and the opacity stays within 0 and 255.
-TEST(FadeModel, EdgeCases) {
+TEST(FadeModel, EachFadeStartsWhereTheLastStoppedAndStaysWithinZeroTo255) {
     FadeModel fade;
     RunFade(fade, 240, 15);
     EXPECT_EQ(RunFade(fade, 150, -15), (std::vector<int>{225, 210, 195, 180, 165, 150}));

@@ -2,11 +2,10 @@
 
 #include <QStringList>
 #include <deque>
-#include <set>
 
-#include "platform/keystate.h"
 #include "shell/dialogs.h"
 #include "shell/tray.h"
+#include "support/fake_keys.h"
 
 namespace kickvane::testing {
 
@@ -35,17 +34,6 @@ public:
     QStringList messages;
     QStringList notices;
     QStringList popups;
-};
-
-// Key state set by the test: a key reads as pressed once, or as held.
-class FakeKeySampler final : public platform::KeySampler {
-public:
-    platform::KeySample Sample(int virtualKey) override {
-        return {held.count(virtualKey) > 0, pressed.erase(virtualKey) > 0};
-    }
-
-    std::set<int> held;
-    std::set<int> pressed;
 };
 
 // A tray that records whether its icon is there; `hostRunning` says whether a tray host shows it.

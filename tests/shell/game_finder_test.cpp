@@ -72,7 +72,7 @@ protected:
 
 TEST_F(GameFinderTest, SitsBetweenTheBoxAndTheChangeFolderButton) {
     GameFinderButton* button = AddGameFinder(box_, browse_);
-    EXPECT_EQ(button->text(), QStringLiteral("Tìm"));
+    EXPECT_EQ(button->text(), QStringLiteral("Tì&m"));
     EXPECT_EQ(button->parentWidget(), &panel_);
     EXPECT_LT(box_->geometry().right(), button->geometry().left());
     EXPECT_LT(button->geometry().right(), browse_->geometry().left());

@@ -16,10 +16,10 @@ using testing::WriteFile;
 
 class MainWindowTest : public testing::WindowFixture {
 protected:
-    static int VisiblePanels(const MainWindow& window) {
+    static int VisiblePanels(MainWindow& window) {
         int visible = 0;
         for (int i = 0; i < kTabCount; ++i) {
-            visible += window.panel(i)->isVisibleTo(&window) ? 1 : 0;
+            visible += window.panels().panel(i)->isVisibleTo(&window) ? 1 : 0;
         }
         return visible;
     }
@@ -27,34 +27,56 @@ protected:
 
 TEST_F(MainWindowTest, StartsOnTheFirstTabAndEachTabClickShowsExactlyOnePanel) {
     auto window = Open();
-    EXPECT_EQ(window->selection(), catalog::PatchSelection::Defaults());
+    CatalogPanels& panels = window->panels();
+    EXPECT_EQ(window->session().selection(), catalog::PatchSelection::Defaults());
     auto expectShown = [&](int tab) {
-        EXPECT_EQ(window->currentTab(), tab);
+        EXPECT_EQ(panels.currentTab(), tab);
         EXPECT_EQ(VisiblePanels(*window), 1);
-        EXPECT_TRUE(window->panel(tab)->isVisibleTo(window.get()));
+        EXPECT_TRUE(panels.panel(tab)->isVisibleTo(window.get()));
     };
     expectShown(0);
     for (int tab : {2, 2, 3, 0, 1}) {
-        Click(window->tabHead(tab));
+        Click(panels.tabHead(tab));
         expectShown(tab);
     }
-    EXPECT_EQ(window->panel(0)->y(), window->tabHeight() + 16);
+    EXPECT_EQ(panels.panel(0)->y(), panels.tabHeight() + 16);
     for (int i = 0; i < kTabCount; ++i) {
-        EXPECT_EQ(window->tabHead(i)->size(), window->tabHead(0)->size());
-        EXPECT_EQ(window->panel(i)->geometry(), window->panel(0)->geometry());
+        EXPECT_EQ(panels.tabHead(i)->size(), panels.tabHead(0)->size());
+        EXPECT_EQ(panels.panel(i)->geometry(), panels.panel(0)->geometry());
     }
+}
+
+TEST_F(MainWindowTest, TabSwitchesNeverPutTheFocusInTheHotkeyBox) {
+    auto window = Open();
+    window->show();
+    window->activateWindow();
+    ASSERT_TRUE(QTest::qWaitForWindowActive(window.get()));
+    CatalogPanels& panels = window->panels();
+    QComboBox* hotkey = window->buttons().hotkeyBox();
+    panels.gameFolderBox()->setFocus();
+    for (int tab : {1, 2, 3, 0, 3}) {
+        Click(panels.tabHead(tab));
+        EXPECT_FALSE(hotkey->isAncestorOf(QApplication::focusWidget()) ||
+                     QApplication::focusWidget() == hotkey)
+            << "after tab " << tab;
+    }
+    // A key typed after the switches does not reach the hotkey.
+    QTest::keyClick(QApplication::focusWidget(), Qt::Key_X);
+    EXPECT_EQ(hotkey->currentText(), "F7");
+    EXPECT_EQ(window->session().activeHotkey(), "F7");
 }
 
 TEST_F(MainWindowTest, OptionButtonsFollowTheContainerRule) {
     auto window = Open();
-    Click(window->tabHead(3));
-    Click(window->optionButton(OptionArray::UniOption1, 5));
-    EXPECT_FALSE(window->optionButton(OptionArray::UniOption1, 4)->isChecked());
-    EXPECT_TRUE(window->optionButton(OptionArray::UniOption1, 0)->isChecked());
+    CatalogPanels& panels = window->panels();
+    Click(panels.tabHead(3));
+    Click(panels.optionButton(OptionArray::Other, 5));
+    EXPECT_FALSE(panels.optionButton(OptionArray::Other, 4)->isChecked());
+    EXPECT_TRUE(panels.optionButton(OptionArray::Other, 0)->isChecked());
     // Clicking the chosen button again keeps it chosen.
-    Click(window->optionButton(OptionArray::UniOption1, 5));
-    EXPECT_TRUE(window->optionButton(OptionArray::UniOption1, 5)->isChecked());
-    EXPECT_EQ(window->selection().chosen(GroupId::Pitch), 5);
+    Click(panels.optionButton(OptionArray::Other, 5));
+    EXPECT_TRUE(panels.optionButton(OptionArray::Other, 5)->isChecked());
+    EXPECT_EQ(window->session().selection().chosen(GroupId::Pitch), 5);
 }
 
 TEST_F(MainWindowTest, SettingsLoadIntoTheWidgetsAndSaveRoundTrips) {
@@ -63,54 +85,54 @@ TEST_F(MainWindowTest, SettingsLoadIntoTheWidgetsAndSaveRoundTrips) {
               "[Bong]\r\nUCL 2011=True\r\n");
     {
         auto window = Open();
-        EXPECT_EQ(window->gameFolderBox()->text(), "D:\\Games\\FO2");
-        EXPECT_EQ(window->hotkeyBox()->currentText(), "F10");
-        EXPECT_EQ(window->categoryCheck(3)->checkState(), Qt::PartiallyChecked);
-        EXPECT_TRUE(window->optionButton(OptionArray::UniOption, 3)->isChecked());
+        CatalogPanels& panels = window->panels();
+        EXPECT_EQ(panels.gameFolderBox()->text(), "D:\\Games\\FO2");
+        EXPECT_EQ(window->buttons().hotkeyBox()->currentText(), "F10");
+        EXPECT_EQ(panels.categoryCheck(3)->checkState(), Qt::PartiallyChecked);
+        EXPECT_TRUE(panels.optionButton(OptionArray::Ball, 3)->isChecked());
 
-        Click(window->categoryCheck(0));
-        Click(window->tabHead(2));
-        Click(window->optionButton(OptionArray::UniOption3, 6));
-        window->gameFolderBox()->setText("/home/player/FIFA Online 2");
-        window->hotkeyBox()->setCurrentText("F2");
-        Click(window->saveButton());
+        Click(panels.categoryCheck(0));
+        Click(panels.tabHead(2));
+        Click(panels.optionButton(OptionArray::Scoreboard, 6));
+        panels.gameFolderBox()->setText("/home/player/FIFA Online 2");
+        window->buttons().hotkeyBox()->setCurrentText("F2");
+        Click(window->buttons().save());
         EXPECT_EQ(dialogs_.popups, QStringList{"Đã lưu thiết lập!|2"});
     }
-    auto reopened = Open();
-    EXPECT_EQ(reopened->gameFolderBox()->text(), "/home/player/FIFA Online 2");
-    EXPECT_EQ(reopened->hotkeyBox()->currentText(), "F2");
-    EXPECT_FALSE(reopened->categoryCheck(0)->isChecked());
-    EXPECT_TRUE(reopened->optionButton(OptionArray::UniOption3, 6)->isChecked());
+    const catalog::Settings saved = catalog::LoadSettings(tool());
+    EXPECT_EQ(saved.gameFolder, "/home/player/FIFA Online 2");
+    EXPECT_EQ(saved.hotkey, "F2");
+    EXPECT_FALSE(saved.selection.isOn(0));
+    EXPECT_EQ(saved.selection.chosen(GroupId::Scoreboard), 6);
 }
 
 TEST_F(MainWindowTest, FailedSaveShowsAnErrorInsteadOfThePopup) {
     std::filesystem::create_directories(tool() / "ThietLap.ini");  // a folder where the file goes
     auto window = Open();
-    Click(window->saveButton());
+    Click(window->buttons().save());
     EXPECT_TRUE(dialogs_.popups.isEmpty());
     ASSERT_EQ(dialogs_.messages.size(), 1);
     EXPECT_TRUE(dialogs_.messages[0].startsWith("Thông báo|Không lưu được thiết lập!"));
 }
 
-TEST_F(MainWindowTest, HotkeyTickAppliesThePatchesOnlyForAKeyThatIsNamedAndPressed) {
+TEST_F(MainWindowTest, AHotkeyTextThatNamesNoKeyIsNamedBesideTheBox) {
     testing::MakeToolFolder(tool());
     testing::MakeGameFolder(game());
-    // "f7" names no key: it stays as written and triggers nothing.
     WriteFile(tool() / "ThietLap.ini",
               "[Thiet lap]\r\nDuongDan=" + game().string() + "\r\nPhimTat=f7\r\n");
     auto window = Open();
-    EXPECT_EQ(window->hotkeyBox()->currentText(), "f7");
-    keys_->pressed.insert(0x76);
+    CommandButtons& buttons = window->buttons();
+    EXPECT_EQ(buttons.hotkeyBox()->currentText(), "f7");
+    EXPECT_FALSE(buttons.hotkeyProblem()->isHidden());
+    EXPECT_TRUE(buttons.hotkeyProblem()->text().contains("chưa hoạt động"));
+
+    buttons.hotkeyBox()->setCurrentText("F9");
+    EXPECT_TRUE(buttons.hotkeyProblem()->isHidden());
+    buttons.hotkeyBox()->setCurrentText("F");  // typing on: the last key stays in use
+    EXPECT_TRUE(buttons.hotkeyProblem()->text().contains("vẫn dùng F9"));
+    keys_->pressed.insert(0x78);
     window->pollHotkey();
-    EXPECT_TRUE(sounds_.empty());
-    window->hotkeyBox()->setCurrentText("F7");
-    window->pollHotkey();  // pressed since the last sample
-    window->pollHotkey();  // released meanwhile: no further run
     EXPECT_EQ(sounds_.size(), 1u);
-    keys_->held.insert(0x76);
-    window->pollHotkey();
-    window->pollHotkey();
-    EXPECT_EQ(sounds_.size(), 3u);
     EXPECT_TRUE(dialogs_.notices.isEmpty());
 }
 
@@ -118,7 +140,7 @@ TEST_F(MainWindowTest, FailedStepsOfARunAreNamedInANotice) {
     testing::MakeToolFolder(tool());
     testing::MakeGameFolder(game(), /*withZData=*/false);
     auto window = Open();
-    window->gameFolderBox()->setText(QString::fromStdString(game().string()));
+    window->panels().gameFolderBox()->setText(QString::fromStdString(game().string()));
     window->applyPatchesNow();
     ASSERT_EQ(dialogs_.notices.size(), 1);
     EXPECT_TRUE(dialogs_.notices[0].contains(
@@ -129,9 +151,9 @@ TEST_F(MainWindowTest, FailedStepsOfARunAreNamedInANotice) {
 TEST_F(MainWindowTest, LauncherMissingShowsTheMessageAndKeepsTheWindow) {
     std::filesystem::create_directories(game());
     auto window = Open();
-    window->gameFolderBox()->setText(QString::fromStdString(game().string()));
+    window->panels().gameFolderBox()->setText(QString::fromStdString(game().string()));
     window->show();
-    Click(window->launchButton());
+    Click(window->buttons().launch());
     EXPECT_EQ(
         dialogs_.messages,
         QStringList{"Thông báo|Không tìm thấy Gameloader.exe hoặc đường dẫn không chính xác!"});
@@ -145,20 +167,42 @@ TEST_F(MainWindowTest, BrowseAndQuickLoadRememberTheirFolders) {
     auto window = Open();
 
     dialogs_.folders = {std::nullopt};
-    Click(window->browseButton());
-    EXPECT_EQ(window->gameFolderBox()->text(), "C:\\Program Files");
+    Click(window->panels().browseButton());
+    EXPECT_EQ(window->panels().gameFolderBox()->text(), "C:\\Program Files");
 
     // Cancelled on first use: nothing was chosen yet.
     dialogs_.folders = {std::nullopt};
-    Click(window->quickLoadButton());
+    Click(window->buttons().quickLoad());
     EXPECT_EQ(dialogs_.messages, QStringList{"Thông báo|Bạn chưa chọn thư mục nào!"});
 
     dialogs_.folders = {QString::fromStdString((dir_ / "faces").string()), std::nullopt};
-    Click(window->quickLoadButton());
+    Click(window->buttons().quickLoad());
     std::filesystem::remove(tool() / "data/data2/players/heads/textures/face1.dds");
-    Click(window->quickLoadButton());  // cancelled: the folder chosen before is loaded again
+    Click(window->buttons().quickLoad());  // cancelled: the folder chosen before is loaded again
     EXPECT_EQ(dialogs_.popups, QStringList({"Hoàn tất!|2", "Hoàn tất!|2"}));
     EXPECT_TRUE(std::filesystem::exists(tool() / "data/data2/players/heads/textures/face1.dds"));
+}
+
+TEST_F(MainWindowTest, EveryButtonHasAMnemonicAndEveryEntryAnAccessibleName) {
+    auto window = Open();
+    QStringList mnemonics;
+    for (const QPushButton* button : window->findChildren<QPushButton*>()) {
+        const QString caption = button->text();
+        const qsizetype amp = caption.indexOf(QLatin1Char('&'));
+        ASSERT_GE(amp, 0) << caption.toStdString();
+        mnemonics << caption.mid(amp + 1, 1).toLower();
+    }
+    // "Tải về" takes the place of "Kiểm tra cập nhật"; the others are all seen at once.
+    mnemonics.removeDuplicates();
+    EXPECT_EQ(mnemonics.size(), window->findChildren<QPushButton*>().size());
+    for (const QAbstractButton* entry : window->findChildren<QAbstractButton*>()) {
+        if (!qobject_cast<const QPushButton*>(entry)) {
+            EXPECT_FALSE(entry->accessibleName().isEmpty());
+        }
+    }
+    EXPECT_EQ(window->panels().categoryCheck(12)->accessibleName(), "Thay đổi Cổ động viên");
+    EXPECT_EQ(window->panels().optionButton(OptionArray::Scoreboard, 4)->accessibleName(),
+              "K+ Nhịp sống");
 }
 
 }  // namespace

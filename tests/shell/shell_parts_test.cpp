@@ -22,12 +22,7 @@ protected:
     }
 
     static QAction* TrayEntry(MainWindow& window, const QString& text) {
-        for (QAction* action : window.trayMenu()->actions()) {
-            if (action->text() == text) {
-                return action;
-            }
-        }
-        return nullptr;
+        return window.tray().entry(text);
     }
 
     static void SavePicture(QWidget& widget, const QString& name) {
@@ -51,7 +46,7 @@ TEST_F(ShellPartsTest, StartUpFadesInToTwoFortyAndTranslucencyKeepsTheFadesPlace
 
     EXPECT_EQ(window->makeTranslucent(256), TranslucentResult::OutOfRange);
     EXPECT_EQ(window->makeTranslucent(-1), TranslucentResult::OutOfRange);
-    Click(window->translucentButton());
+    Click(window->buttons().translucent());
     EXPECT_EQ(window->fade().alpha(), 240);  // "Trans" does not move the fade
     TrayEntry(*window, "Hiện chương trình")->trigger();
     window->fadeTick();
@@ -64,7 +59,7 @@ TEST_F(ShellPartsTest, TrayMenuEntriesAndRunningHidden) {
 
     // "Chạy ẩn": fade towards 150, out of sight, popup; the icon stays.
     FinishFade(*window);
-    Click(window->runHiddenButton());
+    Click(window->buttons().runHidden());
     EXPECT_FALSE(window->isVisible());
     EXPECT_TRUE(tray_->added);
     EXPECT_EQ(dialogs_.popups, QStringList{"Ẩn xuống khay hệ thống!|2"});
@@ -80,7 +75,7 @@ TEST_F(ShellPartsTest, TrayMenuEntriesAndRunningHidden) {
     EXPECT_TRUE(window->isVisible());
 
     // The launcher button hides the window to the tray and says so.
-    Click(window->launchButton());
+    Click(window->buttons().launch());
     EXPECT_EQ(launches_, 2);
     EXPECT_FALSE(window->isVisible());
     EXPECT_EQ(dialogs_.popups.last(), "Ẩn xuống khay hệ thống!|2");
@@ -94,7 +89,7 @@ TEST_F(ShellPartsTest, TrayMenuEntriesAndRunningHidden) {
 TEST_F(ShellPartsTest, AboutAndHelpOpenAsSideWindowsOfTheMainWindow) {
     auto window = Show();
     TrayEntry(*window, "Thông tin")->trigger();
-    Click(window->helpButton());
+    Click(window->buttons().help());
     for (const char* title : {"Thong tin", "Huong dan"}) {
         QWidget* side = nullptr;
         for (QWidget* widget : QApplication::topLevelWidgets()) {
@@ -108,7 +103,7 @@ TEST_F(ShellPartsTest, AboutAndHelpOpenAsSideWindowsOfTheMainWindow) {
 TEST_F(ShellPartsTest, WithoutATrayHostHidingMinimisesAndClosingRemovesTheIcon) {
     hostRunning_ = false;
     auto window = Show();
-    Click(window->runHiddenButton());
+    Click(window->buttons().runHidden());
     EXPECT_TRUE(window->isVisible());
     EXPECT_TRUE(window->isMinimized());
 
@@ -124,25 +119,26 @@ TEST_F(ShellPartsTest, SkinsRecolourTheEntriesAndUseTheirPicturesKeepingTheTab) 
         WritePicture(tool() / "skin" / (std::string(name) + ".jpg"), Qt::darkGray);
     }
     auto window = Show();
+    CatalogPanels& panels = window->panels();
     const auto labelColour = [&] {
-        return window->optionLabel(catalog::OptionArray::UniOption1, 10)
+        return panels.optionLabel(catalog::OptionArray::Other, 10)
             ->palette()
             .color(QPalette::WindowText);
     };
-    Click(window->tabHead(2));
-    Click(window->skinButton(2));
-    EXPECT_EQ(window->hiddenTexts().skn, "skin2");
-    EXPECT_EQ(window->currentTab(), 2);
+    Click(panels.tabHead(2));
+    Click(window->buttons().skin(2));
+    EXPECT_EQ(window->skins().activeSkin(), "skin2");
+    EXPECT_EQ(panels.currentTab(), 2);
     EXPECT_EQ(labelColour(), QColor(Qt::white));
-    EXPECT_TRUE(window->tabHead(2)->pictureFile().endsWith("skin2_selected.jpg"));
-    EXPECT_TRUE(window->tabHead(0)->pictureFile().endsWith("skin2_unselect.jpg"));
+    EXPECT_TRUE(panels.tabHead(2)->pictureFile().endsWith("skin2_selected.jpg"));
+    EXPECT_TRUE(panels.tabHead(0)->pictureFile().endsWith("skin2_unselect.jpg"));
     // skin2_panel.jpg is missing: the panels keep skin 1's picture.
-    EXPECT_TRUE(window->panel(2)->pictureFile().endsWith("skin1_panel.jpg"));
+    EXPECT_TRUE(panels.panel(2)->pictureFile().endsWith("skin1_panel.jpg"));
     EXPECT_EQ(dialogs_.popups, QStringList{"Đã thay đổi giao diện!|1"});
 
-    Click(window->tabHead(1));
-    EXPECT_TRUE(window->tabHead(1)->pictureFile().endsWith("skin2_selected.jpg"));
-    Click(window->skinButton(1));
+    Click(panels.tabHead(1));
+    EXPECT_TRUE(panels.tabHead(1)->pictureFile().endsWith("skin2_selected.jpg"));
+    Click(window->buttons().skin(1));
     EXPECT_EQ(labelColour(), QColor(Qt::black));
 }
 
@@ -151,36 +147,37 @@ TEST_F(ShellPartsTest, LabelClicksShowTheirPreviewInOneSharedWindow) {
     WritePicture(tool() / "img/t4_img_10.jpg", Qt::green);
     WritePicture(tool() / "img/t1_img_12.jpg", Qt::blue);
     auto window = Show();
+    CatalogPanels& panels = window->panels();
 
-    Click(window->categoryLabel(12));
-    ASSERT_NE(window->previewWindow(), nullptr);
-    EXPECT_TRUE(window->previewWindow()->pictureFile().endsWith("img/t1_img_12.jpg"));
-    PreviewWindow* preview = window->previewWindow();
-    Click(window->tabHead(1));
-    Click(window->optionLabel(catalog::OptionArray::UniOption, 3));
-    EXPECT_EQ(window->previewWindow(), preview);
+    Click(panels.categoryLabel(12));
+    PreviewWindow* preview = window->sideWindows().preview();
+    ASSERT_NE(preview, nullptr);
+    EXPECT_TRUE(preview->pictureFile().endsWith("img/t1_img_12.jpg"));
+    Click(panels.tabHead(1));
+    Click(panels.optionLabel(catalog::OptionArray::Ball, 3));
+    EXPECT_EQ(window->sideWindows().preview(), preview);
     EXPECT_TRUE(preview->pictureFile().endsWith("img/t2_img_3.jpg"));
     EXPECT_EQ(preview->windowTitle(), "Xem truoc");
 
-    Click(window->tabHead(3));
-    Click(window->optionLabel(catalog::OptionArray::UniOption1, 10));
+    Click(panels.tabHead(3));
+    Click(panels.optionLabel(catalog::OptionArray::Other, 10));
     EXPECT_TRUE(preview->pictureFile().endsWith("img/t4_img_10.jpg"));
     // No t4_img_9.jpg: the window keeps the picture it shows.
-    Click(window->optionLabel(catalog::OptionArray::UniOption1, 9));
+    Click(panels.optionLabel(catalog::OptionArray::Other, 9));
     EXPECT_TRUE(preview->pictureFile().endsWith("img/t4_img_10.jpg"));
     EXPECT_TRUE(preview->isVisible());
 }
 
 TEST_F(ShellPartsTest, CheckButtonRunsTheUpdateCheckAndReportsAnUnreachableHost) {
     auto window = Show();
-    QSignalSpy finished(window->updateFlow(), &UpdateFlow::checkFinished);
-    Click(window->checkUpdateButton());
+    QSignalSpy finished(&window->updateFlow(), &UpdateFlow::checkFinished);
+    Click(window->buttons().checkUpdate());
     ASSERT_TRUE(finished.wait(15000));
     ASSERT_EQ(dialogs_.messages.size(), 1);
     EXPECT_TRUE(dialogs_.messages[0].contains("Không kiểm tra được phiên bản mới"));
-    EXPECT_TRUE(window->checkUpdateButton()->isVisible());
-    EXPECT_TRUE(window->checkUpdateButton()->isEnabled());
-    EXPECT_FALSE(window->downloadButton()->isVisible());
+    EXPECT_TRUE(window->buttons().checkUpdate()->isVisible());
+    EXPECT_TRUE(window->buttons().checkUpdate()->isEnabled());
+    EXPECT_FALSE(window->buttons().download()->isVisible());
 }
 
 TEST_F(ShellPartsTest, PopupWindowFollowsItsModelAndClosesWhenItFinishes) {
@@ -190,7 +187,7 @@ TEST_F(ShellPartsTest, PopupWindowFollowsItsModelAndClosesWhenItFinishes) {
     for (int i = 0; i < 5; ++i) {
         popup->Tick();
     }
-    const text::PixelRect rect = popup->model().WindowPixels();
+    const popup::PixelRect rect = popup->model().WindowPixels();
     EXPECT_EQ(popup->geometry(), QRect(rect.left, rect.top, rect.width, rect.height));
     // Rising, resting, leaving: it closes and deletes itself at the end.
     for (int i = 0; i < 2000 && popup && popup->isVisible(); ++i) {
@@ -202,22 +199,38 @@ TEST_F(ShellPartsTest, PopupWindowFollowsItsModelAndClosesWhenItFinishes) {
     EXPECT_TRUE(popup.isNull());
 }
 
-// Pictures of the finished window for people to look at, from the tool folder the build laid out.
-TEST_F(ShellPartsTest, ScreenshotsOfBothSkinsAndAPreview) {
+// The built artwork: the header buttons stand on the plain part of each skin's banner, clear of
+// the tool's name and version; pictures of the finished window are kept for people to look at.
+TEST_F(ShellPartsTest, HeaderButtonsLeaveTheBannerTitleVisibleInBothSkins) {
     const std::filesystem::path tool = KICKVANE_TOOL_DIR;
     if (!std::filesystem::exists(tool / "skin/skin2_bg.jpg")) {
         GTEST_SKIP() << "the artwork is not built";
     }
     auto window = Show(tool);
     FinishFade(*window);
-    SavePicture(*window, "window-skin1.png");
-    window->applySkin(DarkSkin());
-    SavePicture(*window, "window-skin2.png");
-    Click(window->tabHead(1));
-    Click(window->optionLabel(catalog::OptionArray::UniOption, 3));
-    ASSERT_NE(window->previewWindow(), nullptr);
-    SavePicture(*window->previewWindow(), "preview-ball-3.png");
-    EXPECT_FALSE(window->previewWindow()->pictureFile().isEmpty());
+    for (const SkinLook& look : {LightSkin(), DarkSkin()}) {
+        window->applySkin(look);
+        const QImage banner = window->skins().background().toImage();
+        ASSERT_FALSE(banner.isNull());
+        // Under the buttons the banner's columns are all alike: no letter of the title there.
+        const QRect buttons = window->buttons().checkUpdate()->geometry().united(
+            window->buttons().download()->geometry());
+        const int reference = buttons.right() + 2;
+        for (int x = buttons.left(); x <= buttons.right(); ++x) {
+            for (int y = buttons.top(); y <= buttons.bottom(); ++y) {
+                const QColor here = banner.pixelColor(x, y);
+                const QColor plain = banner.pixelColor(reference, y);
+                ASSERT_LT(std::abs(here.lightness() - plain.lightness()), 40)
+                    << look.name.toStdString() << " at " << x << "," << y;
+            }
+        }
+        SavePicture(*window, QStringLiteral("window-%1.png").arg(look.name));
+    }
+    Click(window->panels().tabHead(1));
+    Click(window->panels().optionLabel(catalog::OptionArray::Ball, 3));
+    ASSERT_NE(window->sideWindows().preview(), nullptr);
+    EXPECT_FALSE(window->sideWindows().preview()->pictureFile().isEmpty());
+    SavePicture(*window->sideWindows().preview(), "preview-ball-3.png");
 }
 
 }  // namespace

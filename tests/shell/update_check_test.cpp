@@ -124,7 +124,7 @@ protected:
         dialogs_.messages.clear();
         return std::make_unique<UpdateFlow>(UpdateCheck::Options{QUrl(Root()), timeout},
                                             dir_.path(), dialogs_, &window_, check_, download_,
-                                            &pban_, &vlk_, [this](const QUrl& url) {
+                                            state_, [this](const QUrl& url) {
                                                 opened_ << url;
                                                 return true;
                                             });
@@ -156,8 +156,7 @@ protected:
     QWidget window_;
     QPushButton* check_ = new QPushButton(&window_);
     QPushButton* download_ = new QPushButton(&window_);
-    QString pban_;
-    QString vlk_;
+    session::UpdateState state_;
     QList<QUrl> opened_;
 };
 
@@ -171,7 +170,7 @@ TEST_F(UpdateFlowTest, SameVersionSaysSoAndChangesNothing) {
     ASSERT_TRUE(checked.wait(kWaitMs));
 
     EXPECT_EQ(dialogs_.messages, QStringList{Message("Chưa có phiên bản mới")});
-    EXPECT_EQ(pban_, "v2.0-demo\r\n");
+    EXPECT_EQ(state_.versionText, "v2.0-demo\r\n");
     EXPECT_TRUE(check_->isEnabled() && Shown(check_) && !Shown(download_));
     EXPECT_EQ(requests_.size(), 1);  // no link fetch
     EXPECT_FALSE(SettingsWritten());
@@ -190,8 +189,8 @@ TEST_F(UpdateFlowTest, NewerVersionIsShownConvertedRecordedAndSwapsTheButtons) {
     Check(*flow);
 
     EXPECT_EQ(dialogs_.messages, QStringList{Message("Đã có phiên bản mới! v2.1 mới\r\n")});
-    EXPECT_EQ(pban_, "v2.1 mo71i\r\n");
-    EXPECT_EQ(vlk_, "https://dl.example.net/kv-2.1.zip\r\n");
+    EXPECT_EQ(state_.versionText, "v2.1 mo71i\r\n");
+    EXPECT_EQ(state_.downloadLink, "https://dl.example.net/kv-2.1.zip\r\n");
     EXPECT_TRUE(!Shown(check_) && Shown(download_));
     const auto ini = dir_ / "Thietlap.ini";
     EXPECT_EQ(catalog::ReadIni(ini, "KiemTra", "PhienBan", "-"), "v2.1 mo71i");
@@ -226,7 +225,7 @@ TEST_F(UpdateFlowTest, FailedChecksAreReportedAndChangeNothing) {
              {"no answer", QByteArray(""), "không trả lời kịp"}}) {
         SCOPED_TRACE(name);
         responses_["/v"] = response;
-        pban_ = "v1.9\r\n";
+        state_.versionText = "v1.9\r\n";
         const qsizetype requestsBefore = requests_.size();
         // A short limit for the silent server only: any other case must fail for its own reason.
         const bool silent = !response.isNull() && response.isEmpty();
@@ -238,8 +237,8 @@ TEST_F(UpdateFlowTest, FailedChecksAreReportedAndChangeNothing) {
         EXPECT_TRUE(shown.startsWith(Message("Không kiểm tra được phiên bản mới: ")) &&
                     shown.contains(QString::fromUtf8(reason)))
             << shown.toStdString();
-        EXPECT_EQ(pban_, "v1.9\r\n");
-        EXPECT_TRUE(vlk_.isEmpty());
+        EXPECT_EQ(state_.versionText, "v1.9\r\n");
+        EXPECT_TRUE(state_.downloadLink.empty());
         EXPECT_TRUE(check_->isEnabled() && Shown(check_) && !Shown(download_));
         EXPECT_FALSE(SettingsWritten());
         for (qsizetype i = requestsBefore; i < requests_.size(); ++i) {
@@ -258,14 +257,14 @@ TEST_F(UpdateFlowTest, DownloadOpensNothingButAWebAddress) {
                                        Ok(""), QByteArray() /* no link file */}) {
         SCOPED_TRACE(response.toStdString());
         responses_["/vlink"] = response;
-        vlk_.clear();
+        state_.downloadLink.clear();
         flow = Flow();
         Check(*flow);
         dialogs_.messages.clear();
         flow->download();
         EXPECT_EQ(dialogs_.messages.size(), 1);
         if (response.isNull()) {
-            EXPECT_TRUE(vlk_.isEmpty());
+            EXPECT_TRUE(state_.downloadLink.empty());
         }
     }
     EXPECT_TRUE(opened_.isEmpty());

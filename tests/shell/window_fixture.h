@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <QTest>
+#include <deque>
 
 #include "fakes.h"
 #include "shell/main_window.h"
@@ -10,15 +11,26 @@
 
 namespace kickvane::testing {
 
-// A main window on a temporary tool folder, with recording dialogs, a fake key sampler and tray,
-// and an update host where nothing listens.
+// A main window and its session on a temporary tool folder, with recording dialogs, a fake key
+// sampler and tray, and an update host where nothing listens.
 class WindowFixture : public ::testing::Test {
 protected:
     std::unique_ptr<shell::MainWindow> Open(std::filesystem::path folder = {}) {
+        std::filesystem::create_directories(tool());
+        auto keys = std::make_unique<FakeKeySampler>();
+        keys_ = keys.get();
+        session::Launcher launch = engine::LaunchGame;
+        if (countLaunches_) {
+            launch = [this](std::string_view) {
+                ++launches_;
+                return engine::LaunchOutcome{};
+            };
+        }
+        sessions_.push_back(std::make_unique<session::Session>(folder.empty() ? tool() : folder,
+                                                               std::move(keys), std::move(launch)));
+
         shell::ShellServices services;
         services.dialogs = &dialogs_;
-        services.keySampler = std::make_unique<FakeKeySampler>();
-        keys_ = static_cast<FakeKeySampler*>(services.keySampler.get());
         services.playSound = [this](const std::filesystem::path& wav) { sounds_.push_back(wav); };
         services.makeTray = [this](const QIcon&, QMenu*) {
             auto tray = std::make_unique<FakeTray>();
@@ -26,16 +38,8 @@ protected:
             tray_ = tray.get();
             return tray;
         };
-        if (countLaunches_) {
-            services.launchGame = [this](std::string_view, engine::EngineUi&) {
-                ++launches_;
-                return engine::LaunchResult::Started;
-            };
-        }
         services.updates.host = QUrl(QStringLiteral("http://127.0.0.1:9/"));
-        std::filesystem::create_directories(tool());
-        return std::make_unique<shell::MainWindow>(folder.empty() ? tool() : folder,
-                                                   std::move(services));
+        return std::make_unique<shell::MainWindow>(*sessions_.back(), std::move(services));
     }
 
     fs::path tool() const { return dir_ / "tool"; }
@@ -53,6 +57,7 @@ protected:
 
     TempDir dir_;
     RecordingDialogs dialogs_;
+    std::deque<std::unique_ptr<session::Session>> sessions_;  // outlive their windows
     FakeKeySampler* keys_ = nullptr;
     FakeTray* tray_ = nullptr;
     std::vector<fs::path> sounds_;

@@ -56,41 +56,41 @@ TEST_F(WindowUsabilityTest, TabKeyReachesTabHeadsAndLabelsWhichTheKeyboardActiva
         Press(QApplication::focusWidget(), Qt::Key_Tab);
     }
     for (int tab = 0; tab < kTabCount; ++tab) {
-        EXPECT_TRUE(reached.count(window->tabHead(tab))) << tab;
+        EXPECT_TRUE(reached.count(window->panels().tabHead(tab))) << tab;
     }
-    EXPECT_TRUE(reached.count(window->categoryLabel(3)));
+    EXPECT_TRUE(reached.count(window->panels().categoryLabel(3)));
 
-    window->tabHead(1)->setFocus(Qt::TabFocusReason);
-    Press(window->tabHead(1), Qt::Key_Space);
-    EXPECT_EQ(window->currentTab(), 1);
+    window->panels().tabHead(1)->setFocus(Qt::TabFocusReason);
+    Press(window->panels().tabHead(1), Qt::Key_Space);
+    EXPECT_EQ(window->panels().currentTab(), 1);
     // The arrows walk the column and choose as they go; they stop at its ends.
     for (int expected : {2, 3, 3}) {
         Press(QApplication::focusWidget(), Qt::Key_Down);
-        EXPECT_EQ(window->currentTab(), expected);
-        EXPECT_TRUE(window->tabHead(expected)->hasFocus());
+        EXPECT_EQ(window->panels().currentTab(), expected);
+        EXPECT_TRUE(window->panels().tabHead(expected)->hasFocus());
     }
-    Press(window->tabHead(3), Qt::Key_Left);
-    EXPECT_EQ(window->currentTab(), 2);
+    Press(window->panels().tabHead(3), Qt::Key_Left);
+    EXPECT_EQ(window->panels().currentTab(), 2);
 
-    window->categoryLabel(3)->setFocus(Qt::TabFocusReason);
-    Press(window->categoryLabel(3), Qt::Key_Return);
-    ASSERT_NE(window->previewWindow(), nullptr);
-    EXPECT_TRUE(window->previewWindow()->pictureFile().endsWith("t1_img_3.jpg"));
-    Press(window->previewWindow(), Qt::Key_Escape);
-    EXPECT_FALSE(window->previewWindow() && window->previewWindow()->isVisible());
+    window->panels().categoryLabel(3)->setFocus(Qt::TabFocusReason);
+    Press(window->panels().categoryLabel(3), Qt::Key_Return);
+    ASSERT_NE(window->sideWindows().preview(), nullptr);
+    EXPECT_TRUE(window->sideWindows().preview()->pictureFile().endsWith("t1_img_3.jpg"));
+    Press(window->sideWindows().preview(), Qt::Key_Escape);
+    EXPECT_FALSE(window->sideWindows().preview() && window->sideWindows().preview()->isVisible());
 }
 
 TEST_F(WindowUsabilityTest, FocusFrameShowsForKeyboardFocusOnly) {
     auto window = ShowActive();
     for (QWidget* widget :
-         std::initializer_list<QWidget*>{window->tabHead(1), window->categoryLabel(0)}) {
-        window->tabHead(3)->setFocus(Qt::MouseFocusReason);
+         std::initializer_list<QWidget*>{window->panels().tabHead(1), window->panels().categoryLabel(0)}) {
+        window->panels().tabHead(3)->setFocus(Qt::MouseFocusReason);
         const QImage unfocused = widget->grab().toImage();
         widget->setFocus(Qt::MouseFocusReason);
         EXPECT_EQ(widget->grab().toImage(), unfocused);  // a click shows no frame
         Press(widget, Qt::Key_Shift);
         EXPECT_NE(widget->grab().toImage(), unfocused);  // a key press does
-        window->tabHead(3)->setFocus(Qt::MouseFocusReason);
+        window->panels().tabHead(3)->setFocus(Qt::MouseFocusReason);
         widget->setFocus(Qt::BacktabFocusReason);
         EXPECT_NE(widget->grab().toImage(), unfocused);
     }
@@ -98,15 +98,15 @@ TEST_F(WindowUsabilityTest, FocusFrameShowsForKeyboardFocusOnly) {
 
 TEST_F(WindowUsabilityTest, TabHeadsAndLabelsTellAssistiveToolsWhatTheyAreAndDo) {
     auto window = Open();
-    QAccessibleInterface* tab = QAccessible::queryAccessibleInterface(window->tabHead(2));
+    QAccessibleInterface* tab = QAccessible::queryAccessibleInterface(window->panels().tabHead(2));
     ASSERT_NE(tab, nullptr);
     EXPECT_EQ(tab->role(), QAccessible::PageTab);
     EXPECT_EQ(tab->text(QAccessible::Name), "Tỉ số");
     ASSERT_NE(tab->actionInterface(), nullptr);
     tab->actionInterface()->doAction(QAccessibleActionInterface::pressAction());
-    EXPECT_EQ(window->currentTab(), 2);
+    EXPECT_EQ(window->panels().currentTab(), 2);
 
-    ClickableLabel* label = window->categoryLabel(12);
+    ClickableLabel* label = window->panels().categoryLabel(12);
     QAccessibleInterface* entry = QAccessible::queryAccessibleInterface(label);
     ASSERT_NE(entry, nullptr);
     EXPECT_EQ(entry->role(), QAccessible::Button);
@@ -117,9 +117,9 @@ TEST_F(WindowUsabilityTest, TabHeadsAndLabelsTellAssistiveToolsWhatTheyAreAndDo)
 TEST_F(WindowUsabilityTest, PreviewOpensCentredOnTheMainWindowsScreen) {
     auto window = Open();
     window->show();
-    Click(window->categoryLabel(0));
-    ASSERT_NE(window->previewWindow(), nullptr);
-    const QPoint offset = window->previewWindow()->frameGeometry().center() -
+    Click(window->panels().categoryLabel(0));
+    ASSERT_NE(window->sideWindows().preview(), nullptr);
+    const QPoint offset = window->sideWindows().preview()->frameGeometry().center() -
                           window->screen()->availableGeometry().center();
     // Within the window frame's few pixels, which are not known before it is shown.
     EXPECT_LE(offset.manhattanLength(), 10) << offset.x() << "," << offset.y();
@@ -132,9 +132,9 @@ TEST_F(WindowUsabilityTest, AboutAndHelpCloseWithTheirButtonAndWithEscape) {
         for (Qt::Key key : {Qt::Key_unknown, Qt::Key_Escape, Qt::Key_Return}) {
             SCOPED_TRACE(std::string(title) + " " + std::to_string(key));
             if (std::string_view(title) == "Thong tin") {
-                Click(window->infoButton());
+                Click(window->buttons().info());
             } else {
-                Click(window->helpButton());
+                Click(window->buttons().help());
             }
             QPointer<QWidget> side = SideWindow(title);
             ASSERT_TRUE(side);
@@ -155,11 +155,11 @@ TEST_F(WindowUsabilityTest, AboutAndHelpCloseWithTheirButtonAndWithEscape) {
 TEST_F(WindowUsabilityTest, FolderPickersOpenWhereTheUserIs) {
     auto window = Open();
     const QString faces = QString::fromStdString((dir_ / "faces").string());
-    window->gameFolderBox()->setText(QStringLiteral("D:\\Games\\FO2"));
+    window->panels().gameFolderBox()->setText(QStringLiteral("D:\\Games\\FO2"));
     dialogs_.folders = {std::nullopt, faces, std::nullopt};
-    Click(window->browseButton());
-    Click(window->quickLoadButton());
-    Click(window->quickLoadButton());
+    Click(window->panels().browseButton());
+    Click(window->buttons().quickLoad());
+    Click(window->buttons().quickLoad());
     EXPECT_EQ(dialogs_.starts, QStringList({"D:\\Games\\FO2", "", faces}));
 }
 
@@ -221,7 +221,7 @@ TEST_F(WindowUsabilityTest, TrayTooltipShowsTheLastRunBelowTheName) {
     testing::MakeGameFolder(game());
     auto window = Open();
     EXPECT_EQ(tray_->toolTip(), "Kickvane v2.0");
-    window->gameFolderBox()->setText(QString::fromStdString(game().string()));
+    window->panels().gameFolderBox()->setText(QString::fromStdString(game().string()));
     window->applyPatchesNow();
     const QStringList lines = tray_->toolTip().split(QLatin1Char('\n'));
     ASSERT_EQ(lines.size(), 2);
@@ -229,7 +229,7 @@ TEST_F(WindowUsabilityTest, TrayTooltipShowsTheLastRunBelowTheName) {
     EXPECT_TRUE(lines[1].startsWith("Lần chạy lúc ")) << lines[1].toStdString();
     EXPECT_TRUE(lines[1].endsWith(" bộ, 0 lỗi")) << lines[1].toStdString();
 
-    window->gameFolderBox()->setText(QString::fromStdString((dir_ / "missing").string()));
+    window->panels().gameFolderBox()->setText(QString::fromStdString((dir_ / "missing").string()));
     window->applyPatchesNow();
     EXPECT_TRUE(tray_->toolTip().contains("đã dừng")) << tray_->toolTip().toStdString();
     // Windows shows at most 127 characters of a tray tooltip; the longest summary must fit.

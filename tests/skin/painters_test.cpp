@@ -1,6 +1,7 @@
 #include <cmath>
 #include <functional>
 #include <limits>
+#include <set>
 
 #include <gtest/gtest.h>
 #include <QCursor>
@@ -59,29 +60,42 @@ TEST(PaintersTest, FramedPainters_PickTheirFrameByState_AndAFallbackForOtherStat
     struct Case {
         Paint paint;
         const QImage* picture;
-        std::vector<std::pair<int, int>> stateToTop;
+        int normal;                  // the state that other states fall back to
+        std::vector<int> ownFrames;  // states with a frame of their own
+        std::vector<int> fallbacks;  // states without one
     };
-    // Spin buttons: the second button of a picture starts at frame 4; state 4 looks like 0.
-    const Case cases[] = {{button, &p.pButton, {{5, 264}, {0, 0}, {6, 0}}},
-                          {header, &p.pListView, {{0, 63}, {8, 0}}},
-                          {tab, &p.pTabTop, {{3, 96}, {6, 0}}},
-                          {combo, &p.pCombobox, {{4, 57}, {7, 0}}},
-                          {spinRight, &p.pSpinHor, {{2, 6 * 17}, {4, 4 * 17}}},
-                          {spinUp, &p.pSpinVer, {{3, 3 * 10}}},
-                          {thumb(1, 0), &p.pTrackBarVerBottom, {{0, 0}, {1, 21}, {2, 42}}},
-                          {thumb(0, 1), &p.pTrackBarHorLeft, {{0, 0}}},
-                          {thumb(2, 1), &p.pTrackBarHorBold, {{2, 2 * 15}}}};
+    // Spin buttons: state 4 looks like state 0. Thumbs: looks 0 normal, 1 hot, 2 disabled.
+    const Case cases[] = {{button, &p.pButton, 1, {5}, {0, 6}},
+                          {header, &p.pListView, 1, {0}, {8}},
+                          {tab, &p.pTabTop, 0, {1, 3}, {6}},
+                          {combo, &p.pCombobox, 1, {4}, {7}},
+                          {spinRight, &p.pSpinHor, 0, {2}, {4}},
+                          {spinUp, &p.pSpinVer, 0, {3}, {4}},
+                          {thumb(1, 0), &p.pTrackBarVerBottom, 0, {1, 2}, {}},
+                          {thumb(0, 1), &p.pTrackBarHorLeft, 0, {}, {}},
+                          {thumb(2, 1), &p.pTrackBarHorBold, 0, {2}, {}}};
+    // The top of the frame that state `state` copies from, checking the copy on the way.
+    const auto frameTop = [](const Case& c, int state) {
+        RecordingSurface dc;
+        c.paint(dc, state);
+        auto copies = dc.Of(Kind::Copy);
+        if (copies.empty()) {
+            copies = dc.Of(Kind::CopyKeyed);  // keyed thumbs
+        }
+        EXPECT_EQ(copies.size(), 9u) << "state " << state;
+        EXPECT_TRUE(!copies.empty() && copies[0].source == c.picture) << "state " << state;
+        const int top = copies.empty() ? -1 : copies[0].from.y;
+        EXPECT_TRUE(top >= 0 && top < c.picture->height()) << "state " << state;
+        return top;
+    };
     for (const Case& c : cases) {
-        for (const auto& [state, top] : c.stateToTop) {
-            RecordingSurface dc;
-            c.paint(dc, state);
-            auto copies = dc.Of(Kind::Copy);
-            if (copies.empty()) {
-                copies = dc.Of(Kind::CopyKeyed);  // keyed thumbs
-            }
-            ASSERT_EQ(copies.size(), 9u) << "state " << state;
-            EXPECT_EQ(copies[0].source, c.picture) << "state " << state;
-            EXPECT_EQ(copies[0].from.y, top) << "state " << state;
+        const int normal = frameTop(c, c.normal);
+        std::set<int> tops{normal};
+        for (int state : c.ownFrames) {
+            EXPECT_TRUE(tops.insert(frameTop(c, state)).second) << "state " << state;
+        }
+        for (int state : c.fallbacks) {
+            EXPECT_EQ(frameTop(c, state), normal) << "state " << state;
         }
     }
     RecordingSurface none;

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <gtest/gtest.h>
+
 #include <string>
 
 #include "support/temp_dir.h"
@@ -56,5 +58,19 @@ inline void MakeGameFolder(const fs::path& game, bool withZData = true) {
         fs::create_directories(game / "zdata/data2");
     }
 }
+
+// A test with a temporary tool folder and game folder laid out as above.
+class ToolAndGameTest : public ::testing::Test {
+protected:
+    void SetUp() override {
+        MakeToolFolder(tool());
+        MakeGameFolder(game());
+    }
+
+    fs::path tool() const { return dir_ / "tool"; }
+    fs::path game() const { return dir_ / "game"; }
+
+    TempDir dir_;
+};
 
 }  // namespace kickvane::testing

@@ -1,10 +1,8 @@
 #include <gtest/gtest.h>
 
-#include <sstream>
 #include <string>
 #include <utility>
 
-#include "text/message_helper.h"
 #include "text/utf.h"
 #include "text/vni.h"
 
@@ -59,14 +57,6 @@ TEST(Vni, Utf8InputWithInvalidBytesGetsReplacementCharacters) {
     EXPECT_EQ(Convert("\xED\xA0\x80"), "\uFFFD\uFFFD\uFFFD");  // an encoded surrogate
     EXPECT_EQ(Convert("😀e61"), "😀ế");                          // a valid four-byte form
     EXPECT_EQ(Utf16ToUtf8(u"\xD800x"), "\uFFFDx");             // a lone surrogate
-}
-
-TEST(MessageHelper, ConsoleWritesEachConvertedTextOnItsOwnLine) {
-    std::ostringstream out;
-    ConsoleMessageHelper helper(out);
-    helper.ShowText(helper.ConvertText("Chu7a co1 phie6n ba3n mo71i"));
-    helper.ShowText("x");
-    EXPECT_EQ(out.str(), "Chưa có phiên bản mới\nx\n");
 }
 
 }  // namespace

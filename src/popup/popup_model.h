@@ -8,7 +8,7 @@
 #include <string_view>
 #include <vector>
 
-namespace kickvane::text {
+namespace kickvane::popup {
 
 // The alert popup as a model without a window or a timer: a window shows what the model says and
 // calls Tick() every kPopupTickInterval. Positions and sizes of the window are in twips (1/1440
@@ -120,6 +120,15 @@ enum class PopupPhase {
     kFinished,  // unloaded: the window closes; the slot is free again
 };
 
+// How a popup shows itself. The tool's own popups slide, fit their height to the text, and have
+// a square frame with a cream inner line.
+struct PopupStyle {
+    bool fade = false;               // fades in place instead of sliding
+    bool autoFit = true;             // fits the height to the text (in slot 1)
+    bool square = true;              // a two-line rectangular frame instead of rounded corners
+    Colour backColour = 0x00C0FFFF;  // the inner line or shape: RGB(255, 255, 192)
+};
+
 class AlertPopupModel {
 public:
     explicit AlertPopupModel(PopupEnvironment environment);
@@ -128,11 +137,8 @@ public:
     AlertPopupModel& operator=(const AlertPopupModel&) = delete;
 
     // Shows `message` (UTF-8). displaySeconds >= 1: stays that many × 80 ticks after arriving;
-    // 0: stays until clicked; negative: stays until CloseActivate. `fade` fades in place instead
-    // of sliding; `autoFit` fits the height to the text in slot 1; `square` draws a two-line
-    // rectangular frame instead of rounded corners; `backColour` is the inner line or shape.
-    void DisplayMessage(std::string_view message, int displaySeconds, bool fade, bool autoFit,
-                        bool square, Colour backColour);
+    // 0: stays until clicked; negative: stays until CloseActivate.
+    void DisplayMessage(std::string_view message, int displaySeconds, const PopupStyle& style = {});
 
     // One step of the motion; call every kPopupTickInterval while the popup is shown.
     void Tick();
@@ -202,4 +208,4 @@ private:
 // Rounds to the nearest whole number, halves to the even neighbour.
 long long RoundHalfEven(double value);
 
-}  // namespace kickvane::text
+}  // namespace kickvane::popup

@@ -1,11 +1,11 @@
-#include "text/popup_model.h"
+#include "popup/popup_model.h"
 
 #include <algorithm>
 #include <cmath>
 #include <limits>
 #include <utility>
 
-namespace kickvane::text {
+namespace kickvane::popup {
 namespace {
 
 constexpr int kLabelLeftPx = 5;
@@ -71,7 +71,8 @@ void PopupSlots::Release(int slot) {
 }
 
 AlertPopupModel::AlertPopupModel(PopupEnvironment environment)
-    : env_(std::move(environment)), slots_(env_.slotTable ? *env_.slotTable : PopupSlots::Shared()) {
+    : env_(std::move(environment)),
+      slots_(env_.slotTable ? *env_.slotTable : PopupSlots::Shared()) {
     env_.screen.twipsPerPixelX = SaneTwipsPerPixel(env_.screen.twipsPerPixelX);
     env_.screen.twipsPerPixelY = SaneTwipsPerPixel(env_.screen.twipsPerPixelY);
 }
@@ -97,8 +98,8 @@ void AlertPopupModel::Initialise() {
     initialised_ = true;
 }
 
-void AlertPopupModel::DisplayMessage(std::string_view message, int displaySeconds, bool fade,
-                                     bool autoFit, bool square, Colour backColour) {
+void AlertPopupModel::DisplayMessage(std::string_view message, int displaySeconds,
+                                     const PopupStyle& style) {
     if (finished_) {
         return;
     }
@@ -123,7 +124,7 @@ void AlertPopupModel::DisplayMessage(std::string_view message, int displaySecond
         // Bounded so that the auto-fit height stays a sane number of twips.
         constexpr int kMaxLabelHeightPx = 100000;
         label_.height = std::clamp(env_.labelHeight(label_.width, text_), 0, kMaxLabelHeightPx);
-        if (slot_ == 1 && autoFit) {
+        if (slot_ == 1 && style.autoFit) {
             heightTwips_ = RoundToInt((label_.top + label_.height + kLabelMarginPx) *
                                       env_.screen.twipsPerPixelY);
         }
@@ -131,7 +132,7 @@ void AlertPopupModel::DisplayMessage(std::string_view message, int displaySecond
         label_.height = std::max(0, ClientHeightPx() - label_.top - kLabelLeftPx);
     }
 
-    fadeMode_ = fade;
+    fadeMode_ = style.fade;
     if (fadeMode_) {
         stepValue_ = kFadeStartPercent;
         topTwips_ = std::max(RestingTop(), 0);
@@ -140,7 +141,7 @@ void AlertPopupModel::DisplayMessage(std::string_view message, int displaySecond
     } else {
         stepValue_ = slot_ > 1 ? kSlideStepHigherSlots : kSlideStepSlot1;
     }
-    DrawFrame(square, backColour);
+    DrawFrame(style.square, style.backColour);
     shown_ = true;
 }
 
@@ -288,4 +289,4 @@ void AlertPopupModel::Unload() {
     slots_.Release(slot_);
 }
 
-}  // namespace kickvane::text
+}  // namespace kickvane::popup

@@ -5,9 +5,9 @@
 #include <memory>
 #include <vector>
 
-#include "text/popup_model.h"
+#include "popup/popup_model.h"
 
-namespace kickvane::text {
+namespace kickvane::popup {
 namespace {
 
 constexpr int kLineHeightPx = 13;
@@ -37,7 +37,7 @@ protected:
                    static_cast<int>(1 + std::count(shown.begin(), shown.end(), '\n'));
         };
         auto popup = std::make_unique<AlertPopupModel>(std::move(env));
-        popup->DisplayMessage(text, seconds, fade, autoFit, true, kCream);
+        popup->DisplayMessage(text, seconds, {fade, autoFit, true, kCream});
         return popup;
     }
 
@@ -176,11 +176,12 @@ TEST(PopupModel, ScreenToTwipsHalvesToEven_AndHugeSecondsDoNotOverflow) {
     env.screen = {1001, 1001, 1200, 14.5, 14.5};  // 14514.5 twips
     env.slotTable = &slots;
     AlertPopupModel popup(env);
-    popup.DisplayMessage("x", INT_MAX, false, false, false, 0);
+    popup.DisplayMessage("x", INT_MAX,
+                         {.fade = false, .autoFit = false, .square = false, .backColour = 0});
     EXPECT_EQ(popup.TopTwips(), 14514);
     TicksIn(popup, PopupPhase::kArriving);
     EXPECT_EQ(TicksIn(popup, PopupPhase::kResting, 1000), 1000);
 }
 
 }  // namespace
-}  // namespace kickvane::text
+}  // namespace kickvane::popup

@@ -1,0 +1,144 @@
+#include "session/session.h"
+
+#include "catalog/catalog.h"
+#include "platform/text.h"
+
+namespace kickvane::session {
+
+namespace {
+
+constexpr std::string_view kNoticeTitle = "Thông báo";
+
+text::Message Notice(std::string text) {
+    return {text::Message::Kind::Notice, std::move(text), std::string(kNoticeTitle)};
+}
+
+}  // namespace
+
+std::string FailedStepLine(const engine::StepOutcome& step) {
+    const catalog::PatchCategory& category =
+        catalog::Categories()[static_cast<size_t>(step.step.category)];
+    return "• " + std::string(platform::TrimBlanks(category.label)) + ": " +
+           engine::Describe(step.step) + " (" + step.reason + ")";
+}
+
+Session::Session(std::filesystem::path toolFolder, std::unique_ptr<platform::KeySampler> keys,
+                 Launcher launch)
+    : toolFolder_(std::move(toolFolder)),
+      settings_(catalog::LoadSettings(toolFolder_)),
+      keys_(std::move(keys)),
+      poll_(keys_.get()),
+      launch_(std::move(launch)) {
+    hotkeyValid_ = poll_.SetHotkey(settings_.hotkey);
+}
+
+void Session::setCategoryOn(int switchIndex, bool on) {
+    settings_.selection.setSwitchValue(switchIndex, on ? 1 : 0);
+}
+
+void Session::chooseOption(catalog::OptionArray array, int index) {
+    settings_.selection.setOptionValue(array, index, true);
+}
+
+void Session::setHotkeyText(std::string text) {
+    settings_.hotkey = std::move(text);
+    hotkeyValid_ = poll_.SetHotkey(settings_.hotkey);
+}
+
+std::string Session::activeHotkey() const {
+    const std::optional<int> key = poll_.key();
+    if (!key) {
+        return {};
+    }
+    std::string name = "F";
+    name += std::to_string(*key - platform::kVirtualKeyF1 + 1);
+    return name;
+}
+
+std::string Session::hotkeyProblem() const {
+    if (hotkeyValid_) {
+        return {};
+    }
+    const std::string active = activeHotkey();
+    return "\"" + settings_.hotkey + "\" không phải phím F1–F12: " +
+           (active.empty() ? "phím tắt chưa hoạt động." : "vẫn dùng " + active + ".");
+}
+
+std::optional<ApplyRun> Session::PollHotkey() {
+    if (!poll_.Tick()) {
+        return std::nullopt;
+    }
+    return Apply();
+}
+
+ApplyRun Session::Apply() {
+    ApplyRun run{engine::ApplyPatches(toolFolder_, settings_.gameFolder, settings_.selection), {}};
+    if (run.apply.message) {
+        run.shown.messages.push_back(*run.apply.message);
+    }
+    run.shown.signalSound = run.apply.signalSound;
+    const std::vector<engine::StepOutcome> failures = run.apply.Failures();
+    if (!failures.empty()) {
+        std::string text = "Đã chép xong, nhưng ";
+        text += std::to_string(failures.size());
+        text += " bước không thành công:";
+        for (const engine::StepOutcome& failure : failures) {
+            text += '\n';
+            text += FailedStepLine(failure);
+        }
+        run.shown.messages.push_back(Notice(std::move(text)));
+    }
+    return run;
+}
+
+std::vector<engine::PlanStep> Session::Plan() const {
+    return engine::BuildPlan(settings_.selection);
+}
+
+Outcome Session::Save() {
+    Outcome shown;
+    if (const Status saved = catalog::SaveSettings(toolFolder_, settings_); !saved) {
+        shown.messages.push_back({text::Message::Kind::Warning,
+                                  "Không lưu được thiết lập!\n" + saved.reason(),
+                                  std::string(kNoticeTitle)});
+    } else {
+        shown.popup = Popup{std::string(kSavedPopupText), 2};
+    }
+    return shown;
+}
+
+LaunchRun Session::Launch(LaunchFrom from) {
+    LaunchRun run{launch_(settings_.gameFolder), false, {}};
+    if (run.launch.message) {
+        run.shown.messages.push_back(*run.launch.message);
+    }
+    if (run.launch.started() && from == LaunchFrom::Window) {
+        run.hideToTray = true;
+        run.shown.popup = Popup{std::string(kHiddenPopupText), 2};
+    }
+    return run;
+}
+
+QuickLoadRun Session::QuickLoad(std::optional<std::filesystem::path> chosen) {
+    if (chosen) {
+        quickLoadFolder_ = std::move(*chosen);
+    }
+    QuickLoadRun run{engine::QuickLoad(toolFolder_, quickLoadFolder_), {}};
+    if (run.load.message) {
+        run.shown.messages.push_back(*run.load.message);
+    }
+    if (run.load.stopped) {
+        return run;
+    }
+    if (!run.load.failures.empty()) {
+        std::string text = "Một số file không chép được:";
+        for (const std::string& failure : run.load.failures) {
+            text += "\n• " + failure;
+        }
+        run.shown.messages.push_back(Notice(std::move(text)));
+    }
+    run.shown.popup = Popup{std::string(kQuickLoadDonePopupText), 2};
+    return run;
+}
+
+}  // namespace kickvane::session

@@ -1,0 +1,129 @@
+#pragma once
+
+#include <filesystem>
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "catalog/settings.h"
+#include "engine/apply.h"
+#include "engine/hotkey_poll.h"
+#include "engine/launcher.h"
+#include "engine/plan.h"
+#include "engine/quick_load.h"
+#include "text/message.h"
+
+// The tool's state and commands, free of any user interface. The window, the tray, the trigger
+// command and the command line drive one Session and show what its commands return.
+namespace kickvane::session {
+
+// Texts of the corner popups that confirm an action.
+inline constexpr std::string_view kSavedPopupText = "Đã lưu thiết lập!";
+inline constexpr std::string_view kHiddenPopupText = "Ẩn xuống khay hệ thống!";
+inline constexpr std::string_view kSkinChangedPopupText = "Đã thay đổi giao diện!";
+inline constexpr std::string_view kQuickLoadDonePopupText = "Hoàn tất!";
+
+struct Popup {
+    std::string text;
+    int seconds = 2;
+
+    friend bool operator==(const Popup&, const Popup&) = default;
+};
+
+// What a command asks the user interface to show, in this order: the signal sound (it follows
+// the copies), then the messages, then the popup.
+struct Outcome {
+    std::filesystem::path signalSound;  // played without waiting; empty: no sound
+    std::vector<text::Message> messages;
+    std::optional<Popup> popup;
+};
+
+// The update check's findings: the host's version text and download link, as fetched.
+struct UpdateState {
+    std::string versionText;
+    std::string downloadLink;
+};
+
+// Where the launcher was asked for: the window's button hides the window to the tray and says
+// so; the tray menu's entry leaves everything as it is.
+enum class LaunchFrom { Window, Tray };
+
+struct LaunchRun {
+    engine::LaunchOutcome launch;
+    bool hideToTray = false;
+    Outcome shown;
+};
+
+struct ApplyRun {
+    engine::ApplyOutcome apply;
+    Outcome shown;
+};
+
+struct QuickLoadRun {
+    engine::QuickLoadOutcome load;
+    Outcome shown;
+};
+
+using Launcher = std::function<engine::LaunchOutcome(std::string_view gameFolder)>;
+
+class Session {
+public:
+    // Loads the settings of `toolFolder`. `keys` samples the global key state for the hotkey;
+    // null where there is none. `launch` starts the game's launcher.
+    explicit Session(std::filesystem::path toolFolder,
+                     std::unique_ptr<platform::KeySampler> keys = nullptr,
+                     Launcher launch = engine::LaunchGame);
+
+    const std::filesystem::path& toolFolder() const { return toolFolder_; }
+    const catalog::Settings& settings() const { return settings_; }
+    const catalog::PatchSelection& selection() const { return settings_.selection; }
+    bool hasGlobalKeys() const { return keys_ != nullptr; }
+
+    void setGameFolder(std::string folder) { settings_.gameFolder = std::move(folder); }
+    // A ticked box is on (1), a cleared one off (0); a stored value other than these is lost.
+    void setCategoryOn(int switchIndex, bool on);
+    // Chooses a variant; the others of its group are cleared.
+    void chooseOption(catalog::OptionArray array, int index);
+
+    // Takes the hotkey text as typed; it is saved as it stands. A text that names no key keeps
+    // the key in use as it was; hotkeyValid() says so.
+    void setHotkeyText(std::string text);
+    bool hotkeyValid() const { return hotkeyValid_; }
+    // The name of the key the poll reacts to ("F7"); empty when none.
+    std::string activeHotkey() const;
+    // For the user, when the hotkey text names no key: what is wrong and which key is in use.
+    // Empty when the text names a key.
+    std::string hotkeyProblem() const;
+
+    // One tick of the hotkey poll: applies the patches when the key was pressed.
+    std::optional<ApplyRun> PollHotkey();
+
+    ApplyRun Apply();
+    std::vector<engine::PlanStep> Plan() const;
+    Outcome Save();
+    LaunchRun Launch(LaunchFrom from);
+    // Loads from `chosen`, or from the folder chosen last time when the user picked none.
+    QuickLoadRun QuickLoad(std::optional<std::filesystem::path> chosen);
+    const std::filesystem::path& quickLoadFolder() const { return quickLoadFolder_; }
+
+    UpdateState& updates() { return updates_; }
+    const UpdateState& updates() const { return updates_; }
+
+private:
+    std::filesystem::path toolFolder_;
+    catalog::Settings settings_;
+    std::unique_ptr<platform::KeySampler> keys_;
+    engine::HotkeyPoll poll_;
+    bool hotkeyValid_ = true;
+    Launcher launch_;
+    std::filesystem::path quickLoadFolder_;
+    UpdateState updates_;
+};
+
+// One line per failed step for people: "• Thay đổi bóng: merge ... (reason)".
+std::string FailedStepLine(const engine::StepOutcome& step);
+
+}  // namespace kickvane::session

@@ -1,0 +1,273 @@
+#include "shell/catalog_panels.h"
+
+#include <QLabel>
+
+#include "platform/text.h"
+#include "shell/game_finder.h"
+#include "shell/qt_text.h"
+#include "shell/skins.h"
+
+namespace kickvane::shell {
+
+namespace {
+
+using catalog::GroupId;
+using catalog::OptionArray;
+
+constexpr std::array<int, kTabCount> kTabTops{65, 110, 156, 202};
+constexpr int kTabLeft = 9;
+constexpr QRect kPanelRect(104, 46, 321, 357);
+const std::array<QString, kTabCount> kTabCaptions{QStringLiteral("Chung"), QStringLiteral("Bóng"),
+                                                  QStringLiteral("Tỉ số"), QStringLiteral("Khác")};
+
+ClickableLabel* MakeLabel(std::string_view text, QWidget* parent, const QRect& geometry) {
+    auto* label = new ClickableLabel(ToQString(text), parent);
+    label->setGeometry(geometry);
+    label->setCursor(Qt::PointingHandCursor);
+    Paint(label, kLabelBackground);
+    return label;
+}
+
+QLabel* MakeHeading(const QString& text, QWidget* parent, const QPoint& at) {
+    auto* heading = new QLabel(text, parent);
+    QFont font = heading->font();
+    font.setBold(true);
+    heading->setFont(font);
+    heading->move(at);
+    heading->adjustSize();
+    return heading;
+}
+
+QRadioButton* MakeOptionButton(QWidget* parent, const QRect& geometry) {
+    auto* button = new QRadioButton(parent);
+    button->setAutoExclusive(false);
+    button->setGeometry(geometry);
+    Paint(button, kEntryBackground);
+    return button;
+}
+
+}  // namespace
+
+CatalogPanels::CatalogPanels(QWidget* window) : QObject(window), window_(window) {
+    for (int i = 0; i < kTabCount; ++i) {
+        auto* tab = new TabHead(kTabCaptions[static_cast<size_t>(i)], window);
+        tab->setGeometry(kTabLeft, kTabTops[static_cast<size_t>(i)], 90, 32);
+        connect(tab, &TabHead::clicked, this, [this, i] { selectTab(i); });
+        tabs_[static_cast<size_t>(i)] = tab;
+
+        auto* panel = new PictureBox(window);
+        panel->setGeometry(kPanelRect.translated(0, i * 4));  // design positions; layout aligns
+        panels_[static_cast<size_t>(i)] = panel;
+    }
+    tabHeight_ = tabs_[0]->height();
+    buildCategoryPanel(panels_[0]);
+    MakeHeading(QStringLiteral("Chọn quả bóng:"), panels_[1], {12, 10});
+    buildGroupPanel(panels_[1], GroupId::Ball, 40);
+    MakeHeading(QStringLiteral("Chọn bảng tỉ số:"), panels_[2], {12, 10});
+    buildGroupPanel(panels_[2], GroupId::Scoreboard, 40);
+    buildVariantFrames(panels_[3]);
+}
+
+void CatalogPanels::buildCategoryPanel(QWidget* panel) {
+    auto* folderLabel = new QLabel(QStringLiteral("Thư mục cài FIFA Online 2:"), panel);
+    folderLabel->setGeometry(10, 8, 300, 18);
+    gameFolder_ = new QLineEdit(panel);
+    gameFolder_->setGeometry(10, 28, 212, 25);
+    gameFolder_->setAccessibleName(folderLabel->text());
+    connect(gameFolder_, &QLineEdit::textChanged, this, &CatalogPanels::gameFolderEdited);
+    browse_ = new QPushButton(QStringLiteral("Đổ&i thư mục"), panel);
+    browse_->setGeometry(226, 27, 86, 27);
+    connect(browse_, &QPushButton::clicked, this, &CatalogPanels::browseRequested);
+    AddGameFinder(gameFolder_, browse_);
+
+    for (const catalog::PatchCategory& category : catalog::Categories()) {
+        const int i = category.switchIndex;
+        const int x = i < 7 ? 8 : 162;
+        const int y = 68 + (i % 7) * 40;
+        auto* check = new QCheckBox(panel);
+        check->setGeometry(x, y + 2, 20, 20);
+        check->setAccessibleName(ToQString(platform::TrimBlanks(category.label)));
+        Paint(check, kEntryBackground);
+        connect(check, &QCheckBox::clicked, this, [this, check, i](bool checked) {
+            check->setTristate(false);
+            emit categoryToggled(i, checked);
+        });
+        checks_[static_cast<size_t>(i)] = check;
+
+        auto* label = MakeLabel(category.label, panel, QRect(x + 22, y, 128, 24));
+        connect(label, &ClickableLabel::clicked, this,
+                [this, i] { emit labelClicked(catalog::LabelArray::Category, i); });
+        categoryLabels_[static_cast<size_t>(i)] = label;
+    }
+}
+
+void CatalogPanels::addOption(const catalog::VariantGroup& group,
+                              const catalog::PatchOption& option, QRadioButton* button,
+                              ClickableLabel* label) {
+    const OptionArray array = group.array;
+    const int index = option.index;
+    const catalog::LabelArray labels = group.labels;
+    button->setAccessibleName(label->text());
+    connect(button, &QRadioButton::clicked, this,
+            [this, array, index] { emit optionChosen(array, index); });
+    connect(label, &ClickableLabel::clicked, this,
+            [this, labels, index] { emit labelClicked(labels, index); });
+    options_.push_back({array, index, button, label});
+}
+
+void CatalogPanels::buildGroupPanel(QWidget* panel, GroupId id, int top) {
+    const catalog::VariantGroup& group = catalog::Group(id);
+    int row = 0;
+    for (const catalog::PatchOption& option : group.options) {
+        const int y = top + row++ * 36;
+        addOption(group, option, MakeOptionButton(panel, QRect(20, y + 2, 20, 20)),
+                  MakeLabel(option.label, panel, QRect(44, y, 250, 24)));
+    }
+}
+
+void CatalogPanels::buildVariantFrames(QWidget* panel) {
+    struct Frame {
+        GroupId group;
+        QString caption;
+        QRect rect;
+    };
+    const std::array<Frame, 3> frames{{
+        {GroupId::Adboard, QStringLiteral("Biển quảng cáo"), QRect(8, 8, 305, 108)},
+        {GroupId::Pitch, QStringLiteral("Mặt cỏ"), QRect(8, 124, 305, 108)},
+        {GroupId::Mark, QStringLiteral("Mark cầu thủ"), QRect(8, 240, 305, 108)},
+    }};
+    for (size_t f = 0; f < frames.size(); ++f) {
+        auto* frame = new PictureBox(panel);
+        frame->setGeometry(frames[f].rect);
+        frame->setBackground(kEntryBackground);
+        groupFrames_[f] = frame;
+        MakeHeading(frames[f].caption, frame, {8, 4});
+        const catalog::VariantGroup& group = catalog::Group(frames[f].group);
+        int row = 0;
+        for (const catalog::PatchOption& option : group.options) {
+            const int y = 26 + row++ * 20;
+            addOption(group, option, MakeOptionButton(frame, QRect(10, y, 18, 18)),
+                      MakeLabel(option.label, frame, QRect(32, y - 1, 200, 19)));
+        }
+    }
+}
+
+void CatalogPanels::layoutPanels(const QString& panelPicture) {
+    for (int i = 0; i < kTabCount; ++i) {
+        PictureBox* panel = panels_[static_cast<size_t>(i)];
+        panel->setBackground(panels_[0]->background());
+        panel->setPictureFile(panelPicture);
+        panel->move(i > 0 ? panels_[0]->x() : panel->x(), tabHeight_ + 16);
+        if (i > 0) {
+            panel->resize(panels_[0]->width(), panel->height());
+        }
+    }
+}
+
+void CatalogPanels::paintTabs(const QString& selectedPicture, const QString& unselectedPicture) {
+    // The new panel shows before the others hide, so the focus never falls through to the
+    // widgets below the panels.
+    panels_[static_cast<size_t>(currentTab_)]->setVisible(true);
+    for (int i = 0; i < kTabCount; ++i) {
+        const bool selected = i == currentTab_;
+        TabHead* tab = tabs_[static_cast<size_t>(i)];
+        panels_[static_cast<size_t>(i)]->setVisible(selected);
+        if (selected) {
+            tab->raise();
+            tab->setPictureFile(selectedPicture);
+        } else {
+            tab->setPictureFile(unselectedPicture);
+            tab->setBackground(kUnselectedTabColour);
+        }
+        tab->resize(kTabHeadWidth, kTabHeadHeight);
+    }
+}
+
+void CatalogPanels::selectTab(int index) {
+    if (index < 0 || index >= kTabCount) {
+        return;
+    }
+    const QWidget* focused = window_->focusWidget();
+    const bool focusOnOldPanel =
+        focused && panels_[static_cast<size_t>(currentTab_)]->isAncestorOf(focused);
+    currentTab_ = index;
+    emit tabSelected(index);
+    if (focusOnOldPanel || !focused) {
+        tabs_[static_cast<size_t>(index)]->setFocus(Qt::OtherFocusReason);
+    }
+}
+
+void CatalogPanels::recolour(const SkinLook& look) {
+    for (size_t i = 0; i < checks_.size(); ++i) {
+        Paint(checks_[i], look.entryBackground);
+        Paint(categoryLabels_[i], look.labelBackground, look.labelText);
+    }
+    for (const OptionWidgets& option : options_) {
+        Paint(option.button, look.entryBackground);
+        Paint(option.label, look.labelBackground, look.labelText);
+    }
+    for (PictureBox* frame : groupFrames_) {
+        frame->setBackground(look.entryBackground);
+    }
+    // Headings on the panels and in the frames follow the labels' text colour, so they stay
+    // readable on the dark pictures of skin 2.
+    for (PictureBox* panel : panels_) {
+        for (QLabel* heading : panel->findChildren<QLabel*>()) {
+            if (!qobject_cast<ClickableLabel*>(heading)) {
+                QPalette palette = heading->palette();
+                palette.setColor(QPalette::WindowText, look.labelText);
+                heading->setPalette(palette);
+            }
+        }
+    }
+}
+
+void CatalogPanels::showSelection(const catalog::PatchSelection& selection) {
+    for (const catalog::PatchCategory& category : catalog::Categories()) {
+        QCheckBox* check = checks_[static_cast<size_t>(category.switchIndex)];
+        const int value = selection.switchValue(category.switchIndex);
+        // A stored value other than 0 and 1 shows as greyed; only 1 counts as on.
+        check->setTristate(value != 0 && value != 1);
+        check->setCheckState(value == 0   ? Qt::Unchecked
+                             : value == 1 ? Qt::Checked
+                                          : Qt::PartiallyChecked);
+    }
+    for (const OptionWidgets& option : options_) {
+        option.button->setChecked(selection.optionValue(option.array, option.index));
+    }
+}
+
+void CatalogPanels::showGameFolder(const QString& folder) {
+    if (gameFolder_->text() != folder) {
+        gameFolder_->setText(folder);
+    }
+}
+
+QCheckBox* CatalogPanels::categoryCheck(int switchIndex) const {
+    return checks_.at(static_cast<size_t>(switchIndex));
+}
+
+ClickableLabel* CatalogPanels::categoryLabel(int switchIndex) const {
+    return categoryLabels_.at(static_cast<size_t>(switchIndex));
+}
+
+const CatalogPanels::OptionWidgets* CatalogPanels::findOption(OptionArray array, int index) const {
+    for (const OptionWidgets& option : options_) {
+        if (option.array == array && option.index == index) {
+            return &option;
+        }
+    }
+    return nullptr;
+}
+
+QRadioButton* CatalogPanels::optionButton(OptionArray array, int index) const {
+    const OptionWidgets* option = findOption(array, index);
+    return option ? option->button : nullptr;
+}
+
+ClickableLabel* CatalogPanels::optionLabel(OptionArray array, int index) const {
+    const OptionWidgets* option = findOption(array, index);
+    return option ? option->label : nullptr;
+}
+
+}  // namespace kickvane::shell

@@ -1,0 +1,35 @@
+#pragma once
+
+#include <QPointer>
+#include <filesystem>
+
+#include "catalog/catalog.h"
+#include "shell/side_windows.h"
+
+namespace kickvane::shell {
+
+// The side windows of the main window, each made on first use and then shown again: the
+// information window, the help window and the one preview window that all labels share.
+class SideWindowSet {
+public:
+    SideWindowSet(QWidget* owner, std::filesystem::path toolFolder)
+        : owner_(owner), toolFolder_(std::move(toolFolder)) {}
+
+    void showAbout() { show(about_, CreateAboutWindow); }
+    void showHelp() { show(help_, CreateHelpWindow); }
+    // Shows the label's preview picture; a label without one changes nothing.
+    void showPreview(catalog::LabelArray labels, int index);
+
+    PreviewWindow* preview() const { return preview_; }
+
+private:
+    void show(QPointer<QWidget>& window, QWidget* (*create)(QWidget*));
+
+    QWidget* owner_;
+    std::filesystem::path toolFolder_;
+    QPointer<QWidget> about_;
+    QPointer<QWidget> help_;
+    QPointer<PreviewWindow> preview_;
+};
+
+}  // namespace kickvane::shell

@@ -1,0 +1,46 @@
+#include "engine/hotkey_poll.h"
+
+#include <gtest/gtest.h>
+
+#include "support/fake_keys.h"
+
+namespace kickvane::engine {
+namespace {
+
+constexpr int kF7 = 0x76;
+constexpr int kF9 = 0x78;
+
+TEST(HotkeyPoll, TicksOnlyForThePressedOrHeldKeyItKeeps) {
+    testing::FakeKeySampler keys;
+    HotkeyPoll poll(&keys);
+    keys.pressed.insert(kF7);
+    EXPECT_FALSE(poll.Tick());  // no key chosen yet
+
+    EXPECT_TRUE(poll.SetHotkey("F7"));
+    keys.pressed.insert(kF7);
+    EXPECT_TRUE(poll.Tick());   // pressed since the last sample
+    EXPECT_FALSE(poll.Tick());  // released meanwhile
+    keys.held.insert(kF7);
+    EXPECT_TRUE(poll.Tick());
+    EXPECT_TRUE(poll.Tick());
+
+    // Names are compared exactly; one that names no key leaves F7 in use.
+    for (const char* name : {"f7", "", "F13", "F7 ", "F"}) {
+        EXPECT_FALSE(poll.SetHotkey(name)) << name;
+        EXPECT_EQ(poll.key(), kF7) << name;
+    }
+    EXPECT_TRUE(poll.SetHotkey("F9"));
+    EXPECT_FALSE(poll.Tick());  // F7 is still held, but no longer the hotkey
+    keys.pressed.insert(kF9);
+    EXPECT_TRUE(poll.Tick());
+}
+
+TEST(HotkeyPoll, WithoutGlobalKeyStateNoTickApplies) {
+    HotkeyPoll poll(nullptr);
+    EXPECT_TRUE(poll.SetHotkey("F12"));
+    EXPECT_EQ(poll.key(), 0x7B);
+    EXPECT_FALSE(poll.Tick());
+}
+
+}  // namespace
+}  // namespace kickvane::engine

@@ -1,0 +1,147 @@
+#include "session/session.h"
+
+#include <gtest/gtest.h>
+
+#include "support/fake_keys.h"
+#include "support/trees.h"
+
+namespace kickvane::session {
+namespace {
+
+using testing::FakeKeySampler;
+using testing::WriteFile;
+using Kind = text::Message::Kind;
+namespace fs = std::filesystem;
+
+constexpr int kF7 = 0x76;
+
+class SessionTest : public testing::ToolAndGameTest {
+protected:
+    void WriteSettings(const std::string& hotkey) {
+        WriteFile(tool() / "ThietLap.ini",
+                  "[Thiet lap]\r\nDuongDan=" + game().string() + "\r\nPhimTat=" + hotkey + "\r\n");
+    }
+
+    std::unique_ptr<Session> Open(Launcher launch = engine::LaunchGame) {
+        auto keys = std::make_unique<FakeKeySampler>();
+        keys_ = keys.get();
+        return std::make_unique<Session>(tool(), std::move(keys), std::move(launch));
+    }
+
+    FakeKeySampler* keys_ = nullptr;
+};
+
+TEST_F(SessionTest, HotkeyFromTheSettingsAppliesOnPressAndABadTextKeepsTheLastKey) {
+    WriteSettings("f7");  // names no key: nothing is in use yet, and the session says so
+    auto session = Open();
+    EXPECT_FALSE(session->hotkeyValid());
+    EXPECT_EQ(session->activeHotkey(), "");
+    EXPECT_EQ(session->hotkeyProblem(), "\"f7\" không phải phím F1–F12: phím tắt chưa hoạt động.");
+    keys_->pressed.insert(kF7);
+    EXPECT_FALSE(session->PollHotkey());
+
+    session->setHotkeyText("F7");
+    EXPECT_TRUE(session->hotkeyProblem().empty());
+    keys_->pressed.insert(kF7);
+    const std::optional<ApplyRun> run = session->PollHotkey();
+    ASSERT_TRUE(run);
+    EXPECT_EQ(run->shown.signalSound, tool() / "sound.wav");
+    EXPECT_TRUE(run->shown.messages.empty());
+    EXPECT_TRUE(fs::exists(game() / "data2/cmn/base.dds"));
+
+    session->setHotkeyText("F");  // halfway through typing "F9"
+    EXPECT_EQ(session->activeHotkey(), "F7");
+    EXPECT_EQ(session->hotkeyProblem(), "\"F\" không phải phím F1–F12: vẫn dùng F7.");
+    keys_->held.insert(kF7);
+    EXPECT_TRUE(session->PollHotkey());
+    EXPECT_EQ(session->settings().hotkey, "F");  // saved as typed
+}
+
+TEST_F(SessionTest, ApplyStoppedByAFolderCheckShowsItsMessageAndNoSound) {
+    WriteSettings("F7");
+    fs::remove_all(game() / "data2");
+    auto session = Open();
+    const ApplyRun run = session->Apply();
+    EXPECT_TRUE(run.apply.stopped());
+    ASSERT_EQ(run.shown.messages.size(), 1u);
+    EXPECT_EQ(run.shown.messages[0].kind, Kind::Component);
+    EXPECT_TRUE(run.shown.signalSound.empty());
+    EXPECT_FALSE(run.shown.popup);
+}
+
+TEST_F(SessionTest, FailedStepsFollowTheSoundInOneNotice) {
+    WriteSettings("F7");
+    fs::remove_all(game() / "zdata");
+    auto session = Open();
+    const ApplyRun run = session->Apply();
+    EXPECT_FALSE(run.shown.signalSound.empty());
+    ASSERT_EQ(run.shown.messages.size(), 1u);
+    const text::Message& notice = run.shown.messages[0];
+    EXPECT_EQ(notice.kind, Kind::Notice);
+    EXPECT_EQ(notice.title, "Thông báo");
+    EXPECT_TRUE(notice.text.starts_with("Đã chép xong, nhưng " +
+                                        std::to_string(run.apply.Failures().size()) +
+                                        " bước không thành công:\n• Thay đổi bóng: merge "))
+        << notice.text;
+}
+
+TEST_F(SessionTest, SaveConfirmsWithThePopupOrWarnsWithTheReason) {
+    auto session = Open();
+    session->setGameFolder("D:\\FO2");
+    session->setCategoryOn(12, true);
+    session->chooseOption(catalog::OptionArray::Other, 9);
+    const Outcome saved = session->Save();
+    EXPECT_EQ(saved.popup, (Popup{"Đã lưu thiết lập!", 2}));
+    const catalog::Settings reread = catalog::LoadSettings(tool());
+    EXPECT_EQ(reread.gameFolder, "D:\\FO2");
+    EXPECT_EQ(reread.selection, session->selection());
+
+    fs::remove(tool() / "ThietLap.ini");
+    fs::create_directories(tool() / "ThietLap.ini");  // a folder where the file goes
+    const Outcome failed = session->Save();
+    EXPECT_FALSE(failed.popup);
+    ASSERT_EQ(failed.messages.size(), 1u);
+    EXPECT_EQ(failed.messages[0].kind, Kind::Warning);
+    EXPECT_TRUE(failed.messages[0].text.starts_with("Không lưu được thiết lập!\n"));
+}
+
+TEST_F(SessionTest, LaunchFromTheWindowHidesItAndFromTheTrayLeavesItAlone) {
+    int launches = 0;
+    auto session = Open([&](std::string_view folder) {
+        ++launches;
+        EXPECT_EQ(folder, "C:\\Program Files");
+        return engine::LaunchOutcome{};
+    });
+    const LaunchRun fromWindow = session->Launch(LaunchFrom::Window);
+    EXPECT_TRUE(fromWindow.hideToTray);
+    EXPECT_EQ(fromWindow.shown.popup, (Popup{"Ẩn xuống khay hệ thống!", 2}));
+    const LaunchRun fromTray = session->Launch(LaunchFrom::Tray);
+    EXPECT_FALSE(fromTray.hideToTray);
+    EXPECT_FALSE(fromTray.shown.popup);
+    EXPECT_EQ(launches, 2);
+
+    auto missing = Open();  // the real launcher: no Gameloader.exe in the default folder
+    const LaunchRun failed = missing->Launch(LaunchFrom::Window);
+    EXPECT_FALSE(failed.hideToTray);
+    EXPECT_FALSE(failed.shown.popup);
+    ASSERT_EQ(failed.shown.messages.size(), 1u);
+    EXPECT_EQ(failed.shown.messages[0].text,
+              "Không tìm thấy Gameloader.exe hoặc đường dẫn không chính xác!");
+}
+
+TEST_F(SessionTest, QuickLoadRemembersItsFolderAndConfirmsWithThePopup) {
+    WriteFile(dir_ / "faces/face1.dds", "face");
+    auto session = Open();
+    const QuickLoadRun none = session->QuickLoad(std::nullopt);
+    EXPECT_TRUE(none.load.stopped);
+    EXPECT_FALSE(none.shown.popup);
+    ASSERT_EQ(none.shown.messages.size(), 1u);
+
+    EXPECT_EQ(session->QuickLoad(dir_ / "faces").shown.popup, (Popup{"Hoàn tất!", 2}));
+    const QuickLoadRun again = session->QuickLoad(std::nullopt);
+    EXPECT_EQ(again.load.copied, std::vector<std::string>{"face1.dds"});
+    EXPECT_EQ(session->quickLoadFolder(), dir_ / "faces");
+}
+
+}  // namespace
+}  // namespace kickvane::session
