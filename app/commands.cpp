@@ -69,12 +69,19 @@ std::optional<Options> ParseOptions(Args args, bool allowGame) {
     return options;
 }
 
-catalog::Settings LoadFor(const Options& options) {
-    catalog::Settings settings = catalog::LoadSettings(options.toolFolder);
-    if (options.game) {
-        settings.gameFolder = *options.game;
+// The settings of the tool folder, with the game folder of the command line. nullopt, with the
+// reason on standard error, when the settings file exists but cannot be read: acting on defaults
+// the user never chose would be wrong.
+std::optional<catalog::Settings> LoadFor(const Options& options) {
+    catalog::LoadedSettings loaded = catalog::LoadSettings(options.toolFolder);
+    if (!loaded.status) {
+        std::cerr << "kickvane: " << loaded.status.reason() << '\n';
+        return std::nullopt;
     }
-    return settings;
+    if (options.game) {
+        loaded.settings.gameFolder = *options.game;
+    }
+    return std::move(loaded.settings);
 }
 
 std::string_view CategoryKey(int switchIndex) {
@@ -130,10 +137,13 @@ int RunApply(Args args) {
         PrintUsage(std::cerr);
         return kExitStopped;
     }
-    const catalog::Settings settings = LoadFor(*options);
+    const std::optional<catalog::Settings> settings = LoadFor(*options);
+    if (!settings) {
+        return kExitStopped;
+    }
     ConsoleUi ui;
     const engine::ApplyOutcome outcome = engine::ApplyPatches(
-        options->toolFolder, settings.gameFolder, settings.selection, ui, PrintStep);
+        options->toolFolder, settings->gameFolder, settings->selection, ui, PrintStep);
     if (outcome.stopped()) {
         return kExitStopped;
     }
@@ -152,14 +162,17 @@ int RunPlan(Args args) {
         PrintUsage(std::cerr);
         return kExitStopped;
     }
-    const catalog::Settings settings = LoadFor(*options);
-    const engine::Roots roots = engine::ResolveRoots(options->toolFolder, settings.gameFolder);
+    const std::optional<catalog::Settings> settings = LoadFor(*options);
+    if (!settings) {
+        return kExitStopped;
+    }
+    const engine::Roots roots = engine::ResolveRoots(options->toolFolder, settings->gameFolder);
     for (engine::Root root : {engine::Root::Data, engine::Root::ZData, engine::Root::ToolData,
                               engine::Root::ToolZData, engine::Root::Extras}) {
         std::cout << engine::RootName(root) << " = "
                   << platform::ResolveCaseInsensitive(roots.Of(root)).string() << '\n';
     }
-    for (const engine::PlanStep& step : engine::BuildPlan(settings.selection)) {
+    for (const engine::PlanStep& step : engine::BuildPlan(settings->selection)) {
         std::cout << CategoryKey(step.category) << ": " << engine::Describe(step) << '\n';
     }
     return kExitOk;
@@ -201,8 +214,13 @@ int RunVni(Args args) {
 int RunIni(Args args) {
     if (args.size() >= 4 && args.size() <= 5 && args[0] == "get") {
         const std::string_view fallback = args.size() == 5 ? args[4] : std::string_view();
-        std::cout << catalog::ReadIni(fs::path(std::string(args[1])), args[2], args[3], fallback)
-                  << '\n';
+        const fs::path file{std::string(args[1])};
+        catalog::IniDocument document;
+        if (const Status read = catalog::IniDocument::Read(file, &document); !read) {
+            std::cerr << "kickvane: " << read.reason() << '\n';
+            return 1;
+        }
+        std::cout << catalog::ReadIni(file, args[2], args[3], fallback) << '\n';
         return kExitOk;
     }
     if (args.size() == 5 && args[0] == "set") {

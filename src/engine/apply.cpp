@@ -67,6 +67,10 @@ std::string ToolDataMissingText(const Roots& roots) {
     return "Khong tim thay: " + roots.toolData.string() + "\r\nKiem tra lai duong dan";
 }
 
+std::string ToolDataTooLongText(const Roots& roots) {
+    return "Duong dan qua dai: " + roots.toolData.string() + "\r\nKiem tra lai duong dan";
+}
+
 std::filesystem::path SignalSoundPath(const std::filesystem::path& toolFolder) {
     return platform::ResolveCaseInsensitive(toolFolder / "sound.wav");
 }
@@ -81,8 +85,14 @@ ApplyOutcome ApplyPatches(const std::filesystem::path& toolFolder, std::string_v
         case RootProblem::ToolDataMissing:
             ui.ShowPlainMessage(ToolDataMissingText(roots), kToolDataMissingTitle);
             return outcome;
+        case RootProblem::ToolDataTooLong:
+            ui.ShowPlainMessage(ToolDataTooLongText(roots), kToolDataMissingTitle);
+            return outcome;
         case RootProblem::DataMissing:
             ui.Messages().ShowText(ui.Messages().ConvertText(kDataMissingVni));
+            return outcome;
+        case RootProblem::DataTooLong:
+            ui.Messages().ShowText(ui.Messages().ConvertText(kDataTooLongVni));
             return outcome;
         case RootProblem::None:
             break;

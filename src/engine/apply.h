@@ -41,9 +41,14 @@ using StepObserver = std::function<void(const StepOutcome&)>;
 // Messages of the two folder checks, as stored (the second one VNI-typed).
 inline constexpr std::string_view kToolDataMissingTitle = "Thu muc nguon";
 std::string ToolDataMissingText(const Roots& roots);
+std::string ToolDataTooLongText(const Roots& roots);
 inline constexpr std::string_view kDataMissingVni =
     "Kho6ng ti2m tha61y thu7 mu5c chu71a FIFA Online 2\r\nVui lo2ng kie63m tra la5i d9u7o72ng "
     "da64n";
+// The same when the system refuses the game's folder for the length of its path.
+inline constexpr std::string_view kDataTooLongVni =
+    "D9u7o72ng da64n thu7 mu5c chu71a FIFA Online 2 qua1 da2i\r\nVui lo2ng cho5n thu7 mu5c "
+    "ngu71n ho7n";
 
 // Copies the chosen sets from the tool folder into the game folder. The folder checks come first
 // and stop the run with their message. Then every step runs in plan order; a step that fails is

@@ -13,13 +13,17 @@ namespace {
 using platform::ResolveCaseInsensitive;
 
 // The entries of a target folder by their case-folded name, read once per folder so that a
-// merge of many files does not scan the folder for each of them.
+// merge of many files does not scan the folder for each of them. The same scan removes what
+// killed copies left behind: temporary files of ours that nothing writes any more.
 class FolderIndex {
 public:
     explicit FolderIndex(const fs::path& folder) : folder_(folder) {
         std::error_code ec;
         for (fs::directory_iterator it(folder, ec), end; !ec && it != end; it.increment(ec)) {
             const std::string name = it->path().filename().string();
+            if (platform::IsTemporaryName(name) && platform::RemoveIfStale(it->path())) {
+                continue;
+            }
             auto [pos, inserted] = names_.emplace(platform::FoldCase(name), name);
             if (!inserted && name < pos->second) {
                 pos->second = name;  // Same rule as the single lookup: first in name order.
@@ -82,17 +86,24 @@ Status CopyTree(const fs::path& source, const fs::path& target, CopyCount* count
     return Status::Ok();
 }
 
+// "not found", or "too long" when the system refuses the path for its length.
+Status NotFound(std::string_view what, const fs::path& path) {
+    return Status::Fail(std::string(what) +
+                        (platform::IsTooLong(path) ? " path too long: " : " not found: ") +
+                        path.string());
+}
+
 }  // namespace
 
 Status MergeCopy(const fs::path& source, const fs::path& target, CopyCount* count) {
     const fs::path from = ResolveCaseInsensitive(source);
     if (!platform::IsDirectory(from)) {
-        return Status::Fail("source folder not found: " + source.string());
+        return NotFound("source folder", from);
     }
     const fs::path into = ResolveCaseInsensitive(target);
     if (!platform::IsDirectory(into)) {
         if (!platform::IsDirectory(into.parent_path())) {
-            return Status::Fail("target's parent folder not found: " + target.string());
+            return NotFound("target's parent folder", into.parent_path());
         }
         if (Status made = platform::MakeDirectory(into); !made) {
             return made;
@@ -104,11 +115,11 @@ Status MergeCopy(const fs::path& source, const fs::path& target, CopyCount* coun
 Status CopyFileInto(const fs::path& file, const fs::path& folder, CopyCount* count) {
     const fs::path from = ResolveCaseInsensitive(file);
     if (!platform::IsRegularFile(from)) {
-        return Status::Fail("file not found: " + file.string());
+        return NotFound("file", from);
     }
     const fs::path into = ResolveCaseInsensitive(folder);
     if (!platform::IsDirectory(into)) {
-        return Status::Fail("folder not found: " + folder.string());
+        return NotFound("folder", into);
     }
     const fs::path target = platform::FindEntryIgnoringCase(into, from.filename().string())
                                 .value_or(into / from.filename());

@@ -1,6 +1,7 @@
 // File system backend for Linux and other POSIX systems, where names are case-sensitive and a
 // Windows game lives in a Wine prefix.
 #include <fcntl.h>
+#include <sys/file.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -45,14 +46,32 @@ private:
     int fd_;
 };
 
-// A temporary file beside its final place; removed unless it was renamed into place.
+// A temporary file beside its final place; removed unless it was renamed into place. It holds
+// an exclusive lock for its life, which tells RemoveIfStale that its writer still runs.
 class TempFile {
 public:
-    explicit TempFile(const fs::path& target)
-        : path_(target.parent_path() / ("." + target.filename().string() + ".kv-XXXXXX")) {
-        std::string pattern = path_.string();
-        fd_ = ::mkostemp(pattern.data(), O_CLOEXEC);
-        path_ = pattern;
+    explicit TempFile(const fs::path& target) {
+        const fs::path base =
+            target.parent_path() / (TemporaryNamePrefix(target.filename().string()) + "XXXXXX");
+        for (int attempt = 0; attempt < 8; ++attempt) {
+            std::string pattern = base.string();
+            const int fd = ::mkostemp(pattern.data(), O_CLOEXEC);
+            if (fd < 0) {
+                return;
+            }
+            // A cleaner may have taken the file for a stale one between its creation and the
+            // lock; it is then unlinked, and a new one is made. A file system without locks
+            // gets an unlocked file, which RemoveIfStale leaves alone.
+            struct stat st {};
+            const bool locked = ::flock(fd, LOCK_EX) == 0;
+            if (!locked || (::fstat(fd, &st) == 0 && st.st_nlink > 0)) {
+                fd_ = fd;
+                path_ = pattern;
+                return;
+            }
+            ::close(fd);
+        }
+        errno = EEXIST;
     }
     TempFile(const TempFile&) = delete;
     TempFile& operator=(const TempFile&) = delete;
@@ -60,7 +79,7 @@ public:
         if (fd_ >= 0) {
             ::close(fd_);
         }
-        if (!committed_) {
+        if (!committed_ && !path_.empty()) {
             ::unlink(path_.c_str());
         }
     }
@@ -220,6 +239,19 @@ Status WriteFileAtomically(const fs::path& path, std::string_view content) {
     struct stat old {};
     ::fchmod(temp.fd(), StatFile(path, old) ? (old.st_mode & 0777) : 0644);
     return temp.CommitAs(path);
+}
+
+bool RemoveIfStale(const fs::path& file) {
+    Fd fd(::open(file.c_str(), O_RDONLY | O_CLOEXEC | O_NOFOLLOW | O_NONBLOCK));
+    struct stat st {};
+    if (fd.get() < 0 || ::fstat(fd.get(), &st) != 0 || !S_ISREG(st.st_mode)) {
+        return false;
+    }
+    // The writer's lock goes with its process: a lock that can be taken has no writer.
+    if (::flock(fd.get(), LOCK_EX | LOCK_NB) != 0) {
+        return false;
+    }
+    return ::unlink(file.c_str()) == 0;
 }
 
 fs::path ProgramFolder() {

@@ -424,7 +424,12 @@ void MainWindow::showSelection() {
 void MainWindow::loadSettings() {
     catalog::Settings settings{gameFolder_->text().toStdString(),
                                hotkey_->currentText().toStdString(), selection_};
-    catalog::LoadSettings(toolFolder_, settings);
+    if (const Status loaded = catalog::LoadSettings(toolFolder_, settings); !loaded) {
+        services_.dialogs->ShowMessage(
+            this, NoticeTitle(),
+            QStringLiteral("%1\nĐang dùng thiết lập mặc định.").arg(FromUtf8(loaded.reason())),
+            Dialogs::Icon::Warning);
+    }
     gameFolder_->setText(QString::fromStdString(settings.gameFolder));
     hotkey_->setCurrentText(QString::fromStdString(settings.hotkey));
     selection_ = settings.selection;

@@ -86,10 +86,13 @@ TEST_F(MainWindowTest, SettingsLoadIntoTheWidgetsAndSaveRoundTrips) {
 TEST_F(MainWindowTest, FailedSaveShowsAnErrorInsteadOfThePopup) {
     std::filesystem::create_directories(tool() / "ThietLap.ini");  // a folder where the file goes
     auto window = Open();
+    ASSERT_EQ(dialogs_.messages.size(), 1);  // the start-up says the file cannot be read
+    EXPECT_TRUE(dialogs_.messages[0].contains("là một thư mục"))
+        << dialogs_.messages[0].toStdString();
     Click(window->saveButton());
     EXPECT_TRUE(dialogs_.popups.isEmpty());
-    ASSERT_EQ(dialogs_.messages.size(), 1);
-    EXPECT_TRUE(dialogs_.messages[0].startsWith("Thông báo|Không lưu được thiết lập!"));
+    ASSERT_EQ(dialogs_.messages.size(), 2);
+    EXPECT_TRUE(dialogs_.messages[1].startsWith("Thông báo|Không lưu được thiết lập!"));
 }
 
 TEST_F(MainWindowTest, HotkeyTickAppliesThePatchesOnlyForAKeyThatIsNamedAndPressed) {
