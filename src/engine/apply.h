@@ -48,7 +48,7 @@ inline constexpr std::string_view kDataMissingVni =
 // The same when the system refuses the game's folder for the length of its path.
 inline constexpr std::string_view kDataTooLongVni =
     "D9u7o72ng da64n thu7 mu5c chu71a FIFA Online 2 qua1 da2i\r\nVui lo2ng cho5n thu7 mu5c "
-    "ngu71n ho7n";
+    "nga81n ho7n";
 
 // Copies the chosen sets from the tool folder into the game folder. The folder checks come first
 // and stop the run with their message. Then every step runs in plan order; a step that fails is

@@ -50,6 +50,11 @@ TEST_F(ApplyTest, FolderChecksStopTheRunWithTheirMessageBeforeAnyCopyOrSound) {
     EXPECT_EQ(ui_.messages.shown, std::vector<std::string>{"Không tìm thấy thư mục chứa FIFA "
                                                            "Online 2\r\nVui lòng kiểm tra lại "
                                                            "đường dẫn"});
+    // A game folder that the system refuses for the length of its path is too long, not missing.
+    EXPECT_EQ(Apply(PatchSelection::Defaults(), "/" + std::string(300, 'x')).stoppedBy,
+              RootProblem::DataTooLong);
+    EXPECT_EQ(ui_.messages.shown.back(),
+              "Đường dẫn thư mục chứa FIFA Online 2 quá dài\r\nVui lòng chọn thư mục ngắn hơn");
 
     // The tool's own base set is checked first, with a plain message.
     fs::remove_all(tool() / "data");
@@ -58,7 +63,7 @@ TEST_F(ApplyTest, FolderChecksStopTheRunWithTheirMessageBeforeAnyCopyOrSound) {
     EXPECT_EQ(ui_.plain, std::vector<std::string>{
                              "Thu muc nguon|Khong tim thay: " + (tool() / "data/data2").string() +
                              "\r\nKiem tra lai duong dan"});
-    EXPECT_EQ(ui_.messages.shown.size(), 1u);
+    EXPECT_EQ(ui_.messages.shown.size(), 2u);
     EXPECT_TRUE(outcome.steps.empty());
     EXPECT_TRUE(ui_.sounds.empty());
     EXPECT_FALSE(fs::exists(game() / "zdata/data2/ball"));
@@ -137,11 +142,16 @@ TEST(MergeCopy, FailsOnAMissingSourceAndFindsTheSourceInAnyCase) {
     WriteFile(dir / "src/sub/a.dds", "a");
     EXPECT_FALSE(MergeCopy(dir / "missing", dir / "dst").ok());
     EXPECT_FALSE(fs::exists(dir / "dst"));
+    const Status tooLong = MergeCopy(dir / "src", dir / std::string(300, 'x') / "dst");
+    EXPECT_NE(tooLong.reason().find("too long"), std::string::npos) << tooLong.reason();
 
+    // What a killed copy left in a target folder goes when the run writes there.
+    WriteFile(dir / "dst/sub/.a.dds.kv-Ab12Cd", "half a texture");
     CopyCount count;
     ASSERT_TRUE(MergeCopy(dir / "SRC", dir / "dst", &count).ok());
     EXPECT_EQ(ReadText(dir / "dst/sub/a.dds"), "a");
     EXPECT_EQ(count.copied, 1);
+    EXPECT_EQ(std::distance(fs::directory_iterator(dir / "dst/sub"), {}), 1);
 }
 
 TEST(MakeFolder, FailsWhenTheFolderExistsInAnyCaseOrItsParentIsMissing) {
