@@ -14,6 +14,8 @@ packages=(
   xvfb xauth xdotool x11-utils trayer imagemagick
   # fonts with Vietnamese glyphs for the window and the artwork
   fonts-dejavu-core
+  # fuzzing (clang brings libFuzzer and the sanitizers) and the apply benchmark's baselines
+  clang rsync
 )
 
 missing=()

@@ -75,9 +75,15 @@ std::string WithoutLineBreaks(std::string_view text) {
     return out;
 }
 
-// A section or key name as it is compared and stored.
+// A section or key name as it is compared and stored. A byte-order mark in front counts as a
+// blank: at the start of the file it would be read back as the file's own mark.
 std::string NormalizeName(std::string_view name) {
-    return std::string(TrimBlanks(WithoutLineBreaks(text::LegacyTextToUtf8(name))));
+    const std::string text = WithoutLineBreaks(text::LegacyTextToUtf8(name));
+    std::string_view trimmed = TrimBlanks(text);
+    while (trimmed.starts_with(kUtf8Mark)) {
+        trimmed = TrimBlanks(trimmed.substr(kUtf8Mark.size()));
+    }
+    return std::string(trimmed);
 }
 
 enum class LineKind { kBlank, kComment, kSection, kEntry, kOther };
