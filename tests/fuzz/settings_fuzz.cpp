@@ -22,12 +22,12 @@ bool KeptExactly(std::string_view value) {
         value.find_first_of(std::string_view("\r\n\0", 3)) != std::string_view::npos) {
         return false;
     }
-    if (!value.empty() && (value.front() == ' ' || value.front() == '\t' ||
-                           value.back() == ' ' || value.back() == '\t')) {
+    if (!value.empty() && (value.front() == ' ' || value.front() == '\t' || value.back() == ' ' ||
+                           value.back() == '\t')) {
         return false;
     }
-    return value.size() < 2 || !((value.front() == '"' || value.front() == '\'') &&
-                                 value.back() == value.front());
+    return value.size() < 2 ||
+           !((value.front() == '"' || value.front() == '\'') && value.back() == value.front());
 }
 
 void ReadEveryKey(const IniDocument& document) {
