@@ -1,7 +1,12 @@
-// Measures the patch application on a generated tool folder of realistic size against `cp -r` of
-// the same source folders, and a second application with nothing changed against the first.
+// Measures `kickvane apply`, the whole program as a user runs it, on generated tool folders:
+// the first apply against `cp -r` of the same source folders, and a second apply with nothing
+// changed against `rsync -a` with nothing to do. Two cases: a tool folder of realistic size with
+// every category on, and 8,000 small files (4-64 KiB) over the Face, Kit, Boots and Logo sets,
+// where the cost per file counts most.
 //
 //   apply_bench [WORK_DIR]     (default: a new folder under the system's temporary folder)
+//
+// KICKVANE_BENCH_PROGRAM names another kickvane program to measure (an earlier build, say).
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -16,7 +21,9 @@
 #include <string>
 #include <vector>
 
-#include "engine/apply.h"
+#include "catalog/settings.h"
+#include "engine/plan.h"
+#include "engine/roots.h"
 
 namespace {
 
@@ -25,35 +32,22 @@ using Clock = std::chrono::steady_clock;
 using kickvane::catalog::OptionArray;
 using kickvane::catalog::PatchSelection;
 
-class SilentUi final : public kickvane::engine::EngineUi {
-public:
-    kickvane::text::MessageHelper& Messages() override { return messages_; }
-    void ShowPlainMessage(std::string_view, std::string_view) override {}
-    void PlaySound(const fs::path&) override {}
-    void ShowPopup(const kickvane::engine::PopupRequest&) override {}
-
-private:
-    class Quiet final : public kickvane::text::MessageHelper {
-    public:
-        void ShowText(std::string_view text) override { std::cerr << text << '\n'; }
-        std::string ReadWindowText(std::uintptr_t) const override { return {}; }
-    } messages_;
-};
-
 struct TreeSize {
     int files = 0;
     std::uintmax_t bytes = 0;
 };
 
 // Writes `count` files into `folder`: mostly textures of 8-200 KiB, one in twenty of 1-2 MiB,
-// as the game's data trees hold them.
-void Fill(const fs::path& folder, int count, std::mt19937& random, TreeSize& size) {
+// as the game's data trees hold them; with `smallOnly`, files of 4-64 KiB.
+void Fill(const fs::path& folder, int count, std::mt19937& random, TreeSize& size,
+          bool smallOnly = false) {
     fs::create_directories(folder);
     std::uniform_int_distribution<int> small(8 << 10, 200 << 10);
     std::uniform_int_distribution<int> large(1 << 20, 2 << 20);
+    std::uniform_int_distribution<int> tiny(4 << 10, 64 << 10);
     std::string data;
     for (int i = 0; i < count; ++i) {
-        const int bytes = (i % 20 == 19) ? large(random) : small(random);
+        const int bytes = smallOnly ? tiny(random) : (i % 20 == 19) ? large(random) : small(random);
         data.resize(static_cast<size_t>(bytes));
         for (size_t at = 0; at < data.size(); at += 4096) {
             data[at] = static_cast<char>(random());
@@ -95,6 +89,19 @@ TreeSize MakeToolFolder(const fs::path& tool) {
     return size;
 }
 
+// 8,000 small files over the sets of the Face, Boots, Kit and Logo categories.
+TreeSize MakeSmallFilesToolFolder(const fs::path& tool) {
+    std::mt19937 random(2027);
+    TreeSize size;
+    const fs::path base = tool / "data/data2";
+    Fill(base / "players/heads/textures", 2500, random, size, true);
+    Fill(base / "players/bodies/textures", 1000, random, size, true);
+    Fill(base / "players/accessories", 1000, random, size, true);
+    Fill(base / "players/kit", 2500, random, size, true);
+    Fill(base / "teams/emblems", 1000, random, size, true);
+    return size;
+}
+
 void MakeGameFolder(const fs::path& game) {
     for (const char* folder :
          {"data2/gui/hud", "data2/players", "data2/pitch", "zdata/data2/crowd"}) {
@@ -114,14 +121,41 @@ PatchSelection EverythingOn() {
     return selection;
 }
 
+// Face, Boots, Kit and Logo on, everything else off.
+PatchSelection SmallFileSets() {
+    PatchSelection selection = PatchSelection::Defaults();
+    for (int i = 0; i < kickvane::catalog::kCategoryCount; ++i) {
+        const std::string_view key = kickvane::catalog::Categories()[static_cast<size_t>(i)].key;
+        const bool on = key == "Face" || key == "Giay" || key == "Kit" || key == "Logo";
+        selection.setSwitchValue(i, on ? 1 : 0);
+    }
+    return selection;
+}
+
 double Seconds(Clock::duration elapsed) {
     return std::chrono::duration<double>(elapsed).count();
 }
 
-// `cp -r` of every source folder and file that the plan copies, each into its own fresh target.
-double TimeCopyBaseline(const fs::path& tool, const fs::path& into,
-                        const PatchSelection& selection) {
-    const kickvane::engine::Roots roots = kickvane::engine::ResolveRoots(tool, into.string());
+std::string Quote(const fs::path& path) {
+    return "'" + path.string() + "'";
+}
+
+// Runs a shell command after flushing earlier writes, and returns how long it took.
+double TimeCommand(const std::string& command) {
+    ::sync();  // start each measurement with no writes of the previous one pending
+    const auto start = Clock::now();
+    const int status = std::system(command.c_str());
+    const double elapsed = Seconds(Clock::now() - start);
+    if (!WIFEXITED(status) || WEXITSTATUS(status) != 0) {
+        std::cerr << "failed: " << command.substr(0, 300) << '\n';
+        std::exit(1);
+    }
+    return elapsed;
+}
+
+// Every source folder and file that the plan copies.
+std::vector<fs::path> PlanSources(const fs::path& tool, const PatchSelection& selection) {
+    const kickvane::engine::Roots roots = kickvane::engine::ResolveRoots(tool, "/nowhere");
     std::set<fs::path> sources;
     for (const auto& step : kickvane::engine::BuildPlan(selection)) {
         if (step.kind != kickvane::engine::StepKind::MakeFolder) {
@@ -131,43 +165,72 @@ double TimeCopyBaseline(const fs::path& tool, const fs::path& into,
             }
         }
     }
-    fs::create_directories(into);
-    ::sync();  // start each measurement with no writes of the previous one pending
-    std::string command = "set -e";
-    int n = 0;
-    for (const fs::path& source : sources) {
-        command +=
-            "; cp -r '" + source.string() + "' '" + (into / std::to_string(n++)).string() + "'";
-    }
-    const auto start = Clock::now();
-    const int status = std::system(command.c_str());
-    const double elapsed = Seconds(Clock::now() - start);
-    if (!WIFEXITED(status) || WEXITSTATUS(status) != 0) {
-        std::cerr << "cp -r failed\n";
-        std::exit(1);
-    }
-    return elapsed;
+    return {sources.begin(), sources.end()};
 }
 
-double TimeApply(const fs::path& tool, const fs::path& game, const PatchSelection& selection) {
-    SilentUi ui;
-    ::sync();
-    const auto start = Clock::now();
-    const auto outcome = kickvane::engine::ApplyPatches(tool, game.string(), selection, ui);
-    const double elapsed = Seconds(Clock::now() - start);
-    if (outcome.stopped() || !outcome.Failures().empty()) {
-        for (const auto& failure : outcome.Failures()) {
-            std::cerr << "failed: " << kickvane::engine::Describe(failure.step) << ": "
-                      << failure.reason << '\n';
-        }
-        std::exit(1);
+// `cp -r` of each source into its own fresh target under `into`; then, untimed, `rsync -a` to
+// give the copies the sources' times, and timed, `rsync -a` again with nothing to do.
+std::pair<double, double> TimeBaselines(const std::vector<fs::path>& sources,
+                                        const fs::path& into) {
+    fs::create_directories(into);
+    std::string copy = "set -e";
+    std::string sync = "set -e";
+    for (size_t n = 0; n < sources.size(); ++n) {
+        const fs::path target = into / std::to_string(n);
+        const bool folder = fs::is_directory(sources[n]);
+        copy += "; cp -r " + Quote(sources[n]) + " " + Quote(target);
+        sync += "; rsync -a " + Quote(sources[n].string() + (folder ? "/" : "")) + " " +
+                Quote(target.string() + (folder ? "/" : ""));
     }
-    return elapsed;
+    const double copied = TimeCommand(copy);
+    TimeCommand(sync);
+    return {copied, TimeCommand(sync)};
+}
+
+double TimeApply(const fs::path& tool, const fs::path& game) {
+    const char* other = std::getenv("KICKVANE_BENCH_PROGRAM");
+    const fs::path program = other && *other ? other : KICKVANE_BINARY;
+    return TimeCommand(Quote(program) + " apply --tool-folder " + Quote(tool) + " --game " +
+                       Quote(game) + " > /dev/null");
 }
 
 double Median(std::vector<double> values) {
     std::sort(values.begin(), values.end());
     return values[values.size() / 2];
+}
+
+struct Ratios {
+    double first;   // first apply / cp -r
+    double second;  // apply with nothing changed / rsync -a with nothing to do
+};
+
+Ratios RunCase(const std::string& name, const fs::path& work, const fs::path& tool,
+               const TreeSize& size, const PatchSelection& selection, size_t rounds) {
+    if (!kickvane::catalog::SaveSettings(tool, {"C:\\Program Files", "F7", selection}).ok()) {
+        std::cerr << "cannot write the settings of " << tool << '\n';
+        std::exit(1);
+    }
+    const std::vector<fs::path> sources = PlanSources(tool, selection);
+    std::cout << name << ": " << size.files << " files, " << size.bytes / (1 << 20) << " MiB\n";
+    std::vector<double> firstRatios;
+    std::vector<double> secondRatios;
+    for (size_t round = 0; round < rounds; ++round) {
+        const fs::path baseline = work / ("cp-" + std::to_string(round));
+        const fs::path game = work / ("game-" + std::to_string(round));
+        MakeGameFolder(game);
+        const auto [copy, rsync] = TimeBaselines(sources, baseline);
+        const double first = TimeApply(tool, game);
+        const double second = TimeApply(tool, game);
+        fs::remove_all(baseline);
+        fs::remove_all(game);
+        std::cout << "  round " << round + 1 << ": cp -r " << copy << " s, first apply " << first
+                  << " s; rsync -a (nothing to do) " << rsync << " s, second apply " << second
+                  << " s\n";
+        // Ratios per round, then their median: each round's pair ran under the same load.
+        firstRatios.push_back(first / copy);
+        secondRatios.push_back(second / rsync);
+    }
+    return {Median(firstRatios), Median(secondRatios)};
 }
 
 }  // namespace
@@ -178,36 +241,18 @@ int main(int argc, char** argv) {
                               : fs::temp_directory_path() /
                                     ("kickvane-bench-" + std::to_string(std::random_device()()));
     fs::create_directories(work);
-    const fs::path tool = work / "tool";
-    const TreeSize size = MakeToolFolder(tool);
-    const PatchSelection selection = EverythingOn();
-    std::cout << "tool folder: " << size.files << " files, " << size.bytes / (1 << 20) << " MiB\n";
-
-    constexpr size_t kRounds = 5;
-    std::vector<double> copyTimes;
-    std::vector<double> firstTimes;
-    std::vector<double> secondTimes;
-    for (size_t round = 0; round < kRounds; ++round) {
-        const fs::path baseline = work / ("cp-" + std::to_string(round));
-        const fs::path game = work / ("game-" + std::to_string(round));
-        MakeGameFolder(game);
-        copyTimes.push_back(TimeCopyBaseline(tool, baseline, selection));
-        firstTimes.push_back(TimeApply(tool, game, selection));
-        secondTimes.push_back(TimeApply(tool, game, selection));
-        fs::remove_all(baseline);
-        fs::remove_all(game);
-        std::cout << "round " << round + 1 << ": cp -r " << copyTimes.back() << " s, first apply "
-                  << firstTimes.back() << " s, second apply " << secondTimes.back() << " s\n";
+    const fs::path realistic = work / "tool";
+    const fs::path small = work / "tool-small";
+    const Ratios everything =
+        RunCase("every category", work, realistic, MakeToolFolder(realistic), EverythingOn(), 5);
+    const Ratios smallFiles = RunCase("8,000 small files (Face, Kit, Boots, Logo)", work, small,
+                                      MakeSmallFilesToolFolder(small), SmallFileSets(), 5);
+    for (const auto& [name, ratios] :
+         {std::pair{"every category", everything}, std::pair{"small files", smallFiles}}) {
+        std::cout << name << ": first apply / cp -r " << ratios.first
+                  << " (goal <= 1.0); second apply / rsync -a " << ratios.second
+                  << " (goal <= 1.0)\n";
     }
-    // Ratios per round, then their median: each round's pair ran under the same machine load.
-    std::vector<double> firstRatios;
-    std::vector<double> secondRatios;
-    for (size_t round = 0; round < kRounds; ++round) {
-        firstRatios.push_back(firstTimes[round] / copyTimes[round]);
-        secondRatios.push_back(secondTimes[round] / firstTimes[round]);
-    }
-    std::cout << "first apply / cp -r:        " << Median(firstRatios) << "  (goal <= 1.15)\n"
-              << "second apply / first apply: " << Median(secondRatios) << "  (goal <= 0.10)\n";
     fs::remove_all(work);
     return 0;
 }

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <unordered_map>
+#include <utility>
 #include <vector>
 
 #include "platform/filesystem.h"
@@ -17,7 +18,7 @@ using platform::ResolveCaseInsensitive;
 // killed copies left behind: temporary files of ours that nothing writes any more.
 class FolderIndex {
 public:
-    explicit FolderIndex(const fs::path& folder) : folder_(folder) {
+    explicit FolderIndex(const fs::path& folder) {
         std::error_code ec;
         for (fs::directory_iterator it(folder, ec), end; !ec && it != end; it.increment(ec)) {
             const std::string name = it->path().filename().string();
@@ -31,14 +32,14 @@ public:
         }
     }
 
-    // The existing entry for `name` in any letter case, else `name` as given.
-    fs::path Entry(const std::string& name) const {
+    // The name of the existing entry for `name` in any letter case, else `name` as given, and
+    // whether there was one.
+    std::pair<std::string, bool> Name(const std::string& name) const {
         auto found = names_.find(platform::FoldCase(name));
-        return folder_ / (found == names_.end() ? name : found->second);
+        return found == names_.end() ? std::pair{name, false} : std::pair{found->second, true};
     }
 
 private:
-    fs::path folder_;
     std::unordered_map<std::string, std::string> names_;
 };
 
@@ -67,11 +68,14 @@ Status CopyTree(const fs::path& source, const fs::path& target, CopyCount* count
     }
     std::sort(entries.begin(), entries.end());
     const FolderIndex index(target);
+    platform::FolderCopy files(source, target);  // both folders opened once for all files
     for (const fs::directory_entry& entry : entries) {
-        const fs::path into = index.Entry(entry.path().filename().string());
+        const std::string name = entry.path().filename().string();
+        const auto [targetName, exists] = index.Name(name);
         std::error_code typeError;
         if (entry.is_directory(typeError)) {
-            if (!platform::IsDirectory(into)) {
+            const fs::path into = target / targetName;
+            if (!exists || !platform::IsDirectory(into)) {
                 if (Status made = platform::MakeDirectory(into); !made) {
                     return made;
                 }
@@ -79,8 +83,14 @@ Status CopyTree(const fs::path& source, const fs::path& target, CopyCount* count
             if (Status copied = CopyTree(entry.path(), into, count); !copied) {
                 return copied;
             }
-        } else if (Status copied = CopyOne(entry.path(), into, count); !copied) {
-            return copied;
+            continue;
+        }
+        bool copied = false;
+        if (Status status = files.Copy(name, targetName, exists, &copied); !status) {
+            return status;
+        }
+        if (count) {
+            ++(copied ? count->copied : count->upToDate);
         }
     }
     return Status::Ok();

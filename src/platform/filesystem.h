@@ -43,6 +43,29 @@ bool IsUpToDateCopy(const fs::path& source, const fs::path& target);
 // modification time. Fails when the source is no readable file or the target's folder is missing.
 Status ReplaceFile(const fs::path& source, const fs::path& target);
 
+// Copies files from one folder into another, each as ReplaceFile does, unless the target already
+// equals its source (IsUpToDateCopy). Both folders are opened once, so that the copy of one file
+// does not look their paths up again.
+class FolderCopy {
+public:
+    FolderCopy(const fs::path& sourceFolder, const fs::path& targetFolder);
+    ~FolderCopy();
+    FolderCopy(const FolderCopy&) = delete;
+    FolderCopy& operator=(const FolderCopy&) = delete;
+
+    // Copies `sourceName` of the source folder to `targetName` of the target folder; sets
+    // `copied` to false when the target was up to date. `targetMayExist` false (the caller knows
+    // the target folder holds no such name) spares the look at the target.
+    Status Copy(const std::string& sourceName, const std::string& targetName, bool targetMayExist,
+                bool* copied);
+
+private:
+    fs::path source_;
+    fs::path target_;
+    int sourceFd_ = -1;
+    int targetFd_ = -1;
+};
+
 // Writes `content` to a temporary file beside `path`, flushes it and renames it over `path`.
 // On failure the previous file is left as it was.
 Status WriteFileAtomically(const fs::path& path, std::string_view content);

@@ -96,6 +96,20 @@ Status WriteFileAtomically(const fs::path& path, std::string_view content) {
     return MoveOver(temporary, path);
 }
 
+FolderCopy::FolderCopy(const fs::path& sourceFolder, const fs::path& targetFolder)
+    : source_(sourceFolder), target_(targetFolder) {}
+
+FolderCopy::~FolderCopy() = default;
+
+Status FolderCopy::Copy(const std::string& sourceName, const std::string& targetName, bool,
+                        bool* copied) {
+    // The names come from path::string(), so they convert back the same way.
+    const fs::path source = source_ / fs::path(sourceName);
+    const fs::path target = target_ / fs::path(targetName);
+    *copied = !IsUpToDateCopy(source, target);
+    return *copied ? ReplaceFile(source, target) : Status::Ok();
+}
+
 bool RemoveIfStale(const fs::path& file) {
     // A file that its writer still holds open cannot be deleted. Between the writer's close and
     // its rename the file is free, so only files made some time ago count as stale.
