@@ -43,6 +43,9 @@ bool IsVersionText(std::string_view text) {
     if (text.ends_with("\r\n")) {
         text.remove_suffix(2);
     }
+    if (text.ends_with('\n')) {
+        text.remove_suffix(1);  // a file written with Unix line ends: "v2.1" LF
+    }
     if (text.empty() || text.size() > kMaxVersionLength * 4 || !IsValidUtf8(text)) {
         return false;
     }

@@ -17,8 +17,9 @@ std::string ReadFetchedText(std::string_view bytes);
 inline constexpr size_t kMaxVersionLength = 64;
 
 // True when a fetched text (as ReadFetchedText gives it) can be a version: without its final
-// CR LF, one line of 1 to kMaxVersionLength printable characters, not all blanks. An empty
-// answer, a lone line feed, a web page or binary data is no version.
+// CR LF (and a line feed before it, from a file with Unix line ends), one line of 1 to
+// kMaxVersionLength printable characters, not all blanks. An empty answer, a lone line feed, a
+// web page or binary data is no version.
 bool IsVersionText(std::string_view text);
 
 // The fetched link without surrounding blanks and line breaks, when it is an http or https
