@@ -70,10 +70,17 @@ std::optional<Options> ParseOptions(Args args, bool allowGame) {
     return options;
 }
 
-session::Session SessionFor(const Options& options) {
-    session::Session session(options.toolFolder);
+// The session of the tool folder, with the game folder of the command line. nullopt, with the
+// reason on standard error, when the settings file exists but cannot be read: acting on defaults
+// the user never chose would be wrong.
+std::optional<session::Session> SessionFor(const Options& options) {
+    std::optional<session::Session> session(std::in_place, options.toolFolder);
+    if (const Status& read = session->settingsRead(); !read) {
+        std::cerr << "kickvane: " << read.reason() << '\n';
+        return std::nullopt;
+    }
     if (options.game) {
-        session.setGameFolder(*options.game);
+        session->setGameFolder(*options.game);
     }
     return session;
 }
@@ -134,8 +141,11 @@ int RunApply(Args args) {
         PrintUsage(std::cerr);
         return kExitStopped;
     }
-    session::Session session = SessionFor(*options);
-    const session::ApplyRun run = session.Apply();
+    std::optional<session::Session> session = SessionFor(*options);
+    if (!session) {
+        return kExitStopped;
+    }
+    const session::ApplyRun run = session->Apply();
     const engine::ApplyOutcome& outcome = run.apply;
     if (outcome.stopped()) {
         Print(run.shown);
@@ -159,15 +169,18 @@ int RunPlan(Args args) {
         PrintUsage(std::cerr);
         return kExitStopped;
     }
-    const session::Session session = SessionFor(*options);
+    const std::optional<session::Session> session = SessionFor(*options);
+    if (!session) {
+        return kExitStopped;
+    }
     const engine::Roots roots =
-        engine::ResolveRoots(options->toolFolder, session.settings().gameFolder);
+        engine::ResolveRoots(options->toolFolder, session->settings().gameFolder);
     for (engine::Root root : {engine::Root::Data, engine::Root::ZData, engine::Root::ToolData,
                               engine::Root::ToolZData, engine::Root::Extras}) {
         std::cout << engine::RootName(root) << " = "
                   << platform::ResolveCaseInsensitive(roots.Of(root)).string() << '\n';
     }
-    for (const engine::PlanStep& step : session.Plan()) {
+    for (const engine::PlanStep& step : session->Plan()) {
         std::cout << CategoryKey(step.category) << ": " << engine::Describe(step) << '\n';
     }
     return kExitOk;
@@ -212,8 +225,13 @@ int RunVni(Args args) {
 int RunIni(Args args) {
     if (args.size() >= 4 && args.size() <= 5 && args[0] == "get") {
         const std::string_view fallback = args.size() == 5 ? args[4] : std::string_view();
-        std::cout << catalog::ReadIni(fs::path(std::string(args[1])), args[2], args[3], fallback)
-                  << '\n';
+        const fs::path file{std::string(args[1])};
+        catalog::IniDocument document;
+        if (const Status read = catalog::IniDocument::Read(file, &document); !read) {
+            std::cerr << "kickvane: " << read.reason() << '\n';
+            return 1;
+        }
+        std::cout << catalog::ReadIni(file, args[2], args[3], fallback) << '\n';
         return kExitOk;
     }
     if (args.size() == 5 && args[0] == "set") {

@@ -1,15 +1,11 @@
 // Subcommands that find the game and start it, and the choice of the tool folder.
 #include <iostream>
 
-#include "catalog/settings.h"
 #include "commands.h"
 #include "engine/find_game.h"
-#include "engine/launch_plan.h"
-#include "engine/launcher.h"
 #include "engine/tool_folder.h"
 #include "platform/filesystem.h"
-#include "platform/process.h"
-#include "text/vni.h"
+#include "session/session.h"
 
 namespace kickvane::app {
 
@@ -37,29 +33,20 @@ int RunLaunch(Args args) {
         PrintUsage(std::cerr);
         return 2;
     }
-    const catalog::Settings settings = catalog::LoadSettings(toolFolder);
-    const engine::LaunchDecision decision = engine::PlanLaunch(
-        settings.gameFolder, engine::UserFolders::FromEnvironment(), platform::FindOnPath);
-    switch (decision.problem) {
-        case engine::LaunchProblem::LauncherMissing:
-            std::cerr << "kickvane: " << text::VniToUnicodeUtf8(engine::kLauncherMissingVni) << " ("
-                      << settings.gameFolder << ")\n";
-            return 1;
-        case engine::LaunchProblem::WineMissing:
-            std::cerr << "kickvane: " << engine::kWineMissingText << '\n';
-            return 1;
-        case engine::LaunchProblem::None:
-            break;
+    session::Session session(toolFolder);
+    if (const Status& read = session.settingsRead(); !read) {
+        std::cerr << "kickvane: " << read.reason() << '\n';
+        return 2;
     }
-    const engine::LaunchPlan& plan = decision.plan;
-    const Status started = platform::StartDetached(plan.program, plan.arguments, plan.workingFolder,
-                                                   true, plan.environment);
-    if (!started) {
-        std::cerr << "kickvane: " << started.reason() << '\n';
+    const session::LaunchRun run = session.Launch(session::LaunchFrom::Tray);
+    if (!run.launch.started()) {
+        for (const text::Message& message : run.shown.messages) {
+            std::cerr << "kickvane: " << message.text << " (" << session.settings().gameFolder
+                      << ")\n";
+        }
         return 1;
     }
-    std::cout << "started " << plan.program.filename().string() << " through " << plan.description
-              << '\n';
+    std::cout << "started Gameloader.exe through " << run.launch.startedThrough << '\n';
     return 0;
 }
 

@@ -16,6 +16,8 @@ packages=(
   fonts-dejavu-core
   # Lutris's game database (read-only); desktop entry check and packages of the install test
   libsqlite3-dev desktop-file-utils dpkg-dev
+  # fuzzing (clang brings libFuzzer and the sanitizers) and the apply benchmark's baselines
+  clang rsync
 )
 
 missing=()

@@ -18,3 +18,6 @@ done
 echo "== windows-core: cross-build"
 cmake --preset windows-core >/dev/null
 cmake --build --preset windows-core -j "$jobs"
+
+echo "== fuzz: a short run of every target"
+scripts/fuzz.sh --runs 20000

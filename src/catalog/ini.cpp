@@ -15,22 +15,61 @@ namespace fs = std::filesystem;
 
 namespace {
 
-constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
+constexpr std::string_view kUtf8Mark = "\xEF\xBB\xBF";
+constexpr std::string_view kUtf16LeMark = "\xFF\xFE";
+constexpr std::string_view kUtf16BeMark = "\xFE\xFF";
 
+// UTF-16 bytes in the given order to UTF-8; an odd last byte becomes U+FFFD.
+std::string Utf16BytesToUtf8(std::string_view bytes, bool bigEndian) {
+    std::u16string units;
+    units.reserve(bytes.size() / 2);
+    for (size_t i = 0; i + 1 < bytes.size(); i += 2) {
+        const auto first = static_cast<unsigned char>(bytes[i]);
+        const auto second = static_cast<unsigned char>(bytes[i + 1]);
+        units.push_back(
+            static_cast<char16_t>(bigEndian ? (first << 8 | second) : (second << 8 | first)));
+    }
+    if (bytes.size() % 2 != 0) {
+        units.push_back(u'\uFFFD');
+    }
+    return text::Utf16ToUtf8(units);
+}
+
+std::string Utf8ToUtf16Bytes(std::string_view utf8, bool bigEndian) {
+    const std::u16string units = text::Utf8ToUtf16(utf8);
+    std::string bytes;
+    bytes.reserve(units.size() * 2);
+    for (const char16_t unit : units) {
+        const auto high = static_cast<char>(unit >> 8);
+        const auto low = static_cast<char>(unit & 0xFF);
+        bytes += bigEndian ? high : low;
+        bytes += bigEndian ? low : high;
+    }
+    return bytes;
+}
+
+// Drops what a line of the file cannot hold: line breaks, and NUL, which would make the file
+// unreadable as text.
 std::string WithoutLineBreaks(std::string_view text) {
     std::string out;
     out.reserve(text.size());
     for (const char c : text) {
-        if (c != '\r' && c != '\n') {
+        if (c != '\r' && c != '\n' && c != '\0') {
             out += c;
         }
     }
     return out;
 }
 
-// A section or key name as it is compared and stored.
+// A section or key name as it is compared and stored. A byte-order mark in front counts as a
+// blank: at the start of the file it would be read back as the file's own mark.
 std::string NormalizeName(std::string_view name) {
-    return std::string(platform::TrimBlanks(WithoutLineBreaks(text::LegacyTextToUtf8(name))));
+    const std::string text = WithoutLineBreaks(text::LegacyTextToUtf8(name));
+    std::string_view trimmed = platform::TrimBlanks(text);
+    while (trimmed.starts_with(kUtf8Mark)) {
+        trimmed = platform::TrimBlanks(trimmed.substr(kUtf8Mark.size()));
+    }
+    return std::string(trimmed);
 }
 
 enum class LineKind { kBlank, kComment, kSection, kEntry, kOther };
@@ -80,11 +119,20 @@ std::string DisplayName(const fs::path& path) {
 
 }  // namespace
 
-IniDocument IniDocument::Parse(std::string_view bytes) {
+std::optional<IniDocument> IniDocument::Parse(std::string_view bytes) {
     IniDocument document;
-    if (bytes.substr(0, kByteOrderMark.size()) == kByteOrderMark) {
-        document.has_byte_order_mark_ = true;
-        bytes.remove_prefix(kByteOrderMark.size());
+    std::string decoded;  // the text as UTF-8 when it came in UTF-16
+    if (bytes.starts_with(kUtf16LeMark) || bytes.starts_with(kUtf16BeMark)) {
+        const bool bigEndian = bytes.starts_with(kUtf16BeMark);
+        document.encoding_ = bigEndian ? IniEncoding::Utf16Be : IniEncoding::Utf16Le;
+        decoded = Utf16BytesToUtf8(bytes.substr(2), bigEndian);
+        bytes = decoded;
+    } else if (bytes.starts_with(kUtf8Mark)) {
+        document.encoding_ = IniEncoding::Utf8WithBom;
+        bytes.remove_prefix(kUtf8Mark.size());
+    }
+    if (bytes.find('\0') != std::string_view::npos) {
+        return std::nullopt;
     }
     size_t start = 0;
     while (start < bytes.size()) {
@@ -104,35 +152,48 @@ IniDocument IniDocument::Parse(std::string_view bytes) {
     return document;
 }
 
-IniDocument IniDocument::Load(const fs::path& file) {
-    const std::optional<std::string> bytes =
-        platform::ReadFile(platform::ResolveCaseInsensitive(file));
-    return bytes ? Parse(*bytes) : IniDocument();
-}
-
-Status IniDocument::LoadForUpdate(const fs::path& file, IniDocument* document) {
+Status IniDocument::Read(const fs::path& file, IniDocument* document) {
+    using Result = platform::FileRead::Result;
     const fs::path resolved = platform::ResolveCaseInsensitive(file);
-    if (const std::optional<std::string> bytes = platform::ReadFile(resolved)) {
-        *document = Parse(*bytes);
-        return Status::Ok();
+    platform::FileRead read = platform::ReadRegularFile(resolved, kMaxIniBytes);
+    const std::string name = DisplayName(resolved);
+    switch (read.result) {
+        case Result::Missing:
+            *document = IniDocument();
+            return Status::Ok();
+        case Result::Read:
+            if (std::optional<IniDocument> parsed = Parse(read.bytes)) {
+                *document = std::move(*parsed);
+                return Status::Ok();
+            }
+            return Status::Fail("Tệp thiết lập " + name + " không phải là văn bản.");
+        case Result::Folder:
+            return Status::Fail("Tệp thiết lập " + name + " là một thư mục, không phải tệp.");
+        case Result::NotRegular:
+            return Status::Fail("Tệp thiết lập " + name +
+                                " không phải tệp thường (có thể là thiết bị hoặc ống dẫn).");
+        case Result::TooLarge:
+            return Status::Fail("Tệp thiết lập " + name + " quá lớn (hơn " +
+                                std::to_string(kMaxIniBytes >> 10) + " KiB).");
+        case Result::Unreadable:
+            break;
     }
-    std::error_code error;
-    const bool exists = fs::exists(resolved, error);
-    if (error || exists) {
-        return Status::Fail("Cannot read " + DisplayName(resolved));
-    }
-    *document = IniDocument();
-    return Status::Ok();
+    return Status::Fail("Không đọc được tệp thiết lập " + name + ": " + read.error + ".");
 }
 
 std::optional<std::string> IniDocument::Get(std::string_view section, std::string_view key) const {
     const std::string wanted_section = NormalizeName(section);
     const std::string wanted_key = NormalizeName(key);
-    bool in_section = false;
+    // Lines before the first section line form the section with the empty name.
+    bool in_section = wanted_section.empty();
     for (const std::string& line : lines_) {
         const ParsedLine parsed = ParseLine(line);
         if (parsed.kind == LineKind::kSection) {
-            in_section = platform::NamesEqualIgnoringCase(parsed.name, wanted_section);
+            if (in_section) {
+                return std::nullopt;  // the first such section has ended; later ones do not count
+            }
+            in_section = !wanted_section.empty() &&
+                         platform::NamesEqualIgnoringCase(parsed.name, wanted_section);
         } else if (in_section && parsed.kind == LineKind::kEntry &&
                    platform::NamesEqualIgnoringCase(parsed.name, wanted_key)) {
             return Unquote(parsed.value);
@@ -153,15 +214,22 @@ Status IniDocument::Set(std::string_view section, std::string_view key, std::str
         return Status::Fail("A key name cannot contain '=' or start with '[' or ';': " + key_name);
     }
 
-    bool in_section = false;
-    bool in_first_match = false;      // new keys go to the first matching section
+    // Only the first section of the name is written; lines before the first section line form
+    // the section with the empty name.
+    bool in_section = section_name.empty();
     std::optional<size_t> insert_at;  // after the last entry of that section
+    if (in_section) {
+        insert_at = 0;
+    }
     for (size_t i = 0; i < lines_.size(); ++i) {
         const ParsedLine parsed = ParseLine(lines_[i]);
         if (parsed.kind == LineKind::kSection) {
-            in_section = platform::NamesEqualIgnoringCase(parsed.name, section_name);
-            in_first_match = in_section && !insert_at;
-            if (in_first_match) {
+            if (in_section) {
+                break;
+            }
+            in_section = !section_name.empty() &&
+                         platform::NamesEqualIgnoringCase(parsed.name, section_name);
+            if (in_section) {
                 insert_at = i + 1;
             }
             continue;
@@ -176,8 +244,7 @@ Status IniDocument::Set(std::string_view section, std::string_view key, std::str
             return Status::Ok();
         }
         // Blank lines and comments at the end of a section usually belong to the next one.
-        if (in_first_match &&
-            (parsed.kind == LineKind::kEntry || parsed.kind == LineKind::kOther)) {
+        if (parsed.kind == LineKind::kEntry || parsed.kind == LineKind::kOther) {
             insert_at = i + 1;
         }
     }
@@ -193,26 +260,41 @@ Status IniDocument::Set(std::string_view section, std::string_view key, std::str
 }
 
 std::string IniDocument::Serialize() const {
-    std::string out;
-    if (has_byte_order_mark_) {
-        out += kByteOrderMark;
-    }
+    std::string text;
     for (const std::string& line : lines_) {
-        out += line;
-        out += "\r\n";
+        text += line;
+        text += "\r\n";
     }
-    return out;
+    switch (encoding_) {
+        case IniEncoding::Utf8:
+            return text;
+        case IniEncoding::Utf8WithBom:
+            return std::string(kUtf8Mark) + text;
+        case IniEncoding::Utf16Le:
+            return std::string(kUtf16LeMark) + Utf8ToUtf16Bytes(text, false);
+        case IniEncoding::Utf16Be:
+            return std::string(kUtf16BeMark) + Utf8ToUtf16Bytes(text, true);
+    }
+    return text;
 }
 
 Status IniDocument::Save(const fs::path& file) const {
-    return platform::WriteFileAtomically(platform::ResolveCaseInsensitive(file), Serialize());
+    const fs::path resolved = platform::ResolveCaseInsensitive(file);
+    Status saved = platform::WriteFileAtomically(resolved, Serialize());
+    // What saves killed half-way left behind goes now, once the new file is in place.
+    platform::RemoveStaleTemporaries(resolved.parent_path().empty() ? fs::path(".")
+                                                                    : resolved.parent_path());
+    return saved;
 }
 
 std::string ReadIni(const fs::path& file, std::string_view section, std::string_view key,
                     std::string_view defaultValue) {
     try {
-        if (std::optional<std::string> value = IniDocument::Load(file).Get(section, key)) {
-            return std::move(*value);
+        IniDocument document;
+        if (IniDocument::Read(file, &document)) {
+            if (std::optional<std::string> value = document.Get(section, key)) {
+                return std::move(*value);
+            }
         }
     } catch (const std::exception&) {
         // Unreadable counts as missing, as for the platform's reader.
@@ -226,7 +308,7 @@ Status WriteIni(const fs::path& file, std::string_view section, std::string_view
                 std::string_view value) {
     try {
         IniDocument document;
-        if (Status loaded = IniDocument::LoadForUpdate(file, &document); !loaded) {
+        if (Status loaded = IniDocument::Read(file, &document); !loaded) {
             return loaded;
         }
         if (Status set = document.Set(section, key, value); !set) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <filesystem>
 #include <optional>
 #include <string>
@@ -14,56 +15,69 @@
 // pair of quotes comes back without them, and the first matching key wins. The file is found in
 // its folder whatever the letter case of its name.
 //
-// Text is UTF-8 throughout. A line of an existing file that is not valid UTF-8 was written in the
-// Windows ANSI code page and is read as Windows-1252, so no byte is ever dropped.
+// Only the first section of a name (in any letter case) counts: a later one of the same name is
+// neither read nor written. Lines before the first section line belong to the section with the
+// empty name.
+//
+// Text is UTF-8 in memory. A file that starts with a UTF-16 byte-order mark (either byte order)
+// is read as UTF-16 and written back in it, as the platform's profile functions do. A line of
+// any other file that is not valid UTF-8 was written in the Windows ANSI code page and is read as
+// Windows-1252, so no byte is ever dropped.
 namespace kickvane::catalog {
+
+// Largest settings file read; anything bigger is no settings file of ours.
+inline constexpr std::uintmax_t kMaxIniBytes = 1 << 20;
+
+enum class IniEncoding { Utf8, Utf8WithBom, Utf16Le, Utf16Be };
 
 class IniDocument {
 public:
-    // Splits `bytes` into lines (CR LF, LF or a lone CR end a line); a leading UTF-8 byte-order
-    // mark is remembered and written back by Serialize.
-    static IniDocument Parse(std::string_view bytes);
+    // Splits `bytes` into lines (CR LF, LF or a lone CR end a line). A byte-order mark sets the
+    // encoding, which Serialize keeps. nullopt when the bytes are not text (they hold NUL
+    // characters, as binary files and UTF-16 without a byte-order mark do).
+    static std::optional<IniDocument> Parse(std::string_view bytes);
 
-    // The file found under `file` in any letter case. A missing or unreadable file gives an empty
-    // document, as the platform's reader does.
-    static IniDocument Load(const std::filesystem::path& file);
+    // Reads the file found under `file` in any letter case. A missing file gives an empty
+    // document. A file that exists but cannot be taken as a settings file (a folder, a device,
+    // a pipe, too large, not text, unreadable) is a failure whose reason names the file, and
+    // leaves `document` as it was.
+    static Status Read(const std::filesystem::path& file, IniDocument* document);
 
-    // Reads `file` for a change that will be saved back over it. A missing file gives an empty
-    // document; a file that exists but cannot be read is a failure, since saving over it would
-    // lose its content.
-    static Status LoadForUpdate(const std::filesystem::path& file, IniDocument* document);
-
-    // The value of the first key `key` in a section `section`; nullopt when there is none. A key
-    // present with an empty value gives the empty text.
+    // The value of the first key `key` in the first section `section`; nullopt when there is
+    // none. A key present with an empty value gives the empty text.
     std::optional<std::string> Get(std::string_view section, std::string_view key) const;
 
-    // Replaces the value of the first key `key` of `section` in place, or adds the key at the end
-    // of the first such section, or adds the section at the end. Line breaks in the section, key
-    // and value are removed. Fails, changing nothing, for a name that would be read back as
-    // something else: a key containing '=' or starting with '[' or ';', a section containing ']'.
+    // Replaces the value of the first key `key` of the first section `section` in place, or adds
+    // the key at the end of that section, or adds the section at the end. Line breaks and NUL
+    // characters in the section, key and value are removed. Fails, changing nothing, for a name
+    // that would be read back as something else: a key containing '=' or starting with '[' or
+    // ';', a section containing ']'.
     Status Set(std::string_view section, std::string_view key, std::string_view value);
 
-    // The file's bytes: UTF-8, every line ended by CR LF.
+    // The file's bytes in the document's encoding, every line ended by CR LF.
     std::string Serialize() const;
+
+    IniEncoding encoding() const { return encoding_; }
 
     // Writes the document over the file found under `file` in any letter case (or creates it),
     // atomically: on failure the previous file stays as it was.
     Status Save(const std::filesystem::path& file) const;
 
 private:
-    bool has_byte_order_mark_ = false;
+    IniEncoding encoding_ = IniEncoding::Utf8;
     std::vector<std::string> lines_;  // UTF-8, without line ends
 };
 
 // Reads one value as the platform's profile reader does; `defaultValue` (without its trailing
-// blanks) when the file, section or key is missing. Values come back whole, however long.
+// blanks) when the file, section or key is missing or the file cannot be read. Values come back
+// whole, however long.
 std::string ReadIni(const std::filesystem::path& file, std::string_view section,
                     std::string_view key, std::string_view defaultValue);
 
 // Writes one value as the platform's profile writer does: creates the file, section or key as
-// needed and replaces an existing value, keeping the rest of the file. The file is replaced
-// atomically; a failure (such as a missing or read-only folder) is reported and leaves the
-// previous file intact.
+// needed and replaces an existing value, keeping the rest of the file and its encoding. The file
+// is replaced atomically; a failure (such as a missing or read-only folder, or an existing file
+// that cannot be read) is reported and leaves the previous file intact.
 Status WriteIni(const std::filesystem::path& file, std::string_view section, std::string_view key,
                 std::string_view value);
 

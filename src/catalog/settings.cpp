@@ -71,8 +71,9 @@ std::optional<bool> ParseTruthValue(std::string_view text) {
     return std::nullopt;
 }
 
-void LoadSettings(const std::filesystem::path& toolFolder, Settings& settings) {
-    const IniDocument file = IniDocument::Load(SettingsFile(toolFolder));
+Status LoadSettings(const std::filesystem::path& toolFolder, Settings& settings) {
+    IniDocument file;
+    Status status = IniDocument::Read(SettingsFile(toolFolder), &file);
     settings.gameFolder = ValueOr(file, kMainSection, kFolderKey, kDefaultGameFolder);
     settings.hotkey = ValueOr(file, kMainSection, kHotkeyKey, kDefaultHotkey);
     for (const PatchCategory& category : Categories()) {
@@ -92,12 +93,13 @@ void LoadSettings(const std::filesystem::path& toolFolder, Settings& settings) {
             }
         }
     }
+    return status;
 }
 
-Settings LoadSettings(const std::filesystem::path& toolFolder) {
-    Settings settings;
-    LoadSettings(toolFolder, settings);
-    return settings;
+LoadedSettings LoadSettings(const std::filesystem::path& toolFolder) {
+    LoadedSettings loaded;
+    loaded.status = LoadSettings(toolFolder, loaded.settings);
+    return loaded;
 }
 
 Status SaveSettings(const std::filesystem::path& toolFolder, const Settings& settings) {

@@ -26,11 +26,18 @@ std::filesystem::path SettingsFile(const std::filesystem::path& toolFolder);
 
 // Loads the file into `settings`, key by key in catalog order. A missing file or key gives the
 // key's default; a value that cannot be taken over (a switch that is no number, a variant that is
-// no truth value) leaves that part of `settings` as it was.
-void LoadSettings(const std::filesystem::path& toolFolder, Settings& settings);
+// no truth value) leaves that part of `settings` as it was. A file that exists but cannot be read
+// as a settings file (a folder, a device, binary data, too large) gives every key its default
+// and a failure with the reason: the user must hear that the choice in use is not theirs.
+Status LoadSettings(const std::filesystem::path& toolFolder, Settings& settings);
 
-// A fresh Settings as the window has them before the load, loaded from the file.
-Settings LoadSettings(const std::filesystem::path& toolFolder);
+// A fresh Settings as the window has them before the load, loaded from the file, and how the
+// reading went.
+struct LoadedSettings {
+    Settings settings;
+    Status status = Status::Ok();
+};
+LoadedSettings LoadSettings(const std::filesystem::path& toolFolder);
 
 // Writes the whole file anew: exactly the sections "Thiet lap", "Thay doi", "Bong",
 // "Bang Ti So" and "Khac" with their 39 keys. The new file replaces the old one only once it is

@@ -68,6 +68,10 @@ std::string ToolDataMissingText(const Roots& roots) {
     return "Khong tim thay: " + roots.toolData.string() + "\r\nKiem tra lai duong dan";
 }
 
+std::string ToolDataTooLongText(const Roots& roots) {
+    return "Duong dan qua dai: " + roots.toolData.string() + "\r\nKiem tra lai duong dan";
+}
+
 std::filesystem::path SignalSoundPath(const std::filesystem::path& toolFolder) {
     return platform::ResolveCaseInsensitive(toolFolder / "sound.wav");
 }
@@ -82,9 +86,17 @@ ApplyOutcome ApplyPatches(const std::filesystem::path& toolFolder, std::string_v
             outcome.message = text::Message{text::Message::Kind::Plain, ToolDataMissingText(roots),
                                             std::string(kToolDataMissingTitle)};
             return outcome;
+        case RootProblem::ToolDataTooLong:
+            outcome.message = text::Message{text::Message::Kind::Plain, ToolDataTooLongText(roots),
+                                            std::string(kToolDataMissingTitle)};
+            return outcome;
         case RootProblem::DataMissing:
             outcome.message = text::Message{
                 text::Message::Kind::Component, text::VniToUnicodeUtf8(kDataMissingVni), {}};
+            return outcome;
+        case RootProblem::DataTooLong:
+            outcome.message = text::Message{
+                text::Message::Kind::Component, text::VniToUnicodeUtf8(kDataTooLongVni), {}};
             return outcome;
         case RootProblem::None:
             break;

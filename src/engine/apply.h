@@ -40,9 +40,14 @@ struct ApplyOutcome {
 // Messages of the two folder checks, as stored (the second one VNI-typed).
 inline constexpr std::string_view kToolDataMissingTitle = "Thu muc nguon";
 std::string ToolDataMissingText(const Roots& roots);
+std::string ToolDataTooLongText(const Roots& roots);
 inline constexpr std::string_view kDataMissingVni =
     "Kho6ng ti2m tha61y thu7 mu5c chu71a FIFA Online 2\r\nVui lo2ng kie63m tra la5i d9u7o72ng "
     "da64n";
+// The same when the system refuses the game's folder for the length of its path.
+inline constexpr std::string_view kDataTooLongVni =
+    "D9u7o72ng da64n thu7 mu5c chu71a FIFA Online 2 qua1 da2i\r\nVui lo2ng cho5n thu7 mu5c "
+    "nga81n ho7n";
 
 // Copies the chosen sets from the tool folder into the game folder. The folder checks come first
 // and stop the run with their message, before anything is copied. Then every step runs in plan

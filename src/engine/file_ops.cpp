@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <unordered_map>
+#include <utility>
 #include <vector>
 
 #include "platform/filesystem.h"
@@ -13,20 +14,25 @@ namespace {
 using platform::ResolveCaseInsensitive;
 
 // The entries of a target folder by their case-folded name, read once per folder so that a
-// merge of many files does not scan the folder for each of them.
+// merge of many files does not scan the folder for each of them. The same scan removes what
+// killed copies left behind: temporary files of ours that nothing writes any more.
 class FolderIndex {
 public:
-    explicit FolderIndex(const fs::path& folder)
-        : folder_(folder), names_(platform::EntriesByFoldedName(folder)) {}
+    explicit FolderIndex(const fs::path& folder) : names_(platform::EntriesByFoldedName(folder)) {
+        std::erase_if(names_, [&folder](const auto& entry) {
+            return platform::IsTemporaryName(entry.second) &&
+                   platform::RemoveIfStale(folder / entry.second);
+        });
+    }
 
-    // The existing entry for `name` in any letter case, else `name` as given.
-    fs::path Entry(const std::string& name) const {
+    // The name of the existing entry for `name` in any letter case, else `name` as given, and
+    // whether there was one.
+    std::pair<std::string, bool> Name(const std::string& name) const {
         auto found = names_.find(platform::FoldCase(name));
-        return folder_ / (found == names_.end() ? name : found->second);
+        return found == names_.end() ? std::pair{name, false} : std::pair{found->second, true};
     }
 
 private:
-    fs::path folder_;
     std::unordered_map<std::string, std::string> names_;
 };
 
@@ -55,11 +61,14 @@ Status CopyTree(const fs::path& source, const fs::path& target, CopyCount* count
     }
     std::sort(entries.begin(), entries.end());
     const FolderIndex index(target);
+    platform::FolderCopy files(source, target);  // both folders opened once for all files
     for (const fs::directory_entry& entry : entries) {
-        const fs::path into = index.Entry(entry.path().filename().string());
+        const std::string name = entry.path().filename().string();
+        const auto [targetName, exists] = index.Name(name);
         std::error_code typeError;
         if (entry.is_directory(typeError)) {
-            if (!platform::IsDirectory(into)) {
+            const fs::path into = target / targetName;
+            if (!exists || !platform::IsDirectory(into)) {
                 if (Status made = platform::MakeDirectory(into); !made) {
                     return made;
                 }
@@ -67,11 +76,24 @@ Status CopyTree(const fs::path& source, const fs::path& target, CopyCount* count
             if (Status copied = CopyTree(entry.path(), into, count); !copied) {
                 return copied;
             }
-        } else if (Status copied = CopyOne(entry.path(), into, count); !copied) {
-            return copied;
+            continue;
+        }
+        bool copied = false;
+        if (Status status = files.Copy(name, targetName, exists, &copied); !status) {
+            return status;
+        }
+        if (count) {
+            ++(copied ? count->copied : count->upToDate);
         }
     }
     return Status::Ok();
+}
+
+// "not found", or "too long" when the system refuses the path for its length.
+Status NotFound(std::string_view what, const fs::path& path) {
+    return Status::Fail(std::string(what) +
+                        (platform::IsTooLong(path) ? " path too long: " : " not found: ") +
+                        path.string());
 }
 
 }  // namespace
@@ -79,12 +101,12 @@ Status CopyTree(const fs::path& source, const fs::path& target, CopyCount* count
 Status MergeCopy(const fs::path& source, const fs::path& target, CopyCount* count) {
     const fs::path from = ResolveCaseInsensitive(source);
     if (!platform::IsDirectory(from)) {
-        return Status::Fail("source folder not found: " + source.string());
+        return NotFound("source folder", from);
     }
     const fs::path into = ResolveCaseInsensitive(target);
     if (!platform::IsDirectory(into)) {
         if (!platform::IsDirectory(into.parent_path())) {
-            return Status::Fail("target's parent folder not found: " + target.string());
+            return NotFound("target's parent folder", into.parent_path());
         }
         if (Status made = platform::MakeDirectory(into); !made) {
             return made;
@@ -96,11 +118,11 @@ Status MergeCopy(const fs::path& source, const fs::path& target, CopyCount* coun
 Status CopyFileInto(const fs::path& file, const fs::path& folder, CopyCount* count) {
     const fs::path from = ResolveCaseInsensitive(file);
     if (!platform::IsRegularFile(from)) {
-        return Status::Fail("file not found: " + file.string());
+        return NotFound("file", from);
     }
     const fs::path into = ResolveCaseInsensitive(folder);
     if (!platform::IsDirectory(into)) {
-        return Status::Fail("folder not found: " + folder.string());
+        return NotFound("folder", into);
     }
     const fs::path target = platform::FindEntryIgnoringCase(into, from.filename().string())
                                 .value_or(into / from.filename());

@@ -9,7 +9,7 @@ namespace kickvane::engine {
 namespace {
 
 LaunchOutcome NotStarted(LaunchResult result, std::string text) {
-    return {result, text::Message{text::Message::Kind::Component, std::move(text), {}}};
+    return {result, text::Message{text::Message::Kind::Component, std::move(text), {}}, {}};
 }
 
 }  // namespace
@@ -31,7 +31,9 @@ LaunchOutcome LaunchGame(std::string_view gameFolder) {
         return NotStarted(LaunchResult::StartFailed,
                           std::string(kStartFailedText) + started.reason());
     }
-    return {};
+    LaunchOutcome outcome;
+    outcome.startedThrough = plan.description;
+    return outcome;
 }
 
 }  // namespace kickvane::engine

@@ -20,6 +20,7 @@ enum class LaunchResult { Started, LauncherMissing, WineMissing, StartFailed };
 struct LaunchOutcome {
     LaunchResult result = LaunchResult::Started;
     std::optional<text::Message> message;  // why it did not start
+    std::string startedThrough;            // which way it started, for the user
 
     bool started() const { return result == LaunchResult::Started; }
 };

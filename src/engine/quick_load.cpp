@@ -44,19 +44,20 @@ std::vector<fs::path> MatchingFiles(const fs::path& folder, std::string_view pat
 }  // namespace
 
 bool MatchesWildcard(std::string_view name, std::string_view pattern) {
-    // Iterative match with one backtrack point for the last '*'.
+    // Iterative match with one backtrack point for the last '*'. A '*' of the pattern is always
+    // the wildcard, even facing a '*' in the name.
     size_t n = 0;
     size_t p = 0;
     std::optional<size_t> star;
     size_t starName = 0;
     while (n < name.size()) {
-        if (p < pattern.size() && (pattern[p] == '?' || platform::FoldAscii(pattern[p]) ==
-                                                            platform::FoldAscii(name[n]))) {
-            ++n;
-            ++p;
-        } else if (p < pattern.size() && pattern[p] == '*') {
+        if (p < pattern.size() && pattern[p] == '*') {
             star = p++;
             starName = n;
+        } else if (p < pattern.size() && (pattern[p] == '?' || platform::FoldAscii(pattern[p]) ==
+                                                                   platform::FoldAscii(name[n]))) {
+            ++n;
+            ++p;
         } else if (star) {
             p = *star + 1;
             n = ++starName;
@@ -88,6 +89,9 @@ QuickLoadOutcome QuickLoad(const fs::path& toolFolder, const fs::path& source) {
                 pattern.direct);
         }
         const fs::path target = JoinWindowsPath(dataFolder, pattern.target);
+        if (!files.empty()) {
+            platform::RemoveStaleTemporaries(platform::ResolveCaseInsensitive(target));
+        }
         for (const fs::path& file : files) {
             if (Status copied = CopyFileInto(file, target); !copied) {
                 outcome.failures.push_back(std::string(pattern.direct) + ": " + copied.reason());

@@ -68,11 +68,14 @@ std::string_view RootName(Root root) {
 }
 
 RootProblem CheckRoots(const Roots& roots) {
-    if (!platform::IsDirectory(platform::ResolveCaseInsensitive(roots.toolData))) {
-        return RootProblem::ToolDataMissing;
+    const fs::path toolData = platform::ResolveCaseInsensitive(roots.toolData);
+    if (!platform::IsDirectory(toolData)) {
+        return platform::IsTooLong(toolData) ? RootProblem::ToolDataTooLong
+                                             : RootProblem::ToolDataMissing;
     }
-    if (!platform::IsDirectory(platform::ResolveCaseInsensitive(roots.data))) {
-        return RootProblem::DataMissing;
+    const fs::path data = platform::ResolveCaseInsensitive(roots.data);
+    if (!platform::IsDirectory(data)) {
+        return platform::IsTooLong(data) ? RootProblem::DataTooLong : RootProblem::DataMissing;
     }
     return RootProblem::None;
 }

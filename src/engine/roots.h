@@ -42,7 +42,8 @@ Roots ResolveRoots(const fs::path& toolFolder, std::string_view gameFolder);
 std::string_view RootName(Root root);
 
 // Why a patch run cannot start. The checks run in this order and the first one that fails wins.
-enum class RootProblem { None, ToolDataMissing, DataMissing };
+// A folder whose path the system refuses for its length is "too long", not missing.
+enum class RootProblem { None, ToolDataMissing, ToolDataTooLong, DataMissing, DataTooLong };
 RootProblem CheckRoots(const Roots& roots);
 
 }  // namespace kickvane::engine

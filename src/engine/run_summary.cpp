@@ -20,6 +20,10 @@ std::string RunSummary(const ApplyOutcome& outcome, ClockTime at) {
     switch (outcome.stoppedBy) {
         case RootProblem::ToolDataMissing:
             return line + "đã dừng, thiếu thư mục dữ liệu của công cụ";
+        case RootProblem::ToolDataTooLong:
+            return line + "đã dừng, đường dẫn thư mục dữ liệu của công cụ quá dài";
+        case RootProblem::DataTooLong:
+            return line + "đã dừng, đường dẫn thư mục FIFA Online 2 quá dài";
         case RootProblem::DataMissing:
             return line + "đã dừng, không tìm thấy thư mục FIFA Online 2";
         case RootProblem::None:

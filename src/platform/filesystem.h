@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <filesystem>
 #include <optional>
 #include <string>
@@ -45,12 +46,62 @@ bool IsUpToDateCopy(const fs::path& source, const fs::path& target);
 // modification time. Fails when the source is no readable file or the target's folder is missing.
 Status ReplaceFile(const fs::path& source, const fs::path& target);
 
+// Copies files from one folder into another, each as ReplaceFile does, unless the target already
+// equals its source (IsUpToDateCopy). Both folders are opened once, so that the copy of one file
+// does not look their paths up again.
+class FolderCopy {
+public:
+    FolderCopy(const fs::path& sourceFolder, const fs::path& targetFolder);
+    ~FolderCopy();
+    FolderCopy(const FolderCopy&) = delete;
+    FolderCopy& operator=(const FolderCopy&) = delete;
+
+    // Copies `sourceName` of the source folder to `targetName` of the target folder; sets
+    // `copied` to false when the target was up to date. `targetMayExist` false (the caller knows
+    // the target folder holds no such name) spares the look at the target.
+    Status Copy(const std::string& sourceName, const std::string& targetName, bool targetMayExist,
+                bool* copied);
+
+private:
+    fs::path source_;
+    fs::path target_;
+    int sourceFd_ = -1;
+    int targetFd_ = -1;
+};
+
 // Writes `content` to a temporary file beside `path`, flushes it and renames it over `path`.
 // On failure the previous file is left as it was.
 Status WriteFileAtomically(const fs::path& path, std::string_view content);
 
+// The temporary files of ReplaceFile and WriteFileAtomically are named ".NAME.kv-XXXXXX" (six
+// letters or digits), NAME being the final name cut short where the whole would pass the limit
+// of 255 bytes for one name.
+inline constexpr size_t kMaxNameBytes = 255;
+std::string TemporaryNamePrefix(std::string_view fileName);  // ".NAME.kv-"
+bool IsTemporaryName(std::string_view name);
+
+// Removes `file`, a temporary file of ours, when no save or copy writes it any more (its writer
+// was killed or crashed). True when it was removed.
+bool RemoveIfStale(const fs::path& file);
+
+// RemoveIfStale for every temporary file of ours directly inside `folder`.
+void RemoveStaleTemporaries(const fs::path& folder);
+
+// True when the system refuses `path` for its length: the whole path, or one of its names.
+bool IsTooLong(const fs::path& path);
+
 // Reads a whole file. nullopt when it cannot be opened or read.
 std::optional<std::string> ReadFile(const fs::path& path);
+
+// Reads a whole regular file of at most `maxBytes`, without ever opening anything else (a device
+// or a pipe could block or never end).
+struct FileRead {
+    enum class Result { Read, Missing, Folder, NotRegular, TooLarge, Unreadable };
+    Result result = Result::Missing;
+    std::string bytes;  // when Read
+    std::string error;  // the system's reason when Unreadable
+};
+FileRead ReadRegularFile(const fs::path& path, std::uintmax_t maxBytes);
 
 // The plain files (not folders, not hidden: no leading dot) directly inside `folder`, sorted by
 // name.

@@ -1,12 +1,15 @@
 // File system backend for Linux and other POSIX systems, where names are case-sensitive and a
 // Windows game lives in a Wine prefix.
 #include <fcntl.h>
+#include <sys/file.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
 #include <array>
 #include <cerrno>
+#include <cstdint>
 #include <cstring>
+#include <random>
 
 #include "platform/filesystem.h"
 #include "platform/posix_fd.h"
@@ -23,14 +26,66 @@ Status Failure(const std::string& what, const fs::path& path, int error) {
     return Status::Fail(what + " " + path.string() + ": " + ErrnoText(error));
 }
 
-// A temporary file beside its final place; removed unless it was renamed into place.
+// A fresh unique part of a temporary name: six letters or digits.
+std::string UniqueSuffix() {
+    static constexpr char kLetters[] =
+        "0123456789abcdefghijklmnopqrstuvwxyzABCDEFGHIJKLMNOPQRSTUVWXYZ";
+    thread_local std::mt19937_64 random(std::random_device{}() ^
+                                        (static_cast<uint64_t>(::getpid()) << 32));
+    std::string suffix(6, '0');
+    uint64_t bits = random();
+    for (char& c : suffix) {
+        c = kLetters[bits % (sizeof(kLetters) - 1)];
+        bits /= sizeof(kLetters) - 1;
+    }
+    return suffix;
+}
+
+// The permission bits that new files lose, read once.
+mode_t CreationMask() {
+    static const mode_t mask = [] {
+        const mode_t current = ::umask(022);
+        ::umask(current);
+        return current;
+    }();
+    return mask;
+}
+
+// A folder opened for use as the base of relative names.
+int OpenFolder(const fs::path& folder) {
+    return ::open(folder.empty() ? "." : folder.c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC);
+}
+
+// A temporary file beside its final place, in the folder `dirFd`; removed unless it was renamed
+// into place. It holds an exclusive lock for its life, which tells RemoveIfStale that its writer
+// still runs.
 class TempFile {
 public:
-    explicit TempFile(const fs::path& target)
-        : path_(target.parent_path() / ("." + target.filename().string() + ".kv-XXXXXX")) {
-        std::string pattern = path_.string();
-        fd_ = ::mkostemp(pattern.data(), O_CLOEXEC);
-        path_ = pattern;
+    TempFile(int dirFd, const std::string& targetName, mode_t mode) : dirFd_(dirFd) {
+        const std::string prefix = TemporaryNamePrefix(targetName);
+        for (int attempt = 0; attempt < 16; ++attempt) {
+            std::string name = prefix + UniqueSuffix();
+            const int fd =
+                ::openat(dirFd, name.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, mode);
+            if (fd < 0) {
+                if (errno == EEXIST) {
+                    continue;
+                }
+                return;
+            }
+            // A cleaner may have taken the file for a stale one between its creation and the
+            // lock; it is then unlinked, and a new one is made. A file system without locks
+            // gets an unlocked file, which RemoveIfStale leaves alone.
+            struct stat st {};
+            const bool locked = ::flock(fd, LOCK_EX) == 0;
+            if (!locked || (::fstat(fd, &st) == 0 && st.st_nlink > 0)) {
+                fd_ = fd;
+                name_ = std::move(name);
+                return;
+            }
+            ::close(fd);
+        }
+        errno = EEXIST;
     }
     TempFile(const TempFile&) = delete;
     TempFile& operator=(const TempFile&) = delete;
@@ -38,22 +93,22 @@ public:
         if (fd_ >= 0) {
             ::close(fd_);
         }
-        if (!committed_) {
-            ::unlink(path_.c_str());
+        if (!committed_ && !name_.empty()) {
+            ::unlinkat(dirFd_, name_.c_str(), 0);
         }
     }
 
     bool valid() const { return fd_ >= 0; }
     int fd() const { return fd_; }
 
-    // Closes the file and renames it over `target`.
-    Status CommitAs(const fs::path& target) {
+    // Closes the file and renames it over `targetName`; `target` names it in messages.
+    Status CommitAs(const std::string& targetName, const fs::path& target) {
         int fd = fd_;
         fd_ = -1;
         if (::close(fd) != 0) {
             return Failure("cannot write", target, errno);
         }
-        if (::rename(path_.c_str(), target.c_str()) != 0) {
+        if (::renameat(dirFd_, name_.c_str(), dirFd_, targetName.c_str()) != 0) {
             return Failure("cannot replace", target, errno);
         }
         committed_ = true;
@@ -61,7 +116,8 @@ public:
     }
 
 private:
-    fs::path path_;
+    int dirFd_;
+    std::string name_;
     int fd_ = -1;
     bool committed_ = false;
 };
@@ -161,6 +217,36 @@ bool IsUpToDateCopy(const fs::path& source, const fs::path& target) {
            src.st_mtim.tv_nsec == dst.st_mtim.tv_nsec;
 }
 
+namespace {
+
+// Copies the open regular file `in` (described by `st`) to `targetName` in the folder `dirFd`
+// through a temporary file beside it, with the source's permissions and times.
+Status CopyInto(int in, const struct stat& st, int dirFd, const std::string& targetName,
+                const fs::path& target) {
+    const mode_t mode = st.st_mode & 0777;
+    TempFile temp(dirFd, targetName, mode | S_IRUSR | S_IWUSR);
+    if (!temp.valid()) {
+        return Failure("cannot write", target, errno);
+    }
+    if (!CopyContent(in, temp.fd(), st.st_size)) {
+        return Failure("cannot copy to", target, errno);
+    }
+    if (((mode | S_IRUSR | S_IWUSR) & ~CreationMask()) != mode) {
+        ::fchmod(temp.fd(), mode);
+    }
+    const struct timespec times[2] = {st.st_atim, st.st_mtim};
+    ::futimens(temp.fd(), times);
+    return temp.CommitAs(targetName, target);
+}
+
+bool SameSizeAndTime(const struct stat& source, const struct stat& target) {
+    return S_ISREG(target.st_mode) && source.st_size == target.st_size &&
+           source.st_mtim.tv_sec == target.st_mtim.tv_sec &&
+           source.st_mtim.tv_nsec == target.st_mtim.tv_nsec;
+}
+
+}  // namespace
+
 Status ReplaceFile(const fs::path& source, const fs::path& target) {
     Fd in(::open(source.c_str(), O_RDONLY | O_CLOEXEC));
     if (in.get() < 0) {
@@ -173,31 +259,86 @@ Status ReplaceFile(const fs::path& source, const fs::path& target) {
     if (!S_ISREG(st.st_mode)) {
         return Status::Fail("not a file: " + source.string());
     }
-    TempFile temp(target);
-    if (!temp.valid()) {
+    Fd folder(OpenFolder(target.parent_path()));
+    if (folder.get() < 0) {
         return Failure("cannot write", target, errno);
     }
-    if (!CopyContent(in.get(), temp.fd(), st.st_size)) {
-        return Failure("cannot copy to", target, errno);
+    return CopyInto(in.get(), st, folder.get(), target.filename().string(), target);
+}
+
+FolderCopy::FolderCopy(const fs::path& sourceFolder, const fs::path& targetFolder)
+    : source_(sourceFolder),
+      target_(targetFolder),
+      sourceFd_(OpenFolder(sourceFolder)),
+      targetFd_(OpenFolder(targetFolder)) {}
+
+FolderCopy::~FolderCopy() {
+    for (const int fd : {sourceFd_, targetFd_}) {
+        if (fd >= 0) {
+            ::close(fd);
+        }
     }
-    ::fchmod(temp.fd(), st.st_mode & 0777);
-    const struct timespec times[2] = {st.st_atim, st.st_mtim};
-    ::futimens(temp.fd(), times);
-    return temp.CommitAs(target);
+}
+
+Status FolderCopy::Copy(const std::string& sourceName, const std::string& targetName,
+                        bool targetMayExist, bool* copied) {
+    *copied = false;
+    if (sourceFd_ < 0) {
+        return Failure("cannot read", source_, errno);
+    }
+    if (targetFd_ < 0) {
+        return Failure("cannot write", target_, errno);
+    }
+    struct stat st {};
+    if (::fstatat(sourceFd_, sourceName.c_str(), &st, 0) != 0) {
+        return Failure("cannot read", source_ / sourceName, errno);
+    }
+    if (!S_ISREG(st.st_mode)) {
+        return Status::Fail("not a file: " + (source_ / sourceName).string());
+    }
+    struct stat existing {};
+    if (targetMayExist && ::fstatat(targetFd_, targetName.c_str(), &existing, 0) == 0 &&
+        SameSizeAndTime(st, existing)) {
+        return Status::Ok();
+    }
+    Fd in(::openat(sourceFd_, sourceName.c_str(), O_RDONLY | O_CLOEXEC));
+    if (in.get() < 0) {
+        return Failure("cannot read", source_ / sourceName, errno);
+    }
+    *copied = true;
+    return CopyInto(in.get(), st, targetFd_, targetName, target_ / targetName);
 }
 
 Status WriteFileAtomically(const fs::path& path, std::string_view content) {
-    TempFile temp(path);
+    Fd folder(OpenFolder(path.parent_path()));
+    if (folder.get() < 0) {
+        return Failure("cannot write", path, errno);
+    }
+    // Keep the permissions of the file being replaced; a new file gets the usual ones.
+    struct stat old {};
+    const mode_t mode = StatFile(path, old) ? (old.st_mode & 0777) : 0644;
+    TempFile temp(folder.get(), path.filename().string(), mode | S_IRUSR | S_IWUSR);
     if (!temp.valid()) {
         return Failure("cannot write", path, errno);
     }
     if (!WriteAll(temp.fd(), content.data(), content.size()) || ::fsync(temp.fd()) != 0) {
         return Failure("cannot write", path, errno);
     }
-    // Keep the permissions of the file being replaced; a new file gets the usual ones.
-    struct stat old {};
-    ::fchmod(temp.fd(), StatFile(path, old) ? (old.st_mode & 0777) : 0644);
-    return temp.CommitAs(path);
+    ::fchmod(temp.fd(), mode);
+    return temp.CommitAs(path.filename().string(), path);
+}
+
+bool RemoveIfStale(const fs::path& file) {
+    Fd fd(::open(file.c_str(), O_RDONLY | O_CLOEXEC | O_NOFOLLOW | O_NONBLOCK));
+    struct stat st {};
+    if (fd.get() < 0 || ::fstat(fd.get(), &st) != 0 || !S_ISREG(st.st_mode)) {
+        return false;
+    }
+    // The writer's lock goes with its process: a lock that can be taken has no writer.
+    if (::flock(fd.get(), LOCK_EX | LOCK_NB) != 0) {
+        return false;
+    }
+    return ::unlink(file.c_str()) == 0;
 }
 
 fs::path ProgramFolder() {

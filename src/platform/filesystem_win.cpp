@@ -19,9 +19,16 @@ std::string LastErrorText() {
 
 // A fresh name beside `target` for the data of a replacement.
 fs::path TemporaryBeside(const fs::path& target) {
+    static constexpr char kLetters[] = "0123456789abcdefghijklmnopqrstuvwxyz";
     std::random_device random;
-    return target.parent_path() /
-           (L"." + target.filename().wstring() + L".kv-" + std::to_wstring(random()));
+    std::string unique;
+    for (int i = 0; i < 6; ++i) {
+        unique += kLetters[random() % (sizeof(kLetters) - 1)];
+    }
+    const std::u8string name = target.filename().u8string();
+    const std::string prefix = TemporaryNamePrefix(std::string(name.begin(), name.end()));
+    const std::string full = prefix + unique;
+    return target.parent_path() / fs::path(std::u8string(full.begin(), full.end()));
 }
 
 Status MoveOver(const fs::path& from, const fs::path& to) {
@@ -87,6 +94,40 @@ Status WriteFileAtomically(const fs::path& path, std::string_view content) {
         }
     }
     return MoveOver(temporary, path);
+}
+
+FolderCopy::FolderCopy(const fs::path& sourceFolder, const fs::path& targetFolder)
+    : source_(sourceFolder), target_(targetFolder) {}
+
+FolderCopy::~FolderCopy() = default;
+
+Status FolderCopy::Copy(const std::string& sourceName, const std::string& targetName, bool,
+                        bool* copied) {
+    // The names come from path::string(), so they convert back the same way.
+    const fs::path source = source_ / fs::path(sourceName);
+    const fs::path target = target_ / fs::path(targetName);
+    *copied = !IsUpToDateCopy(source, target);
+    return *copied ? ReplaceFile(source, target) : Status::Ok();
+}
+
+bool RemoveIfStale(const fs::path& file) {
+    // A file that its writer still holds open cannot be deleted. Between the writer's close and
+    // its rename the file is free, so only files made some time ago count as stale.
+    WIN32_FILE_ATTRIBUTE_DATA data{};
+    if (!::GetFileAttributesExW(file.c_str(), GetFileExInfoStandard, &data) ||
+        (data.dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY)) {
+        return false;
+    }
+    FILETIME now{};
+    ::GetSystemTimeAsFileTime(&now);
+    const auto ticks = [](const FILETIME& time) {
+        return (static_cast<unsigned long long>(time.dwHighDateTime) << 32) | time.dwLowDateTime;
+    };
+    constexpr unsigned long long kMinuteTicks = 60ULL * 10'000'000ULL;
+    if (ticks(now) < ticks(data.ftCreationTime) + kMinuteTicks) {
+        return false;
+    }
+    return ::DeleteFileW(file.c_str()) != 0;
 }
 
 fs::path ProgramFolder() {

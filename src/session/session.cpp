@@ -25,10 +25,12 @@ std::string FailedStepLine(const engine::StepOutcome& step) {
 Session::Session(std::filesystem::path toolFolder, std::unique_ptr<platform::KeySampler> keys,
                  Launcher launch)
     : toolFolder_(std::move(toolFolder)),
-      settings_(catalog::LoadSettings(toolFolder_)),
       keys_(std::move(keys)),
       poll_(keys_.get()),
       launch_(std::move(launch)) {
+    catalog::LoadedSettings loaded = catalog::LoadSettings(toolFolder_);
+    settings_ = std::move(loaded.settings);
+    settingsRead_ = std::move(loaded.status);
     hotkeyValid_ = poll_.SetHotkey(settings_.hotkey);
 }
 
@@ -71,7 +73,24 @@ std::optional<ApplyRun> Session::PollHotkey() {
     return Apply();
 }
 
+std::optional<text::Message> Session::SettingsProblem() const {
+    if (settingsRead_) {
+        return std::nullopt;
+    }
+    return text::Message{text::Message::Kind::Warning,
+                         settingsRead_.reason() +
+                             "\nĐang dùng thiết lập mặc định; phím tắt sẽ không chép gì cho đến "
+                             "khi tệp được sửa hoặc xoá và chương trình được mở lại.",
+                         std::string(kNoticeTitle)};
+}
+
 ApplyRun Session::Apply() {
+    if (!settingsRead_) {
+        ApplyRun refused;
+        refused.refused = true;
+        refused.shown.messages.push_back(*SettingsProblem());
+        return refused;
+    }
     ApplyRun run{engine::ApplyPatches(toolFolder_, settings_.gameFolder, settings_.selection), {}};
     if (run.apply.message) {
         run.shown.messages.push_back(*run.apply.message);

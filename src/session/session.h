@@ -60,6 +60,9 @@ struct LaunchRun {
 struct ApplyRun {
     engine::ApplyOutcome apply;
     Outcome shown;
+    // The settings file could not be read, so no copy was tried: the defaults in its place are
+    // not the user's choice.
+    bool refused = false;
 };
 
 struct QuickLoadRun {
@@ -79,6 +82,10 @@ public:
 
     const std::filesystem::path& toolFolder() const { return toolFolder_; }
     const catalog::Settings& settings() const { return settings_; }
+    // Ok when the settings file was read, or is missing or empty (the defaults apply).
+    const Status& settingsRead() const { return settingsRead_; }
+    // For the user, when the settings file could not be read: why, and that the defaults show.
+    std::optional<text::Message> SettingsProblem() const;
     const catalog::PatchSelection& selection() const { return settings_.selection; }
     bool hasGlobalKeys() const { return keys_ != nullptr; }
 
@@ -115,6 +122,7 @@ public:
 private:
     std::filesystem::path toolFolder_;
     catalog::Settings settings_;
+    Status settingsRead_ = Status::Ok();
     std::unique_ptr<platform::KeySampler> keys_;
     engine::HotkeyPoll poll_;
     bool hotkeyValid_ = true;

@@ -83,6 +83,11 @@ MainWindow::MainWindow(session::Session& session, ShellServices services, QWidge
     showSession();
     connectPanels();
     connectButtons();
+    if (std::optional<text::Message> problem = session_.SettingsProblem()) {
+        // Once the window is up, so the box has its owner on screen.
+        QTimer::singleShot(
+            0, this, [this, message = std::move(*problem)] { outcomes_.ShowMessage(message); });
+    }
 }
 
 MainWindow::~MainWindow() = default;
@@ -177,10 +182,12 @@ void MainWindow::applyPatchesNow() {
 }
 
 void MainWindow::showRun(const session::ApplyRun& run) {
-    // The tooltip keeps the last result where no sound is heard.
-    const QTime now = QTime::currentTime();
-    tray_->icon().SetStatusLine(
-        ToQString(engine::RunSummary(run.apply, {now.hour(), now.minute()})));
+    if (!run.refused) {
+        // The tooltip keeps the last result where no sound is heard.
+        const QTime now = QTime::currentTime();
+        tray_->icon().SetStatusLine(
+            ToQString(engine::RunSummary(run.apply, {now.hour(), now.minute()})));
+    }
     outcomes_.Show(run.shown);
 }
 

@@ -22,14 +22,6 @@ namespace kickvane::shell {
 
 namespace {
 
-bool IsLinkBlank(char c) {
-    return c == ' ' || c == '\t' || c == '\r' || c == '\n' || c == '\v' || c == '\f';
-}
-
-char AsciiLower(char c) {
-    return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
-}
-
 bool IsWebScheme(const QString& scheme) {
     return scheme.compare(u"http", Qt::CaseInsensitive) == 0 ||
            scheme.compare(u"https", Qt::CaseInsensitive) == 0;
@@ -51,76 +43,9 @@ const QString kBadHost = FetchProblemText(FetchProblem::BadHost);
 
 }  // namespace
 
-std::string ReadFetchedText(std::string_view bytes) {
-    const std::string decoded = text::LegacyTextToUtf8(bytes);
-    std::string text;
-    text.reserve(decoded.size() + 2);
-    size_t start = 0;
-    for (size_t i = 0; i < decoded.size(); ++i) {
-        if (decoded[i] != '\r') {
-            continue;
-        }
-        text.append(decoded, start, i - start);
-        text += "\r\n";
-        if (i + 1 < decoded.size() && decoded[i + 1] == '\n') {
-            ++i;
-        }
-        start = i + 1;
-    }
-    if (start < decoded.size()) {
-        text.append(decoded, start);
-        text += "\r\n";
-    }
-    return text;
-}
-
 bool IsCurrentVersion(std::string_view text) {
     return text.size() == kToolVersion.size() + 2 && text.starts_with(kToolVersion) &&
            text.ends_with("\r\n");
-}
-
-std::optional<std::string> DownloadLink(std::string_view text) {
-    while (!text.empty() && IsLinkBlank(text.front())) {
-        text.remove_prefix(1);
-    }
-    while (!text.empty() && IsLinkBlank(text.back())) {
-        text.remove_suffix(1);
-    }
-    // Control characters inside mean several lines or a forged address; neither is one link.
-    for (const char c : text) {
-        const auto byte = static_cast<unsigned char>(c);
-        if (byte < 0x20 || byte == 0x7F) {
-            return std::nullopt;
-        }
-    }
-    const size_t separator = text.find("://");
-    if (separator == std::string_view::npos) {
-        return std::nullopt;
-    }
-    std::string scheme;
-    for (const char c : text.substr(0, separator)) {
-        scheme += AsciiLower(c);
-    }
-    if (scheme != "http" && scheme != "https") {
-        return std::nullopt;
-    }
-    std::string_view authority = text.substr(separator + 3);
-    authority = authority.substr(0, authority.find_first_of("/?#"));
-    if (authority.find_first_of("\\ ") != std::string_view::npos) {
-        return std::nullopt;
-    }
-    if (const size_t at = authority.rfind('@'); at != std::string_view::npos) {
-        authority.remove_prefix(at + 1);
-    }
-    size_t hostLength = authority.find(':');
-    if (!authority.empty() && authority.front() == '[') {
-        const size_t close = authority.find(']');
-        hostLength = close == std::string_view::npos || close < 2 ? 0 : close + 1;
-    }
-    if (authority.substr(0, hostLength).empty()) {
-        return std::nullopt;
-    }
-    return std::string(text);
 }
 
 UpdateCheck::UpdateCheck(Options options, QObject* parent)
@@ -355,8 +280,13 @@ void UpdateFlow::check() {
 }
 
 void UpdateFlow::onVersion(const QString& text) {
-    checking_ = false;
     const std::string version = text.toStdString();
+    // An empty answer, a web page or binary data is no version: nothing to announce or record.
+    if (!IsVersionText(version)) {
+        onVersionFailed(QStringLiteral("máy chủ không trả về số phiên bản"));
+        return;
+    }
+    checking_ = false;
     state_.versionText = version;
     if (checkButton_) {
         checkButton_->setEnabled(true);

@@ -17,6 +17,7 @@
 
 #include "session/session.h"
 #include "shell/dialogs.h"
+#include "text/update_answer.h"
 
 class QNetworkAccessManager;
 class QNetworkReply;
@@ -27,19 +28,12 @@ namespace kickvane::shell {
 
 inline constexpr std::string_view kToolVersion = "v2.0-demo";
 
-// The text of a fetched file as the tool compares and stores it: its lines, each followed by
-// CR LF. A line ends at CR LF or a lone CR; a lone LF stays in the text; the last line may end
-// without a terminator. Valid UTF-8 is taken as it is, anything else is read as Windows-1252
-// (the ANSI code page the update host's files were written in). The result is UTF-8.
-std::string ReadFetchedText(std::string_view bytes);
+using text::DownloadLink;
+using text::IsVersionText;
+using text::ReadFetchedText;
 
 // True when the fetched version text is exactly this tool's version line.
 bool IsCurrentVersion(std::string_view text);
-
-// The fetched link without surrounding blanks and line breaks, when it is an http or https
-// address with a host; nullopt for anything else the browser must not be handed (local files,
-// scripts, paths, several lines, empty text).
-std::optional<std::string> DownloadLink(std::string_view text);
 
 // Fetches the version file ("v" at the host's root) and the link file ("vlink") from the update
 // host, each on its own, without blocking. Answers stay in memory and never come from a cache.

@@ -10,10 +10,12 @@
 #include <vector>
 
 #ifndef _WIN32
+#include <sys/stat.h>
 #include <unistd.h>
 #endif
 
 #include "support/temp_dir.h"
+#include "text/utf.h"
 
 namespace kickvane::catalog {
 namespace {
@@ -76,7 +78,7 @@ TEST_F(IniTest, StrayLinesAreSkipped_AndTheFirstMatchingKeyWins) {
 
     EXPECT_EQ(Read("S", "Key"), "first=still first");
     EXPECT_EQ(Read("Other", "Key"), "other");
-    EXPECT_EQ(Read("", "Orphan"), "<none>");
+    EXPECT_EQ(Read("", "Orphan"), "outside");  // before the first section: the empty name
     EXPECT_EQ(Read("S", "no equals sign"), "<none>");
 }
 
@@ -185,27 +187,71 @@ TEST_F(IniTest, FailedWriteLeavesTheOldFileWhole) {
     }
 }
 
-TEST(IniDocumentTest, AnyBytesParse_AndWhatWasSetReadsBack) {
-    constexpr char kAlphabet[] = "[]=;\r\n \t\"'aA\0\xEF\xBB\xBF\x80\x9D\xC3\xE9\xF4\xFF";
-    const std::string alphabet(kAlphabet, sizeof(kAlphabet) - 1);
-    std::mt19937 random(20240611);
-    std::uniform_int_distribution<size_t> length(0, 120);
-    std::uniform_int_distribution<size_t> pick(0, alphabet.size() - 1);
-    for (int round = 0; round < 2000; ++round) {
-        std::string bytes(length(random), ' ');
-        for (char& c : bytes) {
-            c = alphabet[pick(random)];
-        }
-        SCOPED_TRACE(::testing::PrintToString(bytes));
-
-        IniDocument document = IniDocument::Parse(bytes);
-        ASSERT_TRUE(document.Set("a", "a", "value").ok());
-        EXPECT_EQ(document.Get("A", "A"), "value");
-        const std::string saved = document.Serialize();
-        const IniDocument reloaded = IniDocument::Parse(saved);
-        EXPECT_EQ(reloaded.Serialize(), saved);
-        EXPECT_EQ(reloaded.Get("a", "a"), "value");
+std::string Utf16(std::string_view utf8, bool bigEndian) {
+    std::string bytes = bigEndian ? "\xFE\xFF" : "\xFF\xFE";
+    for (const char16_t unit : text::Utf8ToUtf16(utf8)) {
+        const char high = static_cast<char>(unit >> 8);
+        const char low = static_cast<char>(unit & 0xFF);
+        bytes += bigEndian ? high : low;
+        bytes += bigEndian ? low : high;
     }
+    return bytes;
+}
+
+TEST_F(IniTest, Utf16FilesAreReadAndWrittenBackInTheirByteOrder) {
+    for (const bool bigEndian : {false, true}) {
+        WriteFile(file_, Utf16("[Thiet lap]\r\nDuongDan=C:\\Trò chơi\r\n", bigEndian));
+        EXPECT_EQ(Read("thiet lap", "DuongDan"), "C:\\Trò chơi");
+        ASSERT_TRUE(WriteIni(file_, "Thiet lap", "PhimTat", "F9").ok());
+        EXPECT_EQ(ReadText(file_),
+                  Utf16("[Thiet lap]\r\nDuongDan=C:\\Trò chơi\r\nPhimTat=F9\r\n", bigEndian));
+    }
+}
+
+TEST_F(IniTest, OnlyTheFirstSectionOfANameCountsAndLeadingKeysHaveTheEmptySection) {
+    WriteFile(file_, "top=1\r\n[S]\r\nA=first\r\n[x]\r\n[s]\r\nA=second\r\nB=later\r\n");
+    EXPECT_EQ(Read("", "top"), "1");
+    EXPECT_EQ(Read("S", "top"), "<none>");
+    EXPECT_EQ(Read("s", "A"), "first");
+    EXPECT_EQ(Read("S", "B"), "<none>");
+
+    ASSERT_TRUE(WriteIni(file_, "S", "B", "new").ok());
+    ASSERT_TRUE(WriteIni(file_, "", "top2", "2").ok());
+    EXPECT_EQ(
+        ReadText(file_),
+        "top=1\r\ntop2=2\r\n[S]\r\nA=first\r\nB=new\r\n[x]\r\n[s]\r\nA=second\r\nB=later\r\n");
+}
+
+// A settings file that is no text file of ours is reported, read as nothing and never written
+// over; an empty file is simply empty.
+TEST_F(IniTest, WhatCannotBeReadAsSettingsIsAFailureWithAReason) {
+    const auto unreadable = [&](const fs::path& path) {
+        IniDocument document;
+        const Status read = IniDocument::Read(path, &document);
+        EXPECT_FALSE(read.ok()) << path;
+        EXPECT_NE(read.reason().find(path.filename().string()), std::string::npos) << path;
+        EXPECT_EQ(ReadIni(path, "Thiet lap", "PhimTat", "F7"), "F7");
+        EXPECT_FALSE(WriteIni(path, "Thiet lap", "PhimTat", "F9").ok()) << path;
+    };
+    const std::string junk("\x89PNG\r\n\x1A\n\0\0\0\rIHDR[Thiet lap]\nPhimTat=F1\n", 34);
+    WriteFile(file_, junk);
+    unreadable(file_);
+    EXPECT_EQ(ReadText(file_), junk);
+    WriteFile(file_, std::string(kMaxIniBytes + 1, 'x'));
+    unreadable(file_);
+    fs::remove(file_);
+    fs::create_directory(file_);
+    unreadable(file_);
+#ifndef _WIN32
+    unreadable("/dev/zero");
+    ASSERT_EQ(::mkfifo((dir_ / "fifo.ini").c_str(), 0600), 0);
+    unreadable(dir_ / "fifo.ini");
+#endif
+
+    WriteFile(dir_ / "empty.ini", "");
+    IniDocument document;
+    EXPECT_TRUE(IniDocument::Read(dir_ / "empty.ini", &document).ok());
+    EXPECT_TRUE(IniDocument::Read(dir_ / "missing.ini", &document).ok());
 }
 
 }  // namespace

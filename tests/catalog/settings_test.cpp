@@ -38,7 +38,7 @@ TEST(Settings, SaveThenLoadRestoresEverySwitchAndVariant) {
     saved.selection.setOptionValue(OptionArray::Other, 8, false);  // mark: none chosen
     ASSERT_TRUE(SaveSettings(tool.path(), saved).ok());
 
-    const Settings loaded = LoadSettings(tool.path());
+    const Settings loaded = LoadSettings(tool.path()).settings;
     EXPECT_EQ(loaded.gameFolder, saved.gameFolder);  // whole, however long
     EXPECT_EQ(loaded.hotkey, "F3");
     EXPECT_EQ(loaded.selection, saved.selection);
@@ -53,7 +53,7 @@ TEST(Settings, LoadTakesValuesKeyByKey) {
               "[Khac]\nQcaoMacDinh=False\nCoMacDinh=0\nMarkMacDinh=maybe\n");
     Settings settings;  // as the widgets are before the load
     settings.selection.setSwitchValue(0, 1);
-    LoadSettings(tool.path(), settings);
+    ASSERT_TRUE(LoadSettings(tool.path(), settings).ok());
 
     EXPECT_EQ(settings.gameFolder, "");               // empty value, not the default
     EXPECT_EQ(settings.hotkey, "f7");                 // handed over unchanged
@@ -72,20 +72,32 @@ TEST(Settings, LoadTakesValuesKeyByKey) {
 
 TEST(Settings, MissingFileLoadsDefaultsAndAnyLetterCaseIsFoundAndReplaced) {
     TempDir tool;
-    const Settings defaults = LoadSettings(tool.path());
+    const LoadedSettings missing = LoadSettings(tool.path());
+    EXPECT_TRUE(missing.status.ok());
+    const Settings& defaults = missing.settings;
     EXPECT_EQ(defaults.gameFolder, "C:\\Program Files");
     EXPECT_EQ(defaults.hotkey, "F7");
     EXPECT_EQ(defaults.selection, PatchSelection::Defaults());
 
     WriteFile(tool / "Thietlap.ini", "[Thiet lap]\r\nPhimTat=F2\r\n");
-    Settings settings = LoadSettings(tool.path());
+    Settings settings = LoadSettings(tool.path()).settings;
     EXPECT_EQ(settings.hotkey, "F2");
     settings.hotkey = "F9";
     ASSERT_TRUE(SaveSettings(tool.path(), settings).ok());
     EXPECT_EQ(std::distance(std::filesystem::directory_iterator(tool.path()),
                             std::filesystem::directory_iterator()),
               1);
-    EXPECT_EQ(LoadSettings(tool.path()).hotkey, "F9");
+    EXPECT_EQ(LoadSettings(tool.path()).settings.hotkey, "F9");
+}
+
+TEST(Settings, AFileThatCannotBeReadGivesTheDefaultsAndSaysWhy) {
+    TempDir tool;
+    WriteFile(tool / "ThietLap.ini", std::string("[Thiet lap]\0PhimTat=F2\0", 22));
+    const LoadedSettings loaded = LoadSettings(tool.path());
+    EXPECT_FALSE(loaded.status.ok());
+    EXPECT_NE(loaded.status.reason().find("ThietLap.ini"), std::string::npos);
+    EXPECT_EQ(loaded.settings.hotkey, "F7");
+    EXPECT_EQ(loaded.settings.selection, PatchSelection::Defaults());
 }
 
 // Keeping the previous file whole is the atomic write's part, tested with the file system.

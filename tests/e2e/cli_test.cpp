@@ -76,6 +76,22 @@ TEST_F(CliTest, PlanListsTheStepsAndApplyExitsZeroOneOrTwo) {
     EXPECT_NE(noBase.err.find("Thu muc nguon: Khong tim thay: "), std::string::npos);
 }
 
+TEST_F(CliTest, SettingsThatCannotBeReadStopApplyWithTheReasonAndCopyNothing) {
+    MakeToolFolder(tool());
+    MakeGameFolder(game());
+    WriteFile(tool() / "ThietLap.ini", std::string("\x7F"
+                                                   "ELF\2\1\1\0\0\0",
+                                                   12));
+    const Result stopped = Kickvane("apply " + Folders());
+    EXPECT_EQ(stopped.exitCode, 2);
+    EXPECT_NE(stopped.err.find("ThietLap.ini không phải là văn bản"), std::string::npos)
+        << stopped.err;
+    EXPECT_FALSE(fs::exists(game() / "data2/cmn"));
+    EXPECT_EQ(
+        Kickvane("ini get " + Quote(tool() / "ThietLap.ini") + " 'Thiet lap' PhimTat F7").exitCode,
+        1);
+}
+
 TEST_F(CliTest, QuickLoadExitCodes) {
     fs::create_directories(tool() / "data/data2/players/heads/textures");
     WriteFile(dir_ / "faces/face1.dds", "face");

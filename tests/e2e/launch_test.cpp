@@ -90,7 +90,8 @@ TEST_F(LaunchTest, WineRunsTheLauncherInItsOwnPrefixAndFolder_AndSaysSo) {
     EXPECT_EQ(record, "program=wine\npwd=" + (prefix / "drive_c/FIFA Online 2").string() +
                           "\nWINEPREFIX=" + prefix.string() + "\nWINEARCH=win32\narg=" +
                           (prefix / "drive_c/FIFA Online 2/GameLoader.exe").string() + "\n");
-    EXPECT_EQ(result.out, "started wine through Wine in prefix " + prefix.string() + " (win32)\n");
+    EXPECT_EQ(result.out,
+              "started Gameloader.exe through Wine in prefix " + prefix.string() + " (win32)\n");
 }
 
 TEST_F(LaunchTest, ManagersStartTheirOwnGames_LutrisBottlesAndTheirFlatpaks) {

@@ -40,6 +40,12 @@ TEST_F(ApplyTest, FolderChecksStopTheRunWithTheirMessageBeforeAnyCopyOrSound) {
                                              "Không tìm thấy thư mục chứa FIFA Online 2\r\nVui "
                                              "lòng kiểm tra lại đường dẫn",
                                              {}}));
+    // A game folder that the system refuses for the length of its path is too long, not missing.
+    const ApplyOutcome tooLong = Apply(PatchSelection::Defaults(), "/" + std::string(300, 'x'));
+    EXPECT_EQ(tooLong.stoppedBy, RootProblem::DataTooLong);
+    ASSERT_TRUE(tooLong.message);
+    EXPECT_EQ(tooLong.message->text,
+              "Đường dẫn thư mục chứa FIFA Online 2 quá dài\r\nVui lòng chọn thư mục ngắn hơn");
 
     // The tool's own base set is checked first, with a plain message.
     fs::remove_all(tool() / "data");
@@ -129,11 +135,16 @@ TEST(MergeCopy, FailsOnAMissingSourceAndFindsTheSourceInAnyCase) {
     WriteFile(dir / "src/sub/a.dds", "a");
     EXPECT_FALSE(MergeCopy(dir / "missing", dir / "dst").ok());
     EXPECT_FALSE(fs::exists(dir / "dst"));
+    const Status tooLong = MergeCopy(dir / "src", dir / std::string(300, 'x') / "dst");
+    EXPECT_NE(tooLong.reason().find("too long"), std::string::npos) << tooLong.reason();
 
+    // What a killed copy left in a target folder goes when the run writes there.
+    WriteFile(dir / "dst/sub/.a.dds.kv-Ab12Cd", "half a texture");
     CopyCount count;
     ASSERT_TRUE(MergeCopy(dir / "SRC", dir / "dst", &count).ok());
     EXPECT_EQ(ReadText(dir / "dst/sub/a.dds"), "a");
     EXPECT_EQ(count.copied, 1);
+    EXPECT_EQ(std::distance(fs::directory_iterator(dir / "dst/sub"), {}), 1);
 }
 
 TEST(MakeFolder, FailsWhenTheFolderExistsInAnyCaseOrItsParentIsMissing) {

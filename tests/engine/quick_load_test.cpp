@@ -86,6 +86,10 @@ TEST(MatchesWildcard, FollowsWindowsRulesWithoutCase) {
     EXPECT_TRUE(MatchesWildcard("hhead5.pc.ea3.em", "hhead*.pc.ea3.em"));
     EXPECT_TRUE(MatchesWildcard("face.x.dds", "face*.dds"));
     EXPECT_TRUE(MatchesWildcard("a1", "a?"));
+    // Wildcards in a file's name are plain characters there.
+    EXPECT_TRUE(MatchesWildcard("cm_*x.dds", "cm_*.dds"));
+    EXPECT_TRUE(MatchesWildcard("face?*.dds", "face*.dds"));
+    EXPECT_FALSE(MatchesWildcard("a*", "a?b"));
     EXPECT_FALSE(MatchesWildcard("face1.dds.bak", "face*.dds"));
     EXPECT_FALSE(MatchesWildcard("xcm_1.dds", "cm_*.dds"));
 }

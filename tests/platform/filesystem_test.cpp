@@ -1,7 +1,10 @@
 #include "platform/filesystem.h"
 
+#include <fcntl.h>
 #include <gtest/gtest.h>
+#include <sys/file.h>
 #include <sys/resource.h>
+#include <unistd.h>
 
 #include <csignal>
 #include <fstream>
@@ -125,6 +128,32 @@ TEST(WriteFileAtomically, ReplacesWholeFileOrLeavesItAsItWas) {
     EXPECT_EQ(ReadText(dir / "settings.ini"), "next");
     EXPECT_EQ(EntryCount(dir.path()), 1u);
     EXPECT_FALSE(WriteFileAtomically(dir / "no/such/folder.ini", "x").ok());
+}
+
+TEST(TemporaryFiles, FitTheNameLimitAndOnlyThoseNothingWritesAreRemoved) {
+    TempDir dir;
+    const std::string longName = std::string(247, 'n') + ".dds";  // 251 bytes
+    WriteFile(dir / "source.dds", "data");
+    ASSERT_TRUE(ReplaceFile(dir / "source.dds", dir / longName).ok());
+    ASSERT_TRUE(WriteFileAtomically(dir / longName, "new").ok());
+    EXPECT_EQ(ReadText(dir / longName), "new");
+    EXPECT_TRUE(IsTooLong(dir / std::string(256, 'n')));
+    EXPECT_FALSE(IsTooLong(dir / "missing"));
+
+    const fs::path killed = dir / ".ThietLap.ini.kv-Ab12Cd";
+    const fs::path writing = dir / ".ThietLap.ini.kv-x9Y8z7";
+    const fs::path other = dir / ".ThietLap.ini.kv-1";  // not one of ours
+    for (const fs::path& file : {killed, writing, other}) {
+        WriteFile(file, "part");
+    }
+    // A writer holds its temporary file locked for as long as it writes.
+    const int held = ::open(writing.c_str(), O_RDONLY);
+    ASSERT_EQ(::flock(held, LOCK_EX), 0);
+    RemoveStaleTemporaries(dir.path());
+    ::close(held);
+    EXPECT_FALSE(fs::exists(killed));
+    EXPECT_TRUE(fs::exists(writing));
+    EXPECT_TRUE(fs::exists(other));
 }
 
 TEST(ListPlainFiles, SkipsFoldersAndHiddenFiles) {

@@ -69,6 +69,22 @@ TEST_F(SessionTest, ApplyStoppedByAFolderCheckShowsItsMessageAndNoSound) {
     EXPECT_FALSE(run.shown.popup);
 }
 
+TEST_F(SessionTest, UnreadableSettingsAreNamedAndNothingIsCopied) {
+    WriteFile(tool() / "ThietLap.ini", std::string("\x01\x00\x7F\x00junk", 8));
+    auto session = Open();
+    EXPECT_FALSE(session->settingsRead());
+    ASSERT_TRUE(session->SettingsProblem());
+    EXPECT_EQ(session->SettingsProblem()->kind, Kind::Warning);
+
+    const ApplyRun run = session->Apply();
+    EXPECT_TRUE(run.refused);
+    EXPECT_TRUE(run.apply.steps.empty());
+    EXPECT_TRUE(run.shown.signalSound.empty());
+    ASSERT_EQ(run.shown.messages.size(), 1u);
+    EXPECT_EQ(run.shown.messages[0], *session->SettingsProblem());
+    EXPECT_FALSE(fs::exists(game() / "data2/cmn/base.dds"));
+}
+
 TEST_F(SessionTest, FailedStepsFollowTheSoundInOneNotice) {
     WriteSettings("F7");
     fs::remove_all(game() / "zdata");
@@ -92,7 +108,7 @@ TEST_F(SessionTest, SaveConfirmsWithThePopupOrWarnsWithTheReason) {
     session->chooseOption(catalog::OptionArray::Other, 9);
     const Outcome saved = session->Save();
     EXPECT_EQ(saved.popup, (Popup{"Đã lưu thiết lập!", 2}));
-    const catalog::Settings reread = catalog::LoadSettings(tool());
+    const catalog::Settings reread = catalog::LoadSettings(tool()).settings;
     EXPECT_EQ(reread.gameFolder, "D:\\FO2");
     EXPECT_EQ(reread.selection, session->selection());
 

@@ -222,7 +222,13 @@ TEST_F(UpdateFlowTest, FailedChecksAreReportedAndChangeNothing) {
               "quá lớn"},
              {"redirect to another host", Redirect("http://localhost:1/v"), "không được phép"},
              {"too many redirects", Redirect("/r1"), "quá nhiều lần"},
-             {"no answer", QByteArray(""), "không trả lời kịp"}}) {
+             {"no answer", QByteArray(""), "không trả lời kịp"},
+             {"empty answer", Ok(""), "không trả về số phiên bản"},
+             {"lone line feed", Ok("\n"), "không trả về số phiên bản"},
+             {"captive portal", Ok("<html>\n<body>Wi-Fi login</body>\n</html>\n"),
+              "không trả về số phiên bản"},
+             {"binary data", Ok(QByteArray("\x89PNG\r\n\x1A\n\0\0\0\rIHDR", 16)),
+              "không trả về số phiên bản"}}) {
         SCOPED_TRACE(name);
         responses_["/v"] = response;
         state_.versionText = "v1.9\r\n";

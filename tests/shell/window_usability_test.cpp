@@ -82,8 +82,8 @@ TEST_F(WindowUsabilityTest, TabKeyReachesTabHeadsAndLabelsWhichTheKeyboardActiva
 
 TEST_F(WindowUsabilityTest, FocusFrameShowsForKeyboardFocusOnly) {
     auto window = ShowActive();
-    for (QWidget* widget :
-         std::initializer_list<QWidget*>{window->panels().tabHead(1), window->panels().categoryLabel(0)}) {
+    for (QWidget* widget : std::initializer_list<QWidget*>{window->panels().tabHead(1),
+                                                           window->panels().categoryLabel(0)}) {
         window->panels().tabHead(3)->setFocus(Qt::MouseFocusReason);
         const QImage unfocused = widget->grab().toImage();
         widget->setFocus(Qt::MouseFocusReason);
