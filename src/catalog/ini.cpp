@@ -7,6 +7,7 @@
 #include <utility>
 
 #include "platform/filesystem.h"
+#include "platform/text_encoding.h"
 #include "text/utf.h"
 
 namespace kickvane::catalog {
@@ -16,6 +17,17 @@ namespace fs = std::filesystem;
 namespace {
 
 constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
+
+// A line that is not UTF-8 was written by an older tool in the ANSI code page of its system: on
+// Windows that is this system's; elsewhere Windows-1252 is the best guess.
+std::string LineToUtf8(std::string_view bytes) {
+    if (!text::IsValidUtf8(bytes)) {
+        if (std::optional<std::string> decoded = platform::AnsiTextToUtf8(bytes)) {
+            return *std::move(decoded);
+        }
+    }
+    return text::LegacyTextToUtf8(bytes);
+}
 
 bool IsBlank(char c) {
     return c == ' ' || c == '\t';
@@ -106,7 +118,7 @@ IniDocument IniDocument::Parse(std::string_view bytes) {
         if (end == std::string_view::npos) {
             end = bytes.size();
         }
-        document.lines_.push_back(text::LegacyTextToUtf8(bytes.substr(start, end - start)));
+        document.lines_.push_back(LineToUtf8(bytes.substr(start, end - start)));
         start = end;
         if (start < bytes.size() && bytes[start] == '\r') {
             ++start;
