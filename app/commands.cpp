@@ -57,7 +57,7 @@ std::optional<Options> ParseOptions(Args args, bool allowGame) {
             if (arg == "--game") {
                 options.game = std::string(args[++i]);
             } else {
-                options.toolFolder = fs::absolute(fs::path(std::string(args[++i])));
+                options.toolFolder = fs::absolute(platform::PathFromUtf8(args[++i]));
             }
         } else if (arg.starts_with("--")) {
             std::cerr << "kickvane: unknown option " << arg << '\n';
@@ -173,7 +173,7 @@ int RunQuickLoad(Args args) {
     }
     ConsoleUi ui;
     const engine::QuickLoadOutcome outcome =
-        engine::QuickLoad(options->toolFolder, fs::path(std::string(options->positional[0])), ui);
+        engine::QuickLoad(options->toolFolder, platform::PathFromUtf8(options->positional[0]), ui);
     if (outcome.stopped) {
         return kExitStopped;
     }
@@ -201,13 +201,13 @@ int RunVni(Args args) {
 int RunIni(Args args) {
     if (args.size() >= 4 && args.size() <= 5 && args[0] == "get") {
         const std::string_view fallback = args.size() == 5 ? args[4] : std::string_view();
-        std::cout << catalog::ReadIni(fs::path(std::string(args[1])), args[2], args[3], fallback)
+        std::cout << catalog::ReadIni(platform::PathFromUtf8(args[1]), args[2], args[3], fallback)
                   << '\n';
         return kExitOk;
     }
     if (args.size() == 5 && args[0] == "set") {
         const Status written =
-            catalog::WriteIni(fs::path(std::string(args[1])), args[2], args[3], args[4]);
+            catalog::WriteIni(platform::PathFromUtf8(args[1]), args[2], args[3], args[4]);
         if (!written) {
             std::cerr << "kickvane: " << written.reason() << '\n';
             return 1;

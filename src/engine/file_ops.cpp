@@ -30,7 +30,7 @@ public:
     // The existing entry for `name` in any letter case, else `name` as given.
     fs::path Entry(const std::string& name) const {
         auto found = names_.find(platform::FoldCase(name));
-        return folder_ / (found == names_.end() ? name : found->second);
+        return folder_ / platform::PathFromUtf8(found == names_.end() ? name : found->second);
     }
 
 private:

@@ -30,7 +30,7 @@ std::string FoldCase(std::string_view name) {
 
 std::optional<fs::path> FindEntryIgnoringCase(const fs::path& folder, std::string_view name) {
     std::error_code ec;
-    fs::path exact = folder / fs::path(std::string(name));
+    fs::path exact = folder / PathFromUtf8(name);
     if (fs::exists(fs::symlink_status(exact, ec))) {
         return exact;
     }

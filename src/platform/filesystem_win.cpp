@@ -136,7 +136,7 @@ fs::path ProgramFolder() {
 }
 
 fs::path NativePathFromUserText(std::string_view text) {
-    return fs::path(std::u8string(text.begin(), text.end()));
+    return PathFromUtf8(text);
 }
 
 }  // namespace kickvane::platform
