@@ -14,6 +14,8 @@ packages=(
   xvfb xauth xdotool x11-utils trayer imagemagick
   # fonts with Vietnamese glyphs for the window and the artwork
   fonts-dejavu-core
+  # the Windows program: its tests run under Wine; the release is a zip
+  wine wine64 zip
 )
 
 missing=()

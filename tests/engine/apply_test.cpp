@@ -72,7 +72,8 @@ TEST_F(ApplyTest, NothingChosenStillPlaysTheSound) {
 
 TEST_F(ApplyTest, DefaultRunMergesIntoFoldersOfAnyCaseAndASecondRunCopiesNothing) {
     fs::create_directories(game() / "data2/teams");  // its make-folder step is not needed
-    fs::rename(game() / "data2/players", game() / "data2/Players");
+    fs::remove_all(game() / "data2/players");  // not a rename: Wine keeps the old case then
+    fs::create_directories(game() / "data2/Players");
     WriteFile(game() / "data2/Players/Kit/only_in_game.dds", "keep me");
 
     const ApplyOutcome first = Apply(PatchSelection::Defaults());

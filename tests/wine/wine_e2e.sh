@@ -80,7 +80,8 @@ check "trigger without a running copy fails" bash -c '! wine "$0" trigger 2>/dev
 # --- The window on a virtual display.
 Xvfb -displayfd 1 -nolisten tcp -noreset -screen 0 1280x800x24 >"$work/display" 2>/dev/null &
 xvfb_pid=$!
-wait_for test -s "$work/display"
+mkdir -p "$artifacts"
+wait_for test -s "$work/display" || { echo "Xvfb did not start"; exit 1; }
 export DISPLAY=":$(head -n 1 "$work/display")"
 
 rm -rf "$game/data2" "$game/zdata"
@@ -88,11 +89,20 @@ cp -r "$demo_game/." "$game/"
 files_in_game() { find "$game" -type f | wc -l; }
 before=$(files_in_game)
 find_window() { xdotool search --name '^Kickvane v2.0$' 2>/dev/null | head -n 1; }
+window_shown() { [ -n "$(find_window)" ]; }
+notice_shown() { [ -n "$(xdotool search --name '^Thông báo$' 2>/dev/null)" ]; }
+game_has_more_files() { [ "$(files_in_game)" -gt "$before" ]; }
+fresh_game() {  # the running copy may still be writing: wait until the count stands still
+  local count=-1
+  while [ "$count" != "$(files_in_game)" ]; do count=$(files_in_game); sleep 0.5; done
+  rm -rf "$game/data2" "$game/zdata"
+  cp -r "$demo_game/." "$game/"
+}
 
 started=$(now_ms)
-(cd "$tool" && exec wine "$exe") >"$work/window.log" 2>&1 &
+(cd "$tool" && exec wine "$exe") >"$artifacts/wine-window.log" 2>&1 &
 window_pid=$!
-check "the window shows" wait_for test -n "$(find_window)"
+check "the window shows" wait_for window_shown
 echo "start to window under Wine: $(($(now_ms) - started)) ms"
 window=$(find_window)
 sleep 1  # let it paint before the screenshot
@@ -102,18 +112,16 @@ import -window root "$artifacts/wine-window.png" 2>/dev/null || true
 xdotool windowactivate --sync "$window" 2>/dev/null || xdotool windowfocus --sync "$window"
 pressed=$(now_ms)
 xdotool key F7
-check "F7 copies the chosen sets" wait_for test "$(files_in_game)" -gt "$before"
+check "F7 copies the chosen sets" wait_for game_has_more_files
 echo "key to first copy under Wine: $(($(now_ms) - pressed)) ms"
 
-rm -rf "$game/data2" "$game/zdata"
-cp -r "$demo_game/." "$game/"
+fresh_game
 check "trigger reaches the running copy" wine "$exe" trigger
-check "the running copy applies on trigger" wait_for test "$(files_in_game)" -gt "$before"
+check "the running copy applies on trigger" wait_for game_has_more_files
 
 (cd "$tool" && exec wine "$exe") >"$work/second.log" 2>&1 &
 second_pid=$!
-check "a second start shows its notice" \
-  wait_for test -n "$(xdotool search --name '^Thông báo$' 2>/dev/null)"
+check "a second start shows its notice" wait_for notice_shown
 kill "$second_pid" 2>/dev/null || true
 check "the first copy runs on" kill -0 "$window_pid"
 check "its window is still there" test -n "$(find_window)"
