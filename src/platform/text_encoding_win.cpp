@@ -46,8 +46,8 @@ std::optional<std::string> CodePageTextToUtf8(std::string_view bytes, unsigned c
     int composedSize = NormalizeString(NormalizationC, decoded.data(), size, nullptr, 0);
     for (int attempt = 0; attempt < 3 && composedSize > 0; ++attempt) {
         std::wstring composed(static_cast<size_t>(composedSize), L'\0');
-        const int written = NormalizeString(NormalizationC, decoded.data(), size, composed.data(),
-                                            composedSize);
+        const int written =
+            NormalizeString(NormalizationC, decoded.data(), size, composed.data(), composedSize);
         if (written > 0) {
             composed.resize(static_cast<size_t>(written));
             return WideToUtf8(composed);

@@ -56,9 +56,9 @@ TEST_F(ApplyTest, FolderChecksStopTheRunWithTheirMessageBeforeAnyCopyOrSound) {
     fs::remove_all(tool() / "data");
     const ApplyOutcome outcome = Apply(PatchSelection::Defaults());
     EXPECT_EQ(outcome.stoppedBy, RootProblem::ToolDataMissing);
-    EXPECT_EQ(ui_.plain, std::vector<std::string>{
-                             "Thu muc nguon|Khong tim thay: " + (tool() / "data" / "data2").string() +
-                             "\r\nKiem tra lai duong dan"});
+    EXPECT_EQ(ui_.plain, std::vector<std::string>{"Thu muc nguon|Khong tim thay: " +
+                                                  (tool() / "data" / "data2").string() +
+                                                  "\r\nKiem tra lai duong dan"});
     EXPECT_EQ(ui_.messages.shown.size(), 1u);
     EXPECT_TRUE(outcome.steps.empty());
     EXPECT_TRUE(ui_.sounds.empty());
@@ -72,7 +72,7 @@ TEST_F(ApplyTest, NothingChosenStillPlaysTheSound) {
 
 TEST_F(ApplyTest, DefaultRunMergesIntoFoldersOfAnyCaseAndASecondRunCopiesNothing) {
     fs::create_directories(game() / "data2/teams");  // its make-folder step is not needed
-    fs::remove_all(game() / "data2/players");  // not a rename: Wine keeps the old case then
+    fs::remove_all(game() / "data2/players");        // not a rename: Wine keeps the old case then
     fs::create_directories(game() / "data2/Players");
     WriteFile(game() / "data2/Players/Kit/only_in_game.dds", "keep me");
 
