@@ -33,6 +33,9 @@ wineboot -i </dev/null >/dev/null 2>&1 || true
 windows_status=0
 ctest --preset windows -j "$jobs" || windows_status=$?
 wineserver -k </dev/null >/dev/null 2>&1 || true
+if [ "$windows_status" != 0 ]; then
+  echo "== windows: tests under Wine failed"
+  exit "$windows_status"
+fi
 scripts/package-windows.sh
 echo "== windows: $(($(date +%s) - windows_started)) s"
-exit "$windows_status"
