@@ -24,8 +24,8 @@ check() {  # check DESCRIPTION COMMAND...
   shift
   if "$@"; then echo "ok: $what"; else echo "FAILED: $what"; failures=$((failures + 1)); fi
 }
-wait_for() {  # wait_for COMMAND... (at most 30 s; only keeps a broken run from hanging)
-  for _ in $(seq 300); do "$@" && return 0; sleep 0.1; done
+wait_for() {  # wait_for COMMAND... (at most 30 s, or WAIT_LIMIT; keeps a broken run from hanging)
+  for _ in $(seq "$((${WAIT_LIMIT:-30} * 10))"); do "$@" && return 0; sleep 0.1; done
   return 1
 }
 now_ms() { date +%s%3N; }
@@ -102,7 +102,8 @@ fresh_game() {  # the running copy may still be writing: wait until the count st
 started=$(now_ms)
 (cd "$tool" && exec wine "$exe") >"$artifacts/wine-window.log" 2>&1 &
 window_pid=$!
-check "the window shows" wait_for window_shown
+# The first window of a fresh Wine prefix waits for Wine's own set-up (fonts, desktop): allow more.
+WAIT_LIMIT=180 check "the window shows" wait_for window_shown
 echo "start to window under Wine: $(($(now_ms) - started)) ms"
 window=$(find_window)
 sleep 1  # let it paint before the screenshot
