@@ -55,7 +55,7 @@ std::optional<Options> ParseOptions(Args args, bool allowGame) {
             if (arg == "--game") {
                 options.game = std::string(args[++i]);
             } else {
-                options.toolFolder = fs::absolute(fs::path(std::string(args[++i])));
+                options.toolFolder = fs::absolute(platform::PathFromUtf8(args[++i]));
             }
         } else if (arg.starts_with("--")) {
             std::cerr << "kickvane: unknown option " << arg << '\n';
@@ -194,7 +194,7 @@ int RunQuickLoad(Args args) {
     }
     session::Session session(options->toolFolder);
     const session::QuickLoadRun run =
-        session.QuickLoad(fs::path(std::string(options->positional[0])));
+        session.QuickLoad(platform::PathFromUtf8(options->positional[0]));
     const engine::QuickLoadOutcome& outcome = run.load;
     if (outcome.stopped) {
         Print(run.shown);
@@ -225,7 +225,7 @@ int RunVni(Args args) {
 int RunIni(Args args) {
     if (args.size() >= 4 && args.size() <= 5 && args[0] == "get") {
         const std::string_view fallback = args.size() == 5 ? args[4] : std::string_view();
-        const fs::path file{std::string(args[1])};
+        const fs::path file = platform::PathFromUtf8(args[1]);
         catalog::IniDocument document;
         if (const Status read = catalog::IniDocument::Read(file, &document); !read) {
             std::cerr << "kickvane: " << read.reason() << '\n';
@@ -236,7 +236,7 @@ int RunIni(Args args) {
     }
     if (args.size() == 5 && args[0] == "set") {
         const Status written =
-            catalog::WriteIni(fs::path(std::string(args[1])), args[2], args[3], args[4]);
+            catalog::WriteIni(platform::PathFromUtf8(args[1]), args[2], args[3], args[4]);
         if (!written) {
             std::cerr << "kickvane: " << written.reason() << '\n';
             return 1;

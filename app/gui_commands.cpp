@@ -11,7 +11,7 @@ namespace kickvane::app {
 int RunWindowCommand(int& argc, char** argv, Args args) {
     std::filesystem::path toolFolder;
     if (args.size() == 2 && args[0] == "--tool-folder") {
-        toolFolder = std::filesystem::absolute(std::filesystem::path(std::string(args[1])));
+        toolFolder = std::filesystem::absolute(platform::PathFromUtf8(args[1]));
     } else if (!args.empty()) {
         PrintUsage(std::cerr);
         return 2;
@@ -26,7 +26,7 @@ int RunSkinGallery(Args args) {
         PrintUsage(std::cerr);
         return 2;
     }
-    return skin::RunSkinGallery(std::filesystem::path(std::string(args[0])), std::cerr);
+    return skin::RunSkinGallery(platform::PathFromUtf8(args[0]), std::cerr);
 }
 
 }  // namespace kickvane::app

@@ -1,17 +1,21 @@
 // The kickvane program: the window by default, or one of the command-line subcommands.
 #include <iostream>
+#include <string>
 #include <string_view>
 #include <vector>
 
 #include "commands.h"
+#include "platform/program.h"
 
 int main(int argc, char** argv) {
     using namespace kickvane::app;
-    const std::vector<std::string_view> args(argv + 1, argv + argc);
+    const std::vector<std::string> arguments = kickvane::platform::ProgramArguments(argc, argv);
+    const std::vector<std::string_view> args(arguments.begin(), arguments.end());
     const std::string_view command = args.empty() ? std::string_view() : args[0];
     if (args.empty() || command == "--tool-folder") {
         return RunWindowCommand(argc, argv, Args(args.data(), args.size()));
     }
+    kickvane::platform::UseParentConsole();
     const Args rest(args.data() + 1, args.size() - 1);
     if (command == "apply") {
         return RunApply(rest);

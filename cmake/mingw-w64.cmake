@@ -1,8 +1,14 @@
-# Cross-build for 64-bit Windows with Debian's MinGW-w64 (the core and the command line; Qt for
-# Windows is not available here). Used by scripts/test.sh to keep the Windows backends compiling.
+# Cross-build for 64-bit Windows with Debian's MinGW-w64 (posix threads, as Qt for Windows needs).
+# Used by the windows and windows-core presets, and by scripts/build-qt-windows.sh to build Qt.
 set(CMAKE_SYSTEM_NAME Windows)
+set(CMAKE_SYSTEM_PROCESSOR x86_64)
 set(CMAKE_C_COMPILER x86_64-w64-mingw32-gcc-posix)
 set(CMAKE_CXX_COMPILER x86_64-w64-mingw32-g++-posix)
+set(CMAKE_RC_COMPILER x86_64-w64-mingw32-windres)
+set(CMAKE_FIND_ROOT_PATH /usr/x86_64-w64-mingw32)
 set(CMAKE_FIND_ROOT_PATH_MODE_PROGRAM NEVER)
+set(CMAKE_FIND_ROOT_PATH_MODE_LIBRARY ONLY)
+set(CMAKE_FIND_ROOT_PATH_MODE_INCLUDE ONLY)
+set(CMAKE_FIND_ROOT_PATH_MODE_PACKAGE ONLY)
 # One self-contained program: no MinGW runtime DLLs to ship beside it.
 set(CMAKE_EXE_LINKER_FLAGS_INIT "-static")

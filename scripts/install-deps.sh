@@ -18,6 +18,8 @@ packages=(
   libsqlite3-dev desktop-file-utils dpkg-dev
   # fuzzing (clang brings libFuzzer and the sanitizers) and the apply benchmark's baselines
   clang rsync
+  # the Windows program: its tests run under Wine; the release is a zip
+  wine wine64 zip
 )
 
 missing=()

@@ -7,6 +7,7 @@
 #include <utility>
 
 #include "platform/filesystem.h"
+#include "platform/text_encoding.h"
 #include "text/utf.h"
 
 namespace kickvane::catalog {
@@ -33,6 +34,17 @@ std::string Utf16BytesToUtf8(std::string_view bytes, bool bigEndian) {
         units.push_back(u'\uFFFD');
     }
     return text::Utf16ToUtf8(units);
+}
+
+// A line that is not UTF-8 was written by an older tool in the ANSI code page of its system: on
+// Windows that is this system's; elsewhere Windows-1252 is the best guess.
+std::string LineToUtf8(std::string_view bytes) {
+    if (!text::IsValidUtf8(bytes)) {
+        if (std::optional<std::string> decoded = platform::AnsiTextToUtf8(bytes)) {
+            return *std::move(decoded);
+        }
+    }
+    return text::LegacyTextToUtf8(bytes);
 }
 
 std::string Utf8ToUtf16Bytes(std::string_view utf8, bool bigEndian) {
@@ -140,7 +152,7 @@ std::optional<IniDocument> IniDocument::Parse(std::string_view bytes) {
         if (end == std::string_view::npos) {
             end = bytes.size();
         }
-        document.lines_.push_back(text::LegacyTextToUtf8(bytes.substr(start, end - start)));
+        document.lines_.push_back(LineToUtf8(bytes.substr(start, end - start)));
         start = end;
         if (start < bytes.size() && bytes[start] == '\r') {
             ++start;

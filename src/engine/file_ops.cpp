@@ -67,7 +67,7 @@ Status CopyTree(const fs::path& source, const fs::path& target, CopyCount* count
         const auto [targetName, exists] = index.Name(name);
         std::error_code typeError;
         if (entry.is_directory(typeError)) {
-            const fs::path into = target / targetName;
+            const fs::path into = target / platform::PathFromUtf8(targetName);
             if (!exists || !platform::IsDirectory(into)) {
                 if (Status made = platform::MakeDirectory(into); !made) {
                     return made;

@@ -33,7 +33,7 @@ fs::path JoinWindowsPath(const fs::path& folder, std::string_view relative) {
             end = relative.size();
         }
         if (end > start) {
-            joined /= fs::path(std::string(relative.substr(start, end - start)));
+            joined /= platform::PathFromUtf8(relative.substr(start, end - start));
         }
         start = end + 1;
     }

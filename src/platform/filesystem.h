@@ -107,6 +107,12 @@ FileRead ReadRegularFile(const fs::path& path, std::uintmax_t maxBytes);
 // name.
 std::vector<fs::path> ListPlainFiles(const fs::path& folder);
 
+// A path from UTF-8 text (the command line, the settings file). Unlike a path made from a plain
+// string, which MinGW's standard library reads byte by byte, it keeps every letter on Windows.
+inline fs::path PathFromUtf8(std::string_view text) {
+    return fs::path(std::u8string(text.begin(), text.end()));
+}
+
 // Folder that holds the running program.
 fs::path ProgramFolder();
 

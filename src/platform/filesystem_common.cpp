@@ -28,7 +28,7 @@ std::unordered_map<std::string, std::string> EntriesByFoldedName(const fs::path&
 
 std::optional<fs::path> FindEntryIgnoringCase(const fs::path& folder, std::string_view name) {
     std::error_code ec;
-    fs::path exact = folder / fs::path(std::string(name));
+    fs::path exact = folder / PathFromUtf8(name);
     if (fs::exists(fs::symlink_status(exact, ec))) {
         return exact;
     }

@@ -4,8 +4,11 @@
 // windows.h names its own ReplaceFile function as a macro; ours is the one declared below.
 #undef ReplaceFile
 
+#include <algorithm>
+#include <cstdint>
 #include <fstream>
 #include <random>
+#include <vector>
 
 #include "platform/filesystem.h"
 
@@ -42,6 +45,26 @@ Status MoveOver(const fs::path& from, const fs::path& to) {
     return Status::Ok();
 }
 
+std::uint64_t FileTimeTicks(const FILETIME& time) {
+    return (static_cast<std::uint64_t>(time.dwHighDateTime) << 32) | time.dwLowDateTime;
+}
+
+bool SameContent(const fs::path& a, const fs::path& b) {
+    std::ifstream first(a, std::ios::binary);
+    std::ifstream second(b, std::ios::binary);
+    std::vector<char> left(64 * 1024);
+    std::vector<char> right(left.size());
+    while (first && second) {
+        first.read(left.data(), static_cast<std::streamsize>(left.size()));
+        second.read(right.data(), static_cast<std::streamsize>(right.size()));
+        if (first.gcount() != second.gcount() ||
+            !std::equal(left.begin(), left.begin() + first.gcount(), right.begin())) {
+            return false;
+        }
+    }
+    return !first.bad() && !second.bad() && first.eof() && second.eof();
+}
+
 }  // namespace
 
 fs::path ResolveCaseInsensitive(const fs::path& path) {
@@ -56,14 +79,24 @@ Status MakeDirectory(const fs::path& path) {
 }
 
 bool IsUpToDateCopy(const fs::path& source, const fs::path& target) {
-    std::error_code ec;
-    const auto sourceSize = fs::file_size(source, ec);
-    if (ec || !fs::is_regular_file(target, ec)) {
+    // The system's own file times, to 100 ns: the standard library of MinGW rounds them to the
+    // second, which takes a same-size file written in the same second for the same file.
+    WIN32_FILE_ATTRIBUTE_DATA from{};
+    WIN32_FILE_ATTRIBUTE_DATA to{};
+    if (!::GetFileAttributesExW(source.c_str(), GetFileExInfoStandard, &from) ||
+        !::GetFileAttributesExW(target.c_str(), GetFileExInfoStandard, &to) ||
+        (to.dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY) != 0) {
         return false;
     }
-    const auto targetSize = fs::file_size(target, ec);
-    return !ec && sourceSize == targetSize &&
-           fs::last_write_time(source, ec) == fs::last_write_time(target, ec) && !ec;
+    const std::uint64_t fromTime = FileTimeTicks(from.ftLastWriteTime);
+    if (from.nFileSizeHigh != to.nFileSizeHigh || from.nFileSizeLow != to.nFileSizeLow ||
+        fromTime != FileTimeTicks(to.ftLastWriteTime)) {
+        return false;
+    }
+    // A time on a whole second may come from a file system that keeps no finer times (FAT keeps
+    // two seconds), where two different files easily share it: then the contents decide.
+    constexpr std::uint64_t kTicksPerSecond = 10'000'000;
+    return fromTime % kTicksPerSecond != 0 || SameContent(source, target);
 }
 
 Status ReplaceFile(const fs::path& source, const fs::path& target) {
@@ -103,9 +136,9 @@ FolderCopy::~FolderCopy() = default;
 
 Status FolderCopy::Copy(const std::string& sourceName, const std::string& targetName, bool,
                         bool* copied) {
-    // The names come from path::string(), so they convert back the same way.
-    const fs::path source = source_ / fs::path(sourceName);
-    const fs::path target = target_ / fs::path(targetName);
+    // The names come from path::string(), which gives UTF-8 here.
+    const fs::path source = source_ / PathFromUtf8(sourceName);
+    const fs::path target = target_ / PathFromUtf8(targetName);
     *copied = !IsUpToDateCopy(source, target);
     return *copied ? ReplaceFile(source, target) : Status::Ok();
 }
@@ -144,7 +177,7 @@ fs::path ProgramFolder() {
 }
 
 fs::path NativePathFromUserText(std::string_view text) {
-    return fs::path(std::u8string(text.begin(), text.end()));
+    return PathFromUtf8(text);
 }
 
 }  // namespace kickvane::platform

@@ -8,23 +8,13 @@
 #include <system_error>
 
 #include "platform/process.h"
+#include "platform/win_text.h"
 
 namespace kickvane::platform {
 
 namespace fs = std::filesystem;
 
 namespace {
-
-std::wstring Widen(const std::string& text) {
-    if (text.empty()) {
-        return {};
-    }
-    const int size =
-        MultiByteToWideChar(CP_UTF8, 0, text.data(), static_cast<int>(text.size()), nullptr, 0);
-    std::wstring wide(static_cast<size_t>(size), L'\0');
-    MultiByteToWideChar(CP_UTF8, 0, text.data(), static_cast<int>(text.size()), wide.data(), size);
-    return wide;
-}
 
 std::string SystemMessage(DWORD error) {
     return std::system_category().message(static_cast<int>(error));
@@ -106,7 +96,7 @@ Status StartDetached(const fs::path& program, const std::vector<std::string>& ar
     AppendQuoted(commandLine, absoluteProgram.wstring());
     for (const std::string& argument : arguments) {
         commandLine += L' ';
-        AppendQuoted(commandLine, Widen(argument));
+        AppendQuoted(commandLine, Utf8ToWide(argument));
     }
 
     STARTUPINFOW startup{};
@@ -135,7 +125,7 @@ fs::path FindOnPath(const std::string& name) {
     if (name.empty()) {
         return {};
     }
-    const std::wstring wide = Widen(name);
+    const std::wstring wide = Utf8ToWide(name);
     std::array<wchar_t, MAX_PATH> found{};
     const DWORD size = SearchPathW(nullptr, wide.c_str(), L".exe", static_cast<DWORD>(found.size()),
                                    found.data(), nullptr);

@@ -167,7 +167,9 @@ TEST_F(IniTest, FailedWriteLeavesTheOldFileWhole) {
     EXPECT_FALSE(missing.ok());
     EXPECT_FALSE(missing.reason().empty());
     EXPECT_FALSE(fs::exists(dir_ / "missing"));
-#ifndef _WIN32
+#ifdef _WIN32
+    GTEST_SKIP() << "a read-only folder does not stop replacing its files on Windows";
+#else
     if (::geteuid() == 0) {
         GTEST_SKIP() << "root ignores permissions";
     }

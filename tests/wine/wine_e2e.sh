@@ -1,0 +1,134 @@
+#!/usr/bin/env bash
+# The Windows program under Wine on a virtual display of its own, in folders with Vietnamese
+# names: the subcommands print what the Linux program prints for the same folders; the window
+# shows, F7 (window focused: Wine sees keys only for its own windows) and `kickvane.exe trigger`
+# copy the chosen sets; a second start is refused and leaves the first running.
+# Usage: wine_e2e.sh TOOL_FOLDER_OF_THE_WINDOWS_BUILD LINUX_KICKVANE DEMO_GAME ARTIFACTS
+# Wine's environment (WINEPREFIX, WINEDEBUG, a running wineserver) comes from the caller.
+set -euo pipefail
+
+built_tool=$1 linux_kickvane=$2 demo_game=$3 artifacts=$4
+work=$(mktemp -d)
+xvfb_pid=""
+window_pid=""
+cleanup() {
+  [ -n "$window_pid" ] && kill "$window_pid" 2>/dev/null
+  [ -n "$xvfb_pid" ] && kill "$xvfb_pid" 2>/dev/null
+  rm -rf "$work"
+}
+trap cleanup EXIT
+
+failures=0
+check() {  # check DESCRIPTION COMMAND...
+  local what=$1
+  shift
+  if "$@"; then echo "ok: $what"; else echo "FAILED: $what"; failures=$((failures + 1)); fi
+}
+wait_for() {  # wait_for COMMAND... (at most 30 s, or WAIT_LIMIT; keeps a broken run from hanging)
+  for _ in $(seq "$((${WAIT_LIMIT:-30} * 10))"); do "$@" && return 0; sleep 0.1; done
+  return 1
+}
+now_ms() { date +%s%3N; }
+
+tool="$work/Công cụ Việt"
+game="$work/Trò chơi/FIFA Online 2"
+mkdir -p "$tool" "$(dirname "$game")"
+cp -r "$built_tool/." "$tool/"
+cp -r "$demo_game" "$game"
+exe="$tool/kickvane.exe"
+game_windows=$(winepath -w "$game" 2>/dev/null)
+
+# --- Subcommands: the same output as the Linux program on a copy of the same folders.
+linux_tool="$work/linux/Công cụ Việt"
+linux_game="$work/linux/Trò chơi/FIFA Online 2"
+mkdir -p "$(dirname "$linux_tool")" "$(dirname "$linux_game")"
+cp -r "$tool" "$linux_tool"
+cp -r "$demo_game" "$linux_game"
+rm -f "$linux_tool/kickvane.exe"
+
+check "ini set with a Vietnamese path" \
+  wine "$exe" ini set "$tool/ThietLap.ini" "Thiet lap" DuongDan "$game_windows"
+"$linux_kickvane" ini set "$linux_tool/ThietLap.ini" "Thiet lap" DuongDan "$linux_game"
+check "ini get gives the Windows path back" \
+  test "$(wine "$exe" ini get "$tool/ThietLap.ini" "Thiet lap" DuongDan)" = "$game_windows"
+check "vni converts a Vietnamese argument" \
+  test "$(wine "$exe" vni "Vie65t Nam - Việt")" = "Việt Nam - Việt"
+check "vni converts standard input" \
+  test "$(printf 'Tho6ng ba1o\n' | wine "$exe" vni)" = "Thông báo"
+
+same_as_linux() {  # same_as_linux NAME ARGS... (after the command name, folders added)
+  local name=$1
+  shift
+  local windows_code=0 linux_code=0
+  wine "$exe" "$name" "$@" --tool-folder "$tool" >"$work/$name.windows" 2>&1 || windows_code=$?
+  "$linux_kickvane" "$name" "${@//$work/$work/linux}" --tool-folder "$linux_tool" \
+    >"$work/$name.linux" 2>&1 || linux_code=$?
+  [ "$windows_code" = "$linux_code" ] && diff <(grep -v ' = ' "$work/$name.linux") \
+    <(grep -v ' = ' "$work/$name.windows")
+}
+check "plan lists the same steps as on Linux" same_as_linux plan
+check "apply copies and reports as on Linux" same_as_linux apply
+check "apply again finds everything up to date, as on Linux" same_as_linux apply
+mkdir -p "$work/Khuôn mặt" "$work/linux/Khuôn mặt"
+for folder in "$work/Khuôn mặt" "$work/linux/Khuôn mặt"; do
+  printf 'face' >"$folder/face1.dds"
+  printf 'ball' >"$folder/ball.dds"
+done
+check "quick-load from a Vietnamese folder as on Linux" same_as_linux quick-load "$work/Khuôn mặt"
+check "trigger without a running copy fails" bash -c '! wine "$0" trigger 2>/dev/null' "$exe"
+
+# --- The window on a virtual display.
+Xvfb -displayfd 1 -nolisten tcp -noreset -screen 0 1280x800x24 >"$work/display" 2>/dev/null &
+xvfb_pid=$!
+mkdir -p "$artifacts"
+wait_for test -s "$work/display" || { echo "Xvfb did not start"; exit 1; }
+export DISPLAY=":$(head -n 1 "$work/display")"
+
+rm -rf "$game/data2" "$game/zdata"
+cp -r "$demo_game/." "$game/"
+files_in_game() { find "$game" -type f | wc -l; }
+before=$(files_in_game)
+find_window() { xdotool search --name '^Kickvane v2.0$' 2>/dev/null | head -n 1; }
+window_shown() { [ -n "$(find_window)" ]; }
+notice_shown() { [ -n "$(xdotool search --name '^Thông báo$' 2>/dev/null)" ]; }
+game_has_more_files() { [ "$(files_in_game)" -gt "$before" ]; }
+fresh_game() {  # the running copy may still be writing: wait until the count stands still
+  local count=-1
+  while [ "$count" != "$(files_in_game)" ]; do count=$(files_in_game); sleep 0.5; done
+  rm -rf "$game/data2" "$game/zdata"
+  cp -r "$demo_game/." "$game/"
+}
+
+started=$(now_ms)
+(cd "$tool" && exec wine "$exe") >"$artifacts/wine-window.log" 2>&1 &
+window_pid=$!
+# The first window of a fresh Wine prefix waits for Wine's own set-up (fonts, desktop): allow more.
+WAIT_LIMIT=180 check "the window shows" wait_for window_shown
+echo "start to window under Wine: $(($(now_ms) - started)) ms"
+window=$(find_window)
+sleep 1  # let it paint before the screenshot
+mkdir -p "$artifacts"
+import -window root "$artifacts/wine-window.png" 2>/dev/null || true
+
+xdotool windowactivate --sync "$window" 2>/dev/null || xdotool windowfocus --sync "$window"
+pressed=$(now_ms)
+xdotool key F7
+check "F7 copies the chosen sets" wait_for game_has_more_files
+echo "key to first copy under Wine: $(($(now_ms) - pressed)) ms"
+
+fresh_game
+check "trigger reaches the running copy" wine "$exe" trigger
+check "the running copy applies on trigger" wait_for game_has_more_files
+
+(cd "$tool" && exec wine "$exe") >"$work/second.log" 2>&1 &
+second_pid=$!
+check "a second start shows its notice" wait_for notice_shown
+kill "$second_pid" 2>/dev/null || true
+check "the first copy runs on" kill -0 "$window_pid"
+check "its window is still there" test -n "$(find_window)"
+
+if [ "$failures" -gt 0 ]; then
+  echo "$failures checks failed"
+  exit 1
+fi
+echo "all checks passed"
