@@ -4,29 +4,20 @@
 
 #include <cstdlib>
 
+#include "support/process.h"
 #include "support/temp_dir.h"
 #include "support/trees.h"
 
 namespace kickvane::testing {
 namespace {
 
-struct Result {
-    int exitCode;
-    std::string out;
-    std::string err;
-};
+using Result = CommandResult;
 
 class CliTest : public ::testing::Test {
 protected:
     // Runs the program with `args` (already quoted for the shell) and `input` on standard input.
     Result Kickvane(const std::string& args, const std::string& input = "") {
-        WriteFile(dir_ / "stdin", input);
-        const std::string command =
-            std::string("'") + KICKVANE_BINARY + "' " + args + " < '" + (dir_ / "stdin").string() +
-            "' > '" + (dir_ / "stdout").string() + "' 2> '" + (dir_ / "stderr").string() + "'";
-        const int status = std::system(command.c_str());
-        return {WIFEXITED(status) ? WEXITSTATUS(status) : -1, ReadText(dir_ / "stdout"),
-                ReadText(dir_ / "stderr")};
+        return RunCommand(std::string("'") + KICKVANE_BINARY + "' " + args, dir_.path(), input);
     }
 
     static std::string Quote(const fs::path& path) { return "'" + path.string() + "'"; }

@@ -13,11 +13,7 @@
 namespace kickvane::testing {
 namespace {
 
-struct Result {
-    int exitCode;
-    std::string out;
-    std::string err;
-};
+using Result = CommandResult;
 
 class LaunchTest : public ::testing::Test {
 protected:
@@ -47,12 +43,7 @@ protected:
     }
 
     Result Kickvane(const std::string& args) {
-        const std::string command = std::string("'") + KICKVANE_BINARY + "' " + args + " > '" +
-                                    (dir_ / "stdout").string() + "' 2> '" +
-                                    (dir_ / "stderr").string() + "' < /dev/null";
-        const int status = std::system(command.c_str());
-        return {WIFEXITED(status) ? WEXITSTATUS(status) : -1, ReadText(dir_ / "stdout"),
-                ReadText(dir_ / "stderr")};
+        return RunCommand(std::string("'") + KICKVANE_BINARY + "' " + args, dir_.path());
     }
 
     // Runs `kickvane launch` for `gameFolder` and returns what the started program recorded.

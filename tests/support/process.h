@@ -8,6 +8,10 @@
 
 #include <chrono>
 #include <cstdio>
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <sstream>
 #include <functional>
 #include <optional>
 #include <string>
@@ -107,6 +111,30 @@ inline std::string Capture(const std::string& command) {
         ::pclose(pipe);
     }
     return output;
+}
+
+// What a finished command printed and how it ended.
+struct CommandResult {
+    int exitCode;
+    std::string out;
+    std::string err;
+};
+
+// Runs the shell command line `command` with `input` on its standard input; the streams pass
+// through files in `scratch`.
+inline CommandResult RunCommand(const std::string& command, const std::filesystem::path& scratch,
+                                const std::string& input = "") {
+    const auto file = [&scratch](const char* name) { return (scratch / name).string(); };
+    std::ofstream(file("stdin"), std::ios::binary) << input;
+    const int status = std::system((command + " < '" + file("stdin") + "' > '" + file("stdout") +
+                                    "' 2> '" + file("stderr") + "'")
+                                       .c_str());
+    const auto read = [&file](const char* name) {
+        std::ostringstream text;
+        text << std::ifstream(file(name), std::ios::binary).rdbuf();
+        return text.str();
+    };
+    return {WIFEXITED(status) ? WEXITSTATUS(status) : -1, read("stdout"), read("stderr")};
 }
 
 }  // namespace kickvane::testing
