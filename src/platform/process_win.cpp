@@ -65,7 +65,7 @@ std::wstring EnvironmentBlockWith(const EnvironmentAdditions& additions) {
             const std::wstring_view name = text.substr(0, text.find(L'=', 1));
             bool replaced = false;
             for (const auto& [addedName, value] : additions) {
-                replaced = replaced || sameName(Widen(addedName), name);
+                replaced = replaced || sameName(Utf8ToWide(addedName), name);
             }
             if (!replaced) {
                 block.append(text);
@@ -75,7 +75,7 @@ std::wstring EnvironmentBlockWith(const EnvironmentAdditions& additions) {
         FreeEnvironmentStringsW(current);
     }
     for (const auto& [name, value] : additions) {
-        block += Widen(name) + L"=" + Widen(value);
+        block += Utf8ToWide(name) + L"=" + Utf8ToWide(value);
         block += L'\0';
     }
     block += L'\0';
