@@ -163,6 +163,14 @@ void RemoveStaleTemporaries(const fs::path& folder) {
 }
 
 bool IsTooLong(const fs::path& path) {
+    // No file system here keeps a name of more than 255 characters, and Windows reports a path
+    // holding one only as missing.
+    constexpr size_t kNameLimit = 255;
+    for (const fs::path& part : path) {
+        if (part.native().size() > kNameLimit) {
+            return true;
+        }
+    }
     std::error_code ec;
     (void)fs::symlink_status(path, ec);
     return ec == std::errc::filename_too_long;

@@ -145,7 +145,7 @@ Status FolderCopy::Copy(const std::string& sourceName, const std::string& target
 
 bool RemoveIfStale(const fs::path& file) {
     // A file that its writer still holds open cannot be deleted. Between the writer's close and
-    // its rename the file is free, so only files made some time ago count as stale.
+    // its rename the file is free, so only files last written some time ago count as stale.
     WIN32_FILE_ATTRIBUTE_DATA data{};
     if (!::GetFileAttributesExW(file.c_str(), GetFileExInfoStandard, &data) ||
         (data.dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY)) {
@@ -157,7 +157,7 @@ bool RemoveIfStale(const fs::path& file) {
         return (static_cast<unsigned long long>(time.dwHighDateTime) << 32) | time.dwLowDateTime;
     };
     constexpr unsigned long long kMinuteTicks = 60ULL * 10'000'000ULL;
-    if (ticks(now) < ticks(data.ftCreationTime) + kMinuteTicks) {
+    if (ticks(now) < ticks(data.ftLastWriteTime) + kMinuteTicks) {
         return false;
     }
     return ::DeleteFileW(file.c_str()) != 0;

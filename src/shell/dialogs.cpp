@@ -9,8 +9,10 @@
 #include <array>
 #include <filesystem>
 
+#include "engine/wine_prefix.h"
 #include "platform/filesystem.h"
 #include "shell/alert_popup.h"
+#include "shell/qt_text.h"
 
 namespace kickvane::shell {
 
@@ -54,21 +56,29 @@ public:
 }  // namespace
 
 QString FolderDialogStart(const QString& wanted) {
+    namespace fs = std::filesystem;
     const QString text = wanted.trimmed();
     if (!text.isEmpty()) {
-        namespace fs = std::filesystem;
         // A relative text would name a folder under the program's working folder, which is
         // nowhere the user has been.
         fs::path folder = platform::NativePathFromUserText(text.toStdString());
         while (folder.is_absolute()) {
             const fs::path existing = platform::ResolveCaseInsensitive(folder);
             if (platform::IsDirectory(existing)) {
-                return QDir::cleanPath(QString::fromStdString(existing.string()));
+                return QDir::cleanPath(PathToQString(existing));
             }
             if (!folder.has_relative_path()) {
                 break;  // the root itself is missing, as an unmapped drive is
             }
             folder = folder.parent_path();
+        }
+    }
+    // Nothing typed yet: where Windows games live here, the Wine prefix's drive C.
+    const engine::UserFolders user = engine::UserFolders::FromEnvironment();
+    for (const fs::path& prefix :
+         {user.winePrefix, user.home.empty() ? fs::path() : user.home / ".wine"}) {
+        if (!prefix.empty() && platform::IsDirectory(prefix / "drive_c")) {
+            return PathToQString(prefix / "drive_c");
         }
     }
     return QDir::homePath();

@@ -148,6 +148,8 @@ TEST(MergeCopy, FailsOnAMissingSourceAndFindsTheSourceInAnyCase) {
 
     // What a killed copy left in a target folder goes when the run writes there.
     WriteFile(dir / "dst/sub/.a.dds.kv-Ab12Cd", "half a texture");
+    fs::last_write_time(dir / "dst/sub/.a.dds.kv-Ab12Cd",
+                        fs::file_time_type::clock::now() - std::chrono::hours(1));
     CopyCount count;
     ASSERT_TRUE(MergeCopy(dir / "SRC", dir / "dst", &count).ok());
     EXPECT_EQ(ReadText(dir / "dst/sub/a.dds"), "a");

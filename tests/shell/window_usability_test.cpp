@@ -163,7 +163,7 @@ TEST_F(WindowUsabilityTest, FolderPickersOpenWhereTheUserIs) {
     EXPECT_EQ(dialogs_.starts, QStringList({"D:\\Games\\FO2", "", faces}));
 }
 
-TEST_F(WindowUsabilityTest, FolderDialogStartsAtTheNearestExistingFolderElseAtHome) {
+TEST_F(WindowUsabilityTest, FolderDialogStartsAtTheNearestExistingFolderElseInTheWinePrefix) {
     const fs::path home = dir_ / "home";
     const fs::path prefix = home / ".wine";
     std::filesystem::create_directories(prefix / "drive_c/Program Files/Games");
@@ -177,9 +177,13 @@ TEST_F(WindowUsabilityTest, FolderDialogStartsAtTheNearestExistingFolderElseAtHo
     EXPECT_EQ(FolderDialogStart(QStringLiteral("c:\\program files\\games\\FIFA Online 2")),
               native(prefix / "drive_c/Program Files/Games"));
     EXPECT_EQ(FolderDialogStart(native(home / "nowhere/deeper")), native(home));
+    // Nothing usable typed: the prefix's drive C, else home.
     for (const char* nothing : {"", "  ", "relative/folder"}) {
-        EXPECT_EQ(FolderDialogStart(QString::fromUtf8(nothing)), native(home)) << nothing;
+        EXPECT_EQ(FolderDialogStart(QString::fromUtf8(nothing)), native(prefix / "drive_c"))
+            << nothing;
     }
+    std::filesystem::remove_all(prefix);
+    EXPECT_EQ(FolderDialogStart(QString()), native(home));
 }
 
 TEST_F(WindowUsabilityTest, FolderDialogSpeaksVietnameseAndListsHiddenFolders) {
