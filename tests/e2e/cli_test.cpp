@@ -72,7 +72,7 @@ TEST_F(CliTest, SettingsThatCannotBeReadStopApplyWithTheReasonAndCopyNothing) {
     MakeGameFolder(game());
     WriteFile(tool() / "ThietLap.ini", std::string("\x7F"
                                                    "ELF\2\1\1\0\0\0",
-                                                   12));
+                                                   10));
     const Result stopped = Kickvane("apply " + Folders());
     EXPECT_EQ(stopped.exitCode, 2);
     EXPECT_NE(stopped.err.find("ThietLap.ini không phải là văn bản"), std::string::npos)
