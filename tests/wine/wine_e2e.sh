@@ -26,7 +26,11 @@ failures=0
 check() {  # check DESCRIPTION COMMAND...
   local what=$1
   shift
-  if "$@"; then echo "ok: $what"; else echo "FAILED: $what"; failures=$((failures + 1)); fi
+  if "$@"; then echo "ok: $what"; else echo "FAILED: $what"; failures=$((failures + 1)); windows_now; fi
+}
+windows_now() {  # the named windows on the display, to see why a window check failed
+  [ -n "${DISPLAY:-}" ] && xwininfo -root -tree 2>/dev/null | grep '^     0x' | grep -v 'has no name'
+  return 0
 }
 wait_for() {  # wait_for COMMAND... (at most 30 s, or WAIT_LIMIT; keeps a broken run from hanging)
   for _ in $(seq "$((${WAIT_LIMIT:-30} * 10))"); do "$@" && return 0; sleep 0.1; done
@@ -132,11 +136,12 @@ window_pid=$!
 WAIT_LIMIT=180 check "the window shows" wait_for window_shown
 echo "start to window under Wine: $(($(now_ms) - started)) ms"
 window=$(find_window)
+focus_window() { xdotool windowactivate --sync "$window" 2>/dev/null || xdotool windowfocus --sync "$window"; }
 sleep 1  # let it paint before the screenshot
 mkdir -p "$artifacts"
 import -window root "$artifacts/wine-window.png" 2>/dev/null || true
 
-xdotool windowactivate --sync "$window" 2>/dev/null || xdotool windowfocus --sync "$window"
+focus_window
 pressed=$(now_ms)
 xdotool key F7
 check "F7 copies the chosen sets" wait_for game_has_more_files
@@ -146,13 +151,6 @@ fresh_game
 check "trigger reaches the running copy" wine "$exe" trigger
 check "the running copy applies on trigger" wait_for game_has_more_files
 
-(cd "$tool" && exec wine "$exe") >"$work/second.log" 2>&1 &
-second_pid=$!
-check "a second start shows its notice" wait_for notice_shown
-kill "$second_pid" 2>/dev/null || true
-check "the first copy runs on" kill -0 "$window_pid"
-check "its window is still there" test -n "$(find_window)"
-
 # --- The tray icon: with no tray host on the display, Wine's desktop shows the icons in a window
 # of its own.
 tray_shown() { [ -n "$(xdotool search --onlyvisible --name '^Wine System Tray$' 2>/dev/null)" ]; }
@@ -160,7 +158,7 @@ check "the tray icon is there" wait_for tray_shown
 
 # --- Popups: the one of "Lưu thiết lập" (Alt+L) settles at the bottom-right corner of the work
 # area, inside the screen (no window manager here: the work area is the whole screen).
-popups_shown() { [ -n "$(xdotool search --onlyvisible --name '^Alert$' 2>/dev/null)" ]; }
+no_popup_shown() { [ -z "$(xdotool search --onlyvisible --name '^Alert$' 2>/dev/null)" ]; }
 read -r screen_width screen_height < <(xdotool getdisplaygeometry)
 popup_at_corner() {
   local id X Y WIDTH HEIGHT SCREEN
@@ -173,19 +171,27 @@ popup_at_corner() {
   done
   return 1
 }
-wait_for bash -c '! xdotool search --onlyvisible --name "^Alert$" >/dev/null 2>&1' || true
-xdotool windowactivate --sync "$window" 2>/dev/null || xdotool windowfocus --sync "$window"
+wait_for no_popup_shown || true  # the ones of F7 and trigger go first: one popup, one corner
+focus_window
 xdotool key alt+l
 check "the saved-settings popup settles at the bottom-right corner" wait_for popup_at_corner
 
 # --- "Khởi động FIFA" (Alt+F) starts the launcher and hides the window to the tray.
-xdotool windowactivate --sync "$window" 2>/dev/null || xdotool windowfocus --sync "$window"
+focus_window
 xdotool key alt+f
 check "the button starts the launcher" wait_for test -s "$started_record"
 check "minimised in the game folder" launcher_started_minimised_in_game
 window_hidden() { [ -z "$(xdotool search --onlyvisible --name '^Kickvane v2.0$' 2>/dev/null)" ]; }
 check "the window hides to the tray" wait_for window_hidden
 check "the tool runs on in the tray" kill -0 "$window_pid"
+
+# --- A second start, last: its notice takes Wine's focus from the first window.
+(cd "$tool" && exec wine "$exe") >"$work/second.log" 2>&1 &
+second_pid=$!
+check "a second start shows its notice" wait_for notice_shown
+kill "$second_pid" 2>/dev/null || true
+check "the first copy runs on" kill -0 "$window_pid"
+check "its window is still there" test -n "$(find_window)"
 
 if [ "$failures" -gt 0 ]; then
   echo "$failures checks failed"
