@@ -177,6 +177,7 @@ xdotool key alt+l
 check "the saved-settings popup settles at the bottom-right corner" wait_for popup_at_corner
 
 # --- "Khởi động FIFA" (Alt+F) starts the launcher and hides the window to the tray.
+cp "$fake_gameloader" "$game/Gameloader.exe"  # fresh_game brought back the demo game's own
 focus_window
 xdotool key alt+f
 check "the button starts the launcher" wait_for test -s "$started_record"
