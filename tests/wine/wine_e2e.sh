@@ -2,10 +2,10 @@
 # The Windows program under Wine on a virtual display of its own, in folders with Vietnamese
 # names: the subcommands print what the Linux program prints for the same folders; `launch` starts
 # the game's launcher minimised in the game folder; the window shows, F7 (window focused: Wine
-# sees keys only for its own windows) and `kickvane.exe trigger` copy the chosen sets; a second
-# start is refused and leaves the first running; the tray icon is there; "Lưu thiết lập" shows its
-# popup at the work area's bottom-right corner; "Khởi động FIFA" starts the launcher and hides the
-# window to the tray.
+# sees keys only for its own windows) and `kickvane.exe trigger` copy the chosen sets; the tray
+# icon is there; "Lưu thiết lập" shows its popup at the work area's bottom-right corner; "Khởi
+# động FIFA" starts the launcher and hides the window to the tray; a second start is refused and
+# leaves the first running.
 # Usage: wine_e2e.sh TOOL_FOLDER_OF_THE_WINDOWS_BUILD LINUX_KICKVANE DEMO_GAME ARTIFACTS
 #        FAKE_GAMELOADER (a Windows program that records how it was started, in started.txt)
 # Wine's environment (WINEPREFIX, WINEDEBUG, a running wineserver) comes from the caller.
@@ -26,10 +26,17 @@ failures=0
 check() {  # check DESCRIPTION COMMAND...
   local what=$1
   shift
-  if "$@"; then echo "ok: $what"; else echo "FAILED: $what"; failures=$((failures + 1)); windows_now; fi
+  if "$@"; then
+    echo "ok: $what"
+  else
+    echo "FAILED: $what"
+    failures=$((failures + 1))
+    windows_now
+  fi
 }
 windows_now() {  # the named windows on the display, to see why a window check failed
-  [ -n "${DISPLAY:-}" ] && xwininfo -root -tree 2>/dev/null | grep '^     0x' | grep -v 'has no name'
+  [ -n "${DISPLAY:-}" ] &&
+    xwininfo -root -tree 2>/dev/null | grep '^     0x' | grep -v 'has no name'
   return 0
 }
 wait_for() {  # wait_for COMMAND... (at most 30 s, or WAIT_LIMIT; keeps a broken run from hanging)
@@ -98,7 +105,7 @@ launcher_started_minimised_in_game() {
 }
 check "launch says it started the launcher directly" test \
   "$(wine "$exe" launch --tool-folder "$tool")" = "started Gameloader.exe through directly"
-check "the launcher runs minimised in the game folder" wait_for test -s "$started_record"
+check "the launcher runs" wait_for test -s "$started_record"
 check "its record names the game folder and the minimised state" launcher_started_minimised_in_game
 rm -f "$started_record"
 
@@ -136,7 +143,9 @@ window_pid=$!
 WAIT_LIMIT=180 check "the window shows" wait_for window_shown
 echo "start to window under Wine: $(($(now_ms) - started)) ms"
 window=$(find_window)
-focus_window() { xdotool windowactivate --sync "$window" 2>/dev/null || xdotool windowfocus --sync "$window"; }
+focus_window() {
+  xdotool windowactivate --sync "$window" 2>/dev/null || xdotool windowfocus --sync "$window"
+}
 sleep 1  # let it paint before the screenshot
 mkdir -p "$artifacts"
 import -window root "$artifacts/wine-window.png" 2>/dev/null || true
@@ -161,7 +170,7 @@ check "the tray icon is there" wait_for tray_shown
 no_popup_shown() { [ -z "$(xdotool search --onlyvisible --name '^Alert$' 2>/dev/null)" ]; }
 read -r screen_width screen_height < <(xdotool getdisplaygeometry)
 popup_at_corner() {
-  local id X Y WIDTH HEIGHT SCREEN
+  local id WINDOW X Y WIDTH HEIGHT SCREEN
   for id in $(xdotool search --onlyvisible --name '^Alert$' 2>/dev/null); do
     eval "$(xdotool getwindowgeometry --shell "$id")"
     [ "$X" -ge 0 ] && [ "$Y" -ge 0 ] &&
