@@ -26,7 +26,7 @@ fs::path DefaultToolFolder() {
 int RunLaunch(Args args) {
     fs::path toolFolder;
     if (args.size() == 2 && args[0] == "--tool-folder") {
-        toolFolder = fs::absolute(fs::path(std::string(args[1])));
+        toolFolder = fs::absolute(platform::PathFromUtf8(args[1]));
     } else if (args.empty()) {
         toolFolder = DefaultToolFolder();
     } else {

@@ -1,13 +1,17 @@
 #!/usr/bin/env bash
 # The Windows program under Wine on a virtual display of its own, in folders with Vietnamese
-# names: the subcommands print what the Linux program prints for the same folders; the window
-# shows, F7 (window focused: Wine sees keys only for its own windows) and `kickvane.exe trigger`
-# copy the chosen sets; a second start is refused and leaves the first running.
+# names: the subcommands print what the Linux program prints for the same folders; `launch` starts
+# the game's launcher minimised in the game folder; the window shows, F7 (window focused: Wine
+# sees keys only for its own windows) and `kickvane.exe trigger` copy the chosen sets; the tray
+# icon is there; "Lưu thiết lập" shows its popup at the work area's bottom-right corner; "Khởi
+# động FIFA" starts the launcher and hides the window to the tray; a second start is refused and
+# leaves the first running.
 # Usage: wine_e2e.sh TOOL_FOLDER_OF_THE_WINDOWS_BUILD LINUX_KICKVANE DEMO_GAME ARTIFACTS
+#        FAKE_GAMELOADER (a Windows program that records how it was started, in started.txt)
 # Wine's environment (WINEPREFIX, WINEDEBUG, a running wineserver) comes from the caller.
 set -euo pipefail
 
-built_tool=$1 linux_kickvane=$2 demo_game=$3 artifacts=$4
+built_tool=$1 linux_kickvane=$2 demo_game=$3 artifacts=$4 fake_gameloader=$5
 work=$(mktemp -d)
 xvfb_pid=""
 window_pid=""
@@ -22,7 +26,18 @@ failures=0
 check() {  # check DESCRIPTION COMMAND...
   local what=$1
   shift
-  if "$@"; then echo "ok: $what"; else echo "FAILED: $what"; failures=$((failures + 1)); fi
+  if "$@"; then
+    echo "ok: $what"
+  else
+    echo "FAILED: $what"
+    failures=$((failures + 1))
+    windows_now
+  fi
+}
+windows_now() {  # the named windows on the display, to see why a window check failed
+  [ -n "${DISPLAY:-}" ] &&
+    xwininfo -root -tree 2>/dev/null | grep '^     0x' | grep -v 'has no name'
+  return 0
 }
 wait_for() {  # wait_for COMMAND... (at most 30 s, or WAIT_LIMIT; keeps a broken run from hanging)
   for _ in $(seq "$((${WAIT_LIMIT:-30} * 10))"); do "$@" && return 0; sleep 0.1; done
@@ -77,6 +92,23 @@ done
 check "quick-load from a Vietnamese folder as on Linux" same_as_linux quick-load "$work/Khuôn mặt"
 check "trigger without a running copy fails" bash -c '! wine "$0" trigger 2>/dev/null' "$exe"
 
+# --- The game's launcher: a stand-in that records its working folder and show state.
+cp "$fake_gameloader" "$game/Gameloader.exe"
+started_record="$game/started.txt"
+launcher_started_minimised_in_game() {
+  [ -s "$started_record" ] || return 1
+  local folder state
+  { read -r folder && read -r state; } <"$started_record"
+  [ "${folder%\\}" = "$game_windows" ] && [ "$state" = minimised ] && return 0
+  echo "launcher recorded: $(tr '\n' ' ' <"$started_record")(wanted $game_windows, minimised)"
+  return 1
+}
+check "launch says it started the launcher directly" test \
+  "$(wine "$exe" launch --tool-folder "$tool")" = "started Gameloader.exe through directly"
+check "the launcher runs" wait_for test -s "$started_record"
+check "its record names the game folder and the minimised state" launcher_started_minimised_in_game
+rm -f "$started_record"
+
 # --- The window on a virtual display: the caller's (KICKVANE_TEST_DISPLAY), which Wine's desktop
 # was started on, else one of our own.
 mkdir -p "$artifacts"
@@ -111,11 +143,14 @@ window_pid=$!
 WAIT_LIMIT=180 check "the window shows" wait_for window_shown
 echo "start to window under Wine: $(($(now_ms) - started)) ms"
 window=$(find_window)
+focus_window() {
+  xdotool windowactivate --sync "$window" 2>/dev/null || xdotool windowfocus --sync "$window"
+}
 sleep 1  # let it paint before the screenshot
 mkdir -p "$artifacts"
 import -window root "$artifacts/wine-window.png" 2>/dev/null || true
 
-xdotool windowactivate --sync "$window" 2>/dev/null || xdotool windowfocus --sync "$window"
+focus_window
 pressed=$(now_ms)
 xdotool key F7
 check "F7 copies the chosen sets" wait_for game_has_more_files
@@ -125,6 +160,42 @@ fresh_game
 check "trigger reaches the running copy" wine "$exe" trigger
 check "the running copy applies on trigger" wait_for game_has_more_files
 
+# --- The tray icon: with no tray host on the display, Wine's desktop shows the icons in a window
+# of its own.
+tray_shown() { [ -n "$(xdotool search --onlyvisible --name '^Wine System Tray$' 2>/dev/null)" ]; }
+check "the tray icon is there" wait_for tray_shown
+
+# --- Popups: the one of "Lưu thiết lập" (Alt+L) settles at the bottom-right corner of the work
+# area, inside the screen (no window manager here: the work area is the whole screen).
+no_popup_shown() { [ -z "$(xdotool search --onlyvisible --name '^Alert$' 2>/dev/null)" ]; }
+read -r screen_width screen_height < <(xdotool getdisplaygeometry)
+popup_at_corner() {
+  local id WINDOW X Y WIDTH HEIGHT SCREEN
+  for id in $(xdotool search --onlyvisible --name '^Alert$' 2>/dev/null); do
+    eval "$(xdotool getwindowgeometry --shell "$id")"
+    [ "$X" -ge 0 ] && [ "$Y" -ge 0 ] &&
+      [ $((X + WIDTH)) -le "$screen_width" ] && [ $((X + WIDTH)) -ge $((screen_width - 4)) ] &&
+      [ $((Y + HEIGHT)) -le "$screen_height" ] && [ $((Y + HEIGHT)) -ge $((screen_height - 4)) ] &&
+      return 0
+  done
+  return 1
+}
+wait_for no_popup_shown || true  # the ones of F7 and trigger go first: one popup, one corner
+focus_window
+xdotool key alt+l
+check "the saved-settings popup settles at the bottom-right corner" wait_for popup_at_corner
+
+# --- "Khởi động FIFA" (Alt+F) starts the launcher and hides the window to the tray.
+cp "$fake_gameloader" "$game/Gameloader.exe"  # fresh_game brought back the demo game's own
+focus_window
+xdotool key alt+f
+check "the button starts the launcher" wait_for test -s "$started_record"
+check "minimised in the game folder" launcher_started_minimised_in_game
+window_hidden() { [ -z "$(xdotool search --onlyvisible --name '^Kickvane v2.0$' 2>/dev/null)" ]; }
+check "the window hides to the tray" wait_for window_hidden
+check "the tool runs on in the tray" kill -0 "$window_pid"
+
+# --- A second start, last: its notice takes Wine's focus from the first window.
 (cd "$tool" && exec wine "$exe") >"$work/second.log" 2>&1 &
 second_pid=$!
 check "a second start shows its notice" wait_for notice_shown
