@@ -30,7 +30,7 @@ public:
     }
 
     std::deque<std::optional<QString>> folders;  // nullopt: the user cancels
-    QStringList starts;  // where each folder picker was asked to open
+    QStringList starts;                          // where each folder picker was asked to open
     QStringList messages;
     QStringList notices;
     QStringList popups;
