@@ -4,6 +4,7 @@
 #include <system_error>
 
 #include "platform/filesystem.h"
+#include "platform/text.h"
 
 namespace kickvane::engine {
 
@@ -15,14 +16,9 @@ bool IsBlank(char c) {
     return c == ' ' || c == '\t' || c == '\r';
 }
 
+// Blanks and the CR of a file written with CR LF line ends.
 std::string_view Trim(std::string_view text) {
-    while (!text.empty() && IsBlank(text.front())) {
-        text.remove_prefix(1);
-    }
-    while (!text.empty() && IsBlank(text.back())) {
-        text.remove_suffix(1);
-    }
-    return text;
+    return platform::TrimBlanks(text, " \t\r");
 }
 
 int HexDigit(char c) {

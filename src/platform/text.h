@@ -25,13 +25,13 @@ inline std::string FoldCase(std::string_view name) {
     return folded;
 }
 
-// Without leading and trailing spaces and tabs.
-constexpr std::string_view TrimBlanks(std::string_view text) {
-    const size_t first = text.find_first_not_of(" \t");
+// Without leading and trailing blanks: spaces and tabs unless `blanks` says otherwise.
+constexpr std::string_view TrimBlanks(std::string_view text, std::string_view blanks = " \t") {
+    const size_t first = text.find_first_not_of(blanks);
     if (first == std::string_view::npos) {
         return {};
     }
-    return text.substr(first, text.find_last_not_of(" \t") - first + 1);
+    return text.substr(first, text.find_last_not_of(blanks) - first + 1);
 }
 
 }  // namespace kickvane::platform

@@ -93,6 +93,13 @@ void FocusCue::FocusIn(Qt::FocusReason reason) {
     }
 }
 
+bool FocusCue::KeyPressed(QWidget& widget, const QKeyEvent& event) {
+    if (!std::exchange(keyboard_, true)) {
+        widget.update();
+    }
+    return IsActivationKey(event);
+}
+
 bool LoadPicture(QPixmap& pixmap, const QString& file) {
     // The same few skin pictures are drawn on every tab switch and by all four panels: decode
     // each file once and share it.
@@ -114,10 +121,7 @@ ClickableLabel::ClickableLabel(const QString& text, QWidget* parent) : QLabel(te
 }
 
 void ClickableLabel::keyPressEvent(QKeyEvent* event) {
-    if (focusCue_.KeyPressed()) {
-        update();
-    }
-    if (IsActivationKey(*event)) {
+    if (focusCue_.KeyPressed(*this, *event)) {
         emit clicked();
         return;
     }
@@ -180,10 +184,7 @@ TabHead::TabHead(const QString& caption, QWidget* parent) : PictureBox(parent), 
 }
 
 void TabHead::keyPressEvent(QKeyEvent* event) {
-    if (focusCue_.KeyPressed()) {
-        update();
-    }
-    if (IsActivationKey(*event)) {
+    if (focusCue_.KeyPressed(*this, *event)) {
         emit clicked();
         return;
     }

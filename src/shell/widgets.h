@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QKeyEvent>
 #include <QLabel>
 #include <QPixmap>
 #include <QWidget>
@@ -18,8 +19,9 @@ bool LoadPicture(QPixmap& pixmap, const QString& file);
 class FocusCue {
 public:
     void FocusIn(Qt::FocusReason reason);
-    // True when the frame has just become due: the widget repaints.
-    bool KeyPressed() { return !std::exchange(keyboard_, true); }
+    // A key pressed in `widget`: the frame becomes due (the widget repaints when it just did).
+    // True when the key activates the widget: Space or Enter.
+    bool KeyPressed(QWidget& widget, const QKeyEvent& event);
     bool Shown(const QWidget& widget) const { return keyboard_ && widget.hasFocus(); }
 
 private:
