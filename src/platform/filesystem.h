@@ -48,7 +48,8 @@ Status ReplaceFile(const fs::path& source, const fs::path& target);
 
 // Copies files from one folder into another, each as ReplaceFile does, unless the target already
 // equals its source (IsUpToDateCopy). Both folders are opened once, so that the copy of one file
-// does not look their paths up again.
+// does not look their paths up again. Where the target folder holds no such name yet, the file is
+// written without a name and linked into place once whole, where the file system allows.
 class FolderCopy {
 public:
     FolderCopy(const fs::path& sourceFolder, const fs::path& targetFolder);
@@ -67,6 +68,7 @@ private:
     fs::path target_;
     int sourceFd_ = -1;
     int targetFd_ = -1;
+    bool unnamedFiles_ = true;  // new files may be written unnamed and linked into place
 };
 
 // Writes `content` to a temporary file beside `path`, flushes it and renames it over `path`.

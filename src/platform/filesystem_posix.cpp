@@ -10,6 +10,7 @@
 #include <cstdint>
 #include <cstring>
 #include <random>
+#include <string>
 
 #include "platform/filesystem.h"
 #include "platform/posix_fd.h"
@@ -219,23 +220,82 @@ bool IsUpToDateCopy(const fs::path& source, const fs::path& target) {
 
 namespace {
 
-// Copies the open regular file `in` (described by `st`) to `targetName` in the folder `dirFd`
-// through a temporary file beside it, with the source's permissions and times.
-Status CopyInto(int in, const struct stat& st, int dirFd, const std::string& targetName,
-                const fs::path& target) {
+// Gives the copy in `out` the source's permissions (where the creation mask took some away) and
+// times.
+void TakeModeAndTimes(int out, const struct stat& st) {
     const mode_t mode = st.st_mode & 0777;
-    TempFile temp(dirFd, targetName, mode | S_IRUSR | S_IWUSR);
+    if (((mode | S_IRUSR | S_IWUSR) & ~CreationMask()) != mode) {
+        ::fchmod(out, mode);
+    }
+    const struct timespec times[2] = {st.st_atim, st.st_mtim};
+    ::futimens(out, times);
+}
+
+// Gives the unnamed file `fd` the name `targetName` in the folder `dirFd`. Linking by descriptor
+// needs a privilege on older kernels; the descriptor's entry under /proc does not.
+bool LinkUnnamed(int fd, int dirFd, const std::string& targetName) {
+    if (::linkat(fd, "", dirFd, targetName.c_str(), AT_EMPTY_PATH) == 0) {
+        return true;
+    }
+    if (errno != EPERM && errno != ENOENT) {
+        return false;
+    }
+    const std::string self = "/proc/self/fd/" + std::to_string(fd);
+    return ::linkat(AT_FDCWD, self.c_str(), dirFd, targetName.c_str(), AT_SYMLINK_FOLLOW) == 0;
+}
+
+enum class NewFile { Written, Failed, Unsupported };
+
+// Writes a file where none is: into a file without a name in the folder, named only once it is
+// whole. A killed copy leaves nothing behind, and there is no temporary name, lock or rename to
+// pay for. Unsupported where the file system has no unnamed files, or when the name was taken
+// meanwhile; the caller then goes through a named temporary file.
+NewFile CopyIntoNew(int in, const struct stat& st, int dirFd, const std::string& targetName) {
+    Fd out(::openat(dirFd, ".", O_TMPFILE | O_WRONLY | O_CLOEXEC,
+                    (st.st_mode & 0777) | S_IRUSR | S_IWUSR));
+    if (!out.valid()) {
+        return errno == EOPNOTSUPP || errno == EISDIR || errno == EINVAL ? NewFile::Unsupported
+                                                                         : NewFile::Failed;
+    }
+    if (!CopyContent(in, out.get(), st.st_size)) {
+        return NewFile::Failed;
+    }
+    TakeModeAndTimes(out.get(), st);
+    if (!LinkUnnamed(out.get(), dirFd, targetName)) {
+        return errno == EEXIST || errno == ENOENT || errno == EPERM ? NewFile::Unsupported
+                                                                    : NewFile::Failed;
+    }
+    return out.Close() == 0 ? NewFile::Written : NewFile::Failed;
+}
+
+// Copies the open regular file `in` (described by `st`) to `targetName` in the folder `dirFd`,
+// with the source's permissions and times: a new file straight into place where `targetIsNew`
+// and the file system allows (cleared where it does not, so that later files skip the attempt),
+// else through a temporary file renamed over the target.
+Status CopyInto(int in, const struct stat& st, int dirFd, const std::string& targetName,
+                const fs::path& target, bool* targetIsNew) {
+    if (targetIsNew && *targetIsNew) {
+        switch (CopyIntoNew(in, st, dirFd, targetName)) {
+            case NewFile::Written:
+                return Status::Ok();
+            case NewFile::Failed:
+                return Failure("cannot copy to", target, errno);
+            case NewFile::Unsupported:
+                *targetIsNew = false;
+                if (::lseek(in, 0, SEEK_SET) != 0) {
+                    return Failure("cannot read", target, errno);
+                }
+                break;
+        }
+    }
+    TempFile temp(dirFd, targetName, (st.st_mode & 0777) | S_IRUSR | S_IWUSR);
     if (!temp.valid()) {
         return Failure("cannot write", target, errno);
     }
     if (!CopyContent(in, temp.fd(), st.st_size)) {
         return Failure("cannot copy to", target, errno);
     }
-    if (((mode | S_IRUSR | S_IWUSR) & ~CreationMask()) != mode) {
-        ::fchmod(temp.fd(), mode);
-    }
-    const struct timespec times[2] = {st.st_atim, st.st_mtim};
-    ::futimens(temp.fd(), times);
+    TakeModeAndTimes(temp.fd(), st);
     return temp.CommitAs(targetName, target);
 }
 
@@ -263,7 +323,7 @@ Status ReplaceFile(const fs::path& source, const fs::path& target) {
     if (folder.get() < 0) {
         return Failure("cannot write", target, errno);
     }
-    return CopyInto(in.get(), st, folder.get(), target.filename().string(), target);
+    return CopyInto(in.get(), st, folder.get(), target.filename().string(), target, nullptr);
 }
 
 FolderCopy::FolderCopy(const fs::path& sourceFolder, const fs::path& targetFolder)
@@ -306,7 +366,11 @@ Status FolderCopy::Copy(const std::string& sourceName, const std::string& target
         return Failure("cannot read", source_ / sourceName, errno);
     }
     *copied = true;
-    return CopyInto(in.get(), st, targetFd_, targetName, target_ / targetName);
+    bool targetIsNew = !targetMayExist && unnamedFiles_;
+    Status status =
+        CopyInto(in.get(), st, targetFd_, targetName, target_ / targetName, &targetIsNew);
+    unnamedFiles_ = unnamedFiles_ && (targetIsNew || targetMayExist);
+    return status;
 }
 
 Status WriteFileAtomically(const fs::path& path, std::string_view content) {

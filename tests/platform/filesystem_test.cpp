@@ -116,6 +116,36 @@ TEST(ReplaceFile, FailureLeavesTargetWholeAndNamesThePath) {
     EXPECT_EQ(EntryCount(dir / "dst"), 1u);
 }
 
+TEST(FolderCopy, NewFilesAppearWholeWithTheSourcesModeAndTimeOrNotAtAll) {
+    TempDir dir;
+    WriteFile(dir / "src/a.dds", "new content");
+    fs::permissions(dir / "src/a.dds", fs::perms::owner_read | fs::perms::owner_write |
+                                           fs::perms::group_read | fs::perms::others_read);
+    const auto sourceTime = fs::last_write_time(dir / "src/a.dds") - std::chrono::hours(30);
+    fs::last_write_time(dir / "src/a.dds", sourceTime);
+    fs::create_directories(dir / "dst");
+    FolderCopy files(dir / "src", dir / "dst");
+    bool copied = false;
+
+    // A copy stopped part-way leaves no file under any name.
+    EXPECT_FALSE(
+        WithTinyFileLimit([&] { return files.Copy("a.dds", "a.dds", false, &copied); }).ok());
+    EXPECT_EQ(EntryCount(dir / "dst"), 0u);
+
+    ASSERT_TRUE(files.Copy("a.dds", "A.DDS", false, &copied).ok());
+    EXPECT_TRUE(copied);
+    EXPECT_EQ(ReadText(dir / "dst/A.DDS"), "new content");
+    EXPECT_EQ(fs::last_write_time(dir / "dst/A.DDS"), sourceTime);
+    EXPECT_EQ(fs::status(dir / "dst/A.DDS").permissions(),
+              fs::status(dir / "src/a.dds").permissions());
+
+    // A name that appeared after the caller looked is replaced all the same.
+    WriteFile(dir / "dst/b.dds", "old");
+    ASSERT_TRUE(files.Copy("a.dds", "b.dds", false, &copied).ok());
+    EXPECT_EQ(ReadText(dir / "dst/b.dds"), "new content");
+    EXPECT_EQ(EntryCount(dir / "dst"), 2u);
+}
+
 TEST(WriteFileAtomically, ReplacesWholeFileOrLeavesItAsItWas) {
     TempDir dir;
     WriteFile(dir / "settings.ini", "previous");
