@@ -3,10 +3,22 @@
 
 #include "commands.h"
 #include "platform/filesystem.h"
-#include "shell/run_window.h"
-#include "skin/gallery.h"
+#include "window_entry.h"
 
 namespace kickvane::app {
+
+namespace {
+
+std::optional<WindowEntry> WindowOrSayWhy() {
+    std::string error;
+    std::optional<WindowEntry> entry = FindWindowEntry(error);
+    if (!entry) {
+        std::cerr << "kickvane: cannot load the window: " << error << '\n';
+    }
+    return entry;
+}
+
+}  // namespace
 
 int RunWindowCommand(int& argc, char** argv, Args args) {
     std::filesystem::path toolFolder;
@@ -18,7 +30,8 @@ int RunWindowCommand(int& argc, char** argv, Args args) {
     } else {
         toolFolder = DefaultToolFolder();
     }
-    return shell::RunWindow(argc, argv, toolFolder);
+    const std::optional<WindowEntry> window = WindowOrSayWhy();
+    return window ? window->openWindow(&argc, argv, platform::PathToUtf8(toolFolder).c_str()) : 2;
 }
 
 int RunSkinGallery(Args args) {
@@ -26,7 +39,8 @@ int RunSkinGallery(Args args) {
         PrintUsage(std::cerr);
         return 2;
     }
-    return skin::RunSkinGallery(platform::PathFromUtf8(args[0]), std::cerr);
+    const std::optional<WindowEntry> window = WindowOrSayWhy();
+    return window ? window->drawSkinGallery(std::string(args[0]).c_str()) : 2;
 }
 
 }  // namespace kickvane::app

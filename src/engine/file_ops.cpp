@@ -1,7 +1,12 @@
 #include "engine/file_ops.h"
 
 #include <algorithm>
+#include <atomic>
+#include <mutex>
+#include <system_error>
+#include <thread>
 #include <unordered_map>
+#include <unordered_set>
 #include <utility>
 #include <vector>
 
@@ -50,40 +55,118 @@ Status CopyOne(const fs::path& source, const fs::path& target, CopyCount* count)
     return status;
 }
 
+// One file of a folder to copy, and whether the target folder holds its name already.
+struct FileJob {
+    std::string sourceName;
+    std::string targetName;
+    bool targetExists = false;
+};
+
+// How many files of one folder are copied at once. A copy is mostly the kernel's work, which runs
+// on as many cores as there are copies under way; a folder of a few files is not worth a thread.
+unsigned CopyWorkers(size_t files) {
+    constexpr size_t kFilesPerWorker = 32;
+    const unsigned cores = std::clamp(std::thread::hardware_concurrency(), 1u, 4u);
+    return static_cast<unsigned>(std::clamp<size_t>(files / kFilesPerWorker, 1, cores));
+}
+
+// Whether two of the files would land on one name on a file system that ignores letter case;
+// those are copied one after the other, so that the last in name order wins as it always has.
+bool NamesCollide(const std::vector<FileJob>& jobs) {
+    std::unordered_set<std::string> folded;
+    folded.reserve(jobs.size());
+    return !std::all_of(jobs.begin(), jobs.end(), [&folded](const FileJob& job) {
+        return folded.insert(platform::FoldCase(job.targetName)).second;
+    });
+}
+
+// Copies the files of one folder, several at once where there are many. On a failure no further
+// file is started, and the failure of the first file in name order among those tried is returned.
+Status CopyFiles(platform::FolderCopy& files, const std::vector<FileJob>& jobs, CopyCount* count) {
+    std::atomic<size_t> next{0};
+    std::atomic<bool> stop{false};
+    std::atomic<int> copied{0};
+    std::atomic<int> upToDate{0};
+    std::mutex failureMutex;
+    size_t failedAt = jobs.size();
+    Status failure = Status::Ok();
+    const auto work = [&] {
+        while (!stop.load(std::memory_order_relaxed)) {
+            const size_t i = next.fetch_add(1, std::memory_order_relaxed);
+            if (i >= jobs.size()) {
+                return;
+            }
+            bool wasCopied = false;
+            Status status = files.Copy(jobs[i].sourceName, jobs[i].targetName, jobs[i].targetExists,
+                                       &wasCopied);
+            if (!status) {
+                const std::lock_guard lock(failureMutex);
+                if (i < failedAt) {
+                    failedAt = i;
+                    failure = std::move(status);
+                }
+                stop = true;
+                return;
+            }
+            ++(wasCopied ? copied : upToDate);
+        }
+    };
+    {
+        const unsigned workers = NamesCollide(jobs) ? 1 : CopyWorkers(jobs.size());
+        std::vector<std::jthread> helpers;
+        try {
+            while (helpers.size() + 1 < workers) {
+                helpers.emplace_back(work);
+            }
+        } catch (const std::system_error&) {
+            // No more threads to be had: the ones there are do the work.
+        }
+        work();
+    }  // the helpers are joined here
+    if (count) {
+        count->copied += copied;
+        count->upToDate += upToDate;
+    }
+    return failure;
+}
+
 Status CopyTree(const fs::path& source, const fs::path& target, CopyCount* count) {
-    std::vector<fs::directory_entry> entries;
+    std::vector<FileJob> jobs;
+    std::vector<std::string> folders;
     std::error_code ec;
+    const FolderIndex index(target);
     for (fs::directory_iterator it(source, ec), end; !ec && it != end; it.increment(ec)) {
-        entries.push_back(*it);
+        std::string name = it->path().filename().string();
+        std::error_code typeError;
+        if (it->is_directory(typeError)) {
+            folders.push_back(std::move(name));
+        } else {
+            auto [targetName, exists] = index.Name(name);
+            jobs.push_back({std::move(name), std::move(targetName), exists});
+        }
     }
     if (ec) {
         return Status::Fail("cannot read folder " + source.string() + ": " + ec.message());
     }
-    std::sort(entries.begin(), entries.end());
-    const FolderIndex index(target);
-    platform::FolderCopy files(source, target);  // both folders opened once for all files
-    for (const fs::directory_entry& entry : entries) {
-        const std::string name = entry.path().filename().string();
+    std::sort(jobs.begin(), jobs.end(),
+              [](const FileJob& a, const FileJob& b) { return a.sourceName < b.sourceName; });
+    std::sort(folders.begin(), folders.end());
+    {
+        platform::FolderCopy files(source, target);  // both folders opened once for all files
+        if (Status copied = CopyFiles(files, jobs, count); !copied) {
+            return copied;
+        }
+    }
+    for (const std::string& name : folders) {
         const auto [targetName, exists] = index.Name(name);
-        std::error_code typeError;
-        if (entry.is_directory(typeError)) {
-            const fs::path into = target / platform::PathFromUtf8(targetName);
-            if (!exists || !platform::IsDirectory(into)) {
-                if (Status made = platform::MakeDirectory(into); !made) {
-                    return made;
-                }
+        const fs::path into = target / platform::PathFromUtf8(targetName);
+        if (!exists || !platform::IsDirectory(into)) {
+            if (Status made = platform::MakeDirectory(into); !made) {
+                return made;
             }
-            if (Status copied = CopyTree(entry.path(), into, count); !copied) {
-                return copied;
-            }
-            continue;
         }
-        bool copied = false;
-        if (Status status = files.Copy(name, targetName, exists, &copied); !status) {
-            return status;
-        }
-        if (count) {
-            ++(copied ? count->copied : count->upToDate);
+        if (Status copied = CopyTree(source / platform::PathFromUtf8(name), into, count); !copied) {
+            return copied;
         }
     }
     return Status::Ok();

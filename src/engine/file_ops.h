@@ -18,8 +18,9 @@ struct CopyCount {
 // Copies every file and subfolder of `source` into `target`, recursively. `target` is created when
 // missing, but not its parent. Files in `target` are replaced; files that exist only there stay.
 // Fails when `source` is missing, when the parent of `target` is missing, or at the first file
-// that cannot be written (what was copied before stays). A file whose size and modification time
-// already equal its source's is not copied again.
+// that cannot be written (no further file is started; what was copied stays). A file whose size
+// and modification time already equal its source's is not copied again. The files of a large
+// folder are copied several at once.
 Status MergeCopy(const fs::path& source, const fs::path& target, CopyCount* count = nullptr);
 
 // Copies one file into an existing folder under its own name, replacing a file of that name.

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <atomic>
 #include <cstdint>
 #include <filesystem>
 #include <optional>
@@ -68,7 +69,7 @@ private:
     fs::path target_;
     int sourceFd_ = -1;
     int targetFd_ = -1;
-    bool unnamedFiles_ = true;  // new files may be written unnamed and linked into place
+    std::atomic<bool> unnamedFiles_{true};  // new files may be written unnamed, then linked
 };
 
 // Writes `content` to a temporary file beside `path`, flushes it and renames it over `path`.
@@ -113,6 +114,12 @@ std::vector<fs::path> ListPlainFiles(const fs::path& folder);
 // string, which MinGW's standard library reads byte by byte, it keeps every letter on Windows.
 inline fs::path PathFromUtf8(std::string_view text) {
     return fs::path(std::u8string(text.begin(), text.end()));
+}
+
+// The UTF-8 text of a path: PathFromUtf8 gives the path back.
+inline std::string PathToUtf8(const fs::path& path) {
+    const std::u8string text = path.u8string();
+    return std::string(text.begin(), text.end());
 }
 
 // Folder that holds the running program.

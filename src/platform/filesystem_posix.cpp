@@ -6,6 +6,7 @@
 #include <unistd.h>
 
 #include <array>
+#include <atomic>
 #include <cerrno>
 #include <cstdint>
 #include <cstring>
@@ -42,15 +43,13 @@ std::string UniqueSuffix() {
     return suffix;
 }
 
-// The permission bits that new files lose, read once.
-mode_t CreationMask() {
-    static const mode_t mask = [] {
-        const mode_t current = ::umask(022);
-        ::umask(current);
-        return current;
-    }();
-    return mask;
-}
+// The permission bits that new files lose. Read while the program starts, before any copy runs
+// on another thread: reading means setting it for a moment.
+const mode_t kCreationMask = [] {
+    const mode_t current = ::umask(022);
+    ::umask(current);
+    return current;
+}();
 
 // A folder opened for use as the base of relative names.
 int OpenFolder(const fs::path& folder) {
@@ -224,7 +223,7 @@ namespace {
 // times.
 void TakeModeAndTimes(int out, const struct stat& st) {
     const mode_t mode = st.st_mode & 0777;
-    if (((mode | S_IRUSR | S_IWUSR) & ~CreationMask()) != mode) {
+    if (((mode | S_IRUSR | S_IWUSR) & ~kCreationMask) != mode) {
         ::fchmod(out, mode);
     }
     const struct timespec times[2] = {st.st_atim, st.st_mtim};
@@ -232,13 +231,18 @@ void TakeModeAndTimes(int out, const struct stat& st) {
 }
 
 // Gives the unnamed file `fd` the name `targetName` in the folder `dirFd`. Linking by descriptor
-// needs a privilege on older kernels; the descriptor's entry under /proc does not.
+// needs a privilege on kernels before 6.10; the descriptor's entry under /proc does not. Once
+// refused, the process goes to /proc straight away.
 bool LinkUnnamed(int fd, int dirFd, const std::string& targetName) {
-    if (::linkat(fd, "", dirFd, targetName.c_str(), AT_EMPTY_PATH) == 0) {
-        return true;
-    }
-    if (errno != EPERM && errno != ENOENT) {
-        return false;
+    static std::atomic<bool> byDescriptor{true};
+    if (byDescriptor.load(std::memory_order_relaxed)) {
+        if (::linkat(fd, "", dirFd, targetName.c_str(), AT_EMPTY_PATH) == 0) {
+            return true;
+        }
+        if (errno != EPERM && errno != ENOENT) {
+            return false;
+        }
+        byDescriptor.store(false, std::memory_order_relaxed);
     }
     const std::string self = "/proc/self/fd/" + std::to_string(fd);
     return ::linkat(AT_FDCWD, self.c_str(), dirFd, targetName.c_str(), AT_SYMLINK_FOLLOW) == 0;
@@ -273,30 +277,35 @@ NewFile CopyIntoNew(int in, const struct stat& st, int dirFd, const std::string&
 // and the file system allows (cleared where it does not, so that later files skip the attempt),
 // else through a temporary file renamed over the target.
 Status CopyInto(int in, const struct stat& st, int dirFd, const std::string& targetName,
-                const fs::path& target, bool* targetIsNew) {
+                const fs::path& targetFolder, bool* targetIsNew) {
+    // The target's path is made for messages only.
+    const auto fail = [&](const char* what) {
+        const int error = errno;
+        return Failure(what, targetFolder / targetName, error);
+    };
     if (targetIsNew && *targetIsNew) {
         switch (CopyIntoNew(in, st, dirFd, targetName)) {
             case NewFile::Written:
                 return Status::Ok();
             case NewFile::Failed:
-                return Failure("cannot copy to", target, errno);
+                return fail("cannot copy to");
             case NewFile::Unsupported:
                 *targetIsNew = false;
                 if (::lseek(in, 0, SEEK_SET) != 0) {
-                    return Failure("cannot read", target, errno);
+                    return fail("cannot read");
                 }
                 break;
         }
     }
     TempFile temp(dirFd, targetName, (st.st_mode & 0777) | S_IRUSR | S_IWUSR);
     if (!temp.valid()) {
-        return Failure("cannot write", target, errno);
+        return fail("cannot write");
     }
     if (!CopyContent(in, temp.fd(), st.st_size)) {
-        return Failure("cannot copy to", target, errno);
+        return fail("cannot copy to");
     }
     TakeModeAndTimes(temp.fd(), st);
-    return temp.CommitAs(targetName, target);
+    return temp.CommitAs(targetName, targetFolder / targetName);
 }
 
 bool SameSizeAndTime(const struct stat& source, const struct stat& target) {
@@ -323,7 +332,8 @@ Status ReplaceFile(const fs::path& source, const fs::path& target) {
     if (folder.get() < 0) {
         return Failure("cannot write", target, errno);
     }
-    return CopyInto(in.get(), st, folder.get(), target.filename().string(), target, nullptr);
+    return CopyInto(in.get(), st, folder.get(), target.filename().string(), target.parent_path(),
+                    nullptr);
 }
 
 FolderCopy::FolderCopy(const fs::path& sourceFolder, const fs::path& targetFolder)
@@ -350,26 +360,32 @@ Status FolderCopy::Copy(const std::string& sourceName, const std::string& target
         return Failure("cannot write", target_, errno);
     }
     struct stat st {};
-    if (::fstatat(sourceFd_, sourceName.c_str(), &st, 0) != 0) {
+    Fd in;
+    if (targetMayExist) {
+        // Compare by name first, so that an up-to-date target costs no open.
+        struct stat existing {};
+        if (::fstatat(sourceFd_, sourceName.c_str(), &st, 0) != 0) {
+            return Failure("cannot read", source_ / sourceName, errno);
+        }
+        if (S_ISREG(st.st_mode) && ::fstatat(targetFd_, targetName.c_str(), &existing, 0) == 0 &&
+            SameSizeAndTime(st, existing)) {
+            return Status::Ok();
+        }
+    }
+    // Not blocking, so that a pipe among the sources does not hang the open.
+    in.Reset(::openat(sourceFd_, sourceName.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
+    if (!in.valid() || ::fstat(in.get(), &st) != 0) {
         return Failure("cannot read", source_ / sourceName, errno);
     }
     if (!S_ISREG(st.st_mode)) {
         return Status::Fail("not a file: " + (source_ / sourceName).string());
     }
-    struct stat existing {};
-    if (targetMayExist && ::fstatat(targetFd_, targetName.c_str(), &existing, 0) == 0 &&
-        SameSizeAndTime(st, existing)) {
-        return Status::Ok();
-    }
-    Fd in(::openat(sourceFd_, sourceName.c_str(), O_RDONLY | O_CLOEXEC));
-    if (in.get() < 0) {
-        return Failure("cannot read", source_ / sourceName, errno);
-    }
     *copied = true;
-    bool targetIsNew = !targetMayExist && unnamedFiles_;
-    Status status =
-        CopyInto(in.get(), st, targetFd_, targetName, target_ / targetName, &targetIsNew);
-    unnamedFiles_ = unnamedFiles_ && (targetIsNew || targetMayExist);
+    bool targetIsNew = !targetMayExist && unnamedFiles_.load(std::memory_order_relaxed);
+    Status status = CopyInto(in.get(), st, targetFd_, targetName, target_, &targetIsNew);
+    if (!targetIsNew && !targetMayExist) {
+        unnamedFiles_.store(false, std::memory_order_relaxed);
+    }
     return status;
 }
 

@@ -1,6 +1,9 @@
 #include "engine/apply.h"
 
 #include <gtest/gtest.h>
+#ifndef _WIN32
+#include <sys/stat.h>
+#endif
 
 #include <algorithm>
 
@@ -155,6 +158,34 @@ TEST(MergeCopy, FailsOnAMissingSourceAndFindsTheSourceInAnyCase) {
     EXPECT_EQ(ReadText(dir / "dst/sub/a.dds"), "a");
     EXPECT_EQ(count.copied, 1);
     EXPECT_EQ(std::distance(fs::directory_iterator(dir / "dst/sub"), {}), 1);
+}
+
+// A large folder is copied several files at once; the outcome is the same as one at a time.
+TEST(MergeCopy, LargeFolderIsCopiedWholeAndItsFirstFailureInNameOrderIsReported) {
+    TempDir dir;
+    for (int i = 0; i < 200; ++i) {
+        WriteFile(dir / "src" / ("tex_" + std::to_string(1000 + i) + ".dds"), std::to_string(i));
+    }
+    WriteFile(dir / "dst/TEX_1007.DDS", "old");  // kept in its own spelling
+    CopyCount count;
+    ASSERT_TRUE(MergeCopy(dir / "src", dir / "dst", &count).ok());
+    EXPECT_EQ(count.copied, 200);
+    EXPECT_EQ(ReadText(dir / "dst/TEX_1007.DDS"), "7");
+    EXPECT_EQ(ReadText(dir / "dst/tex_1199.dds"), "199");
+    EXPECT_EQ(std::distance(fs::directory_iterator(dir / "dst"), {}), 200);
+    count = {};
+    ASSERT_TRUE(MergeCopy(dir / "src", dir / "dst", &count).ok());
+    EXPECT_EQ(count.upToDate, 200);
+
+#ifndef _WIN32
+    // Pipes are no files to copy: the run stops, naming the first of them.
+    for (const char* pipe : {"tex_1170.dds", "tex_1050.dds"}) {
+        fs::remove(dir / "src" / pipe);
+        ASSERT_EQ(::mkfifo((dir / "src" / pipe).c_str(), 0644), 0);
+    }
+    const Status failed = MergeCopy(dir / "src", dir / "fresh");
+    EXPECT_NE(failed.reason().find("tex_1050.dds"), std::string::npos) << failed.reason();
+#endif
 }
 
 TEST(MakeFolder, FailsWhenTheFolderExistsInAnyCaseOrItsParentIsMissing) {

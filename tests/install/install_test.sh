@@ -47,6 +47,12 @@ echo mine > "$user/sound.wav"
 XDG_DATA_HOME=$work/xdg "$stage/usr/bin/kickvane" plan > "$work/plan2.log"
 [ -e "$work/xdg/kickvane/sound.wav" ] || fail "XDG_DATA_HOME not used"
 
+# The window's code is loaded from the installed module, and only for the window's commands.
+QT_QPA_PLATFORM=offscreen "$stage/usr/bin/kickvane" skin-gallery "$work/gallery.png" 2> "$work/gallery.log" ||
+  fail "the installed window module does not load: $(cat "$work/gallery.log")"
+[ -s "$work/gallery.png" ] || fail "no gallery drawn"
+! readelf -d "$stage/usr/bin/kickvane" | grep -q 'libQt6' || fail "the program itself needs Qt"
+
 # --tool-folder wins and seeds nothing.
 export HOME=$work/home2
 mkdir -p "$HOME" "$work/mine"
@@ -60,8 +66,10 @@ deb=$(ls "$work"/packages/*.deb)
 dpkg-deb -f "$deb" Depends | grep -q 'libqt6widgets6' || fail "the .deb declares no Qt dependency"
 dpkg-deb -c "$deb" > "$work/deb.list"
 grep -q '\./usr/bin/kickvane$' "$work/deb.list" || fail "the .deb has no program"
+grep -q '/kickvane/kickvane-window\.so$' "$work/deb.list" || fail "the .deb has no window module"
 grep -q '\./usr/share/applications/kickvane.desktop$' "$work/deb.list" || fail "the .deb has no desktop entry"
 tar tzf "$work"/packages/*.tar.gz > "$work/tgz.list"
 grep -q '^kickvane-[^/]*/kickvane$' "$work/tgz.list" || fail "the .tar.gz has no program at its top"
+grep -q '^kickvane-[^/]*/kickvane-window\.so$' "$work/tgz.list" || fail "the .tar.gz has no window module beside the program"
 grep -q '^kickvane-[^/]*/data/data2/' "$work/tgz.list" || fail "the .tar.gz has no sets beside the program"
 echo "install test passed"
