@@ -18,11 +18,10 @@ using Kind = RecordingSurface::Kind;
 
 TEST(PaintNineTest, PaintNine_SmoothsAndCopiesNinePieces_CornersUnscaledSidesStretched) {
     const QImage button(43, 330, QImage::Format_RGB32);
-    const Frame frame = FrameOf(button, 5, 2);
-    EXPECT_EQ(frame.top, 132);
-    EXPECT_EQ(frame.height, 66);
-    RecordingSurface dc;
-    ASSERT_TRUE(PaintNine(dc, button, Margins{3, 3, 3, 3}, Rect{10, 10, 110, 40}, frame).ok());
+    RecordingSurface dc;  // frame 2 of 5, each 66 high
+    ASSERT_TRUE(
+        PaintNine(dc, button, Margins{3, 3, 3, 3}, Rect{10, 10, 110, 40}, FrameOf(button, 5, 2))
+            .ok());
 
     ASSERT_EQ(dc.calls.size(), 10u);
     EXPECT_EQ(dc.calls[0].mode, StretchMode::Halftone);
