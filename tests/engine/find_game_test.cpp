@@ -22,23 +22,21 @@ std::vector<std::string> SourcesOf(const FindOutcome& outcome) {
     return sources;
 }
 
-// Every file under `root` with its contents and time, to prove that nothing was written.
+// Every entry under `root` with the size and time of its files, to prove that nothing was written.
 std::map<fs::path, std::string> Snapshot(const fs::path& root) {
-    std::map<fs::path, std::string> files;
+    std::map<fs::path, std::string> entries;
     for (auto it = fs::recursive_directory_iterator(root); it != fs::recursive_directory_iterator();
          ++it) {
         if (it->is_symlink()) {
             it.disable_recursion_pending();
-        } else if (it->is_regular_file()) {
-            const bool small = it->file_size() < (1u << 20);
-            files[it->path()] = (small ? testing::ReadText(it->path()) : "") + "@" +
-                                std::to_string(it->file_size()) + "@" +
-                                std::to_string(it->last_write_time().time_since_epoch().count());
-        } else {
-            files[it->path()] = "folder";
         }
+        entries[it->path()] =
+            it->is_regular_file() && !it->is_symlink()
+                ? std::to_string(it->file_size()) + "@" +
+                      std::to_string(it->last_write_time().time_since_epoch().count())
+                : "";
     }
-    return files;
+    return entries;
 }
 
 // One fake home with a game in every kind of place, and broken files among them.
@@ -143,17 +141,6 @@ TEST_F(FindGameTest, LimitsAndCancellationEndTheSearchEarly) {
     const FindOutcome cancelled = FindGame(home_.folders(), SearchLimits{}, &cancel);
     EXPECT_TRUE(cancelled.cancelled);
     EXPECT_TRUE(cancelled.games.empty());
-}
-
-TEST(FindGame, NothingFoundSaysWhereItLooked) {
-    FakeHome home;
-    const FindOutcome outcome = FindGame(home.folders(), SearchLimits{});
-    EXPECT_TRUE(outcome.games.empty());
-    const std::string looked = ::testing::PrintToString(outcome.looked);
-    for (const char* place : {".wine", "lutris/games", "bottles/bottles", "heroic",
-                              ".PlayOnLinux/wineprefix", "applications/wine"}) {
-        EXPECT_NE(looked.find(place), std::string::npos) << place;
-    }
 }
 
 TEST(SearchTreeForFile, MatchesAnyCase_SkipsLinksAndTheWindowsFolder_AndStopsAtTheDepth) {
