@@ -5,15 +5,13 @@
 namespace kickvane::engine {
 namespace {
 
-TEST(ParseYamlSubset, ReadsLutrisAndBottlesShapes_WithQuotesListsCommentsAndBlockText) {
+TEST(ParseYamlSubset,
+     ReadsLutrisAndBottlesShapes_WithQuotesListsCommentsAndBlockText_RefusesBinary) {
     const Parsed parsed = ParseYamlSubset(
         "game:\n"
         "  exe: /home/u/Games/fifa/drive_c/FIFA Online 2/Gameloader.exe  # the launcher\n"
         "  prefix: '/home/u/Games/it''s here'\n"
         "  args: \"-a \\\"b\\\" \\u00e9\"\n"
-        "system:\n"
-        "  env:\n"
-        "    DXVK_HUD: fps\n"
         "script: |\n"
         "  not: a key\n"
         "  - nor an item\n"
@@ -29,16 +27,14 @@ TEST(ParseYamlSubset, ReadsLutrisAndBottlesShapes_WithQuotesListsCommentsAndBloc
     EXPECT_EQ(v.Find("game.exe"), "/home/u/Games/fifa/drive_c/FIFA Online 2/Gameloader.exe");
     EXPECT_EQ(v.Find("game.prefix"), "/home/u/Games/it's here");
     EXPECT_EQ(v.Find("game.args"), "-a \"b\" \xC3\xA9");
-    EXPECT_EQ(v.Find("system.env.DXVK_HUD"), "fps");
     EXPECT_EQ(v.Find("External_Programs.6f0c.path"), "/b/Gameloader.exe");
     EXPECT_EQ(v.Find("items.0"), "one");
     EXPECT_EQ(v.Find("items.1.name"), "two");
     EXPECT_EQ(v.Find("url"), "http://x/#no-comment");
     EXPECT_FALSE(v.Find("script.not"));
     EXPECT_FALSE(v.Find("not"));
-}
 
-TEST(ParseYamlSubset, BinaryOrKeylessTextIsMalformed) {
+    // Binary or keyless text is malformed.
     EXPECT_FALSE(ParseYamlSubset(std::string("game:\n  exe: a\0b\n", 16)).ok());
     EXPECT_FALSE(ParseYamlSubset("just some words\nand more\n").ok());
     EXPECT_TRUE(ParseYamlSubset("").ok());

