@@ -131,7 +131,7 @@ TEST_F(ApplyTest, PitchVariantEndsWithTheBaseSetsDirtAndLines) {
 }
 
 // A missing parent of the target fails the copy too; the failed steps above show that.
-TEST(MergeCopy, FailsOnAMissingSourceAndFindsTheSourceInAnyCase) {
+TEST(FileSteps, MergeCopyFindsItsSourceInAnyCase_MakeFolderNeedsAParentAndNoFolderOfThatName) {
     TempDir dir;
     WriteFile(dir / "src/sub/a.dds", "a");
     EXPECT_FALSE(MergeCopy(dir / "missing", dir / "dst").ok());
@@ -148,10 +148,8 @@ TEST(MergeCopy, FailsOnAMissingSourceAndFindsTheSourceInAnyCase) {
     EXPECT_EQ(ReadText(dir / "dst/sub/a.dds"), "a");
     EXPECT_EQ(count.copied, 1);
     EXPECT_EQ(std::distance(fs::directory_iterator(dir / "dst/sub"), {}), 1);
-}
 
-TEST(MakeFolder, FailsWhenTheFolderExistsInAnyCaseOrItsParentIsMissing) {
-    TempDir dir;
+    // A folder is made only where none exists in any case and its parent does.
     fs::create_directories(dir / "Teams");
     EXPECT_FALSE(MakeFolder(dir / "teams").ok());
     EXPECT_FALSE(MakeFolder(dir / "b/c").ok());
