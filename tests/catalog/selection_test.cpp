@@ -5,17 +5,6 @@
 namespace kickvane::catalog {
 namespace {
 
-TEST(PatchSelection, DefaultsTurnOnAllButCrowdAndStadiumsAndChooseInEveryGroup) {
-    const PatchSelection defaults = PatchSelection::Defaults();
-    for (int i = 0; i < kCategoryCount; ++i) {
-        EXPECT_EQ(defaults.isOn(i), i < 12) << i;
-    }
-    for (const VariantGroup& group : Groups()) {
-        EXPECT_TRUE(defaults.chosen(group.id).has_value());
-        EXPECT_FALSE(PatchSelection().chosen(group.id).has_value());  // before a load
-    }
-}
-
 TEST(PatchSelection, ChoosingClearsOnlyTheOtherVariantsOfTheSameContainer) {
     PatchSelection selection = PatchSelection::Defaults();
     // Adboard, pitch and mark share one row but sit in separate containers.
@@ -38,24 +27,7 @@ TEST(PatchSelection, ChoosingClearsOnlyTheOtherVariantsOfTheSameContainer) {
     EXPECT_EQ(selection.chosen(GroupId::Ball), 1);
 }
 
-TEST(PatchSelection, CategoryIsOnOnlyForSwitchValueOne) {
-    PatchSelection selection;
-    for (int value : {1, 2, -1}) {
-        selection.setSwitchValue(3, value);
-        EXPECT_EQ(selection.isOn(3), value == 1);
-        EXPECT_EQ(selection.switchValue(3), value);
-    }
-}
-
-}  // namespace
-}  // namespace kickvane::catalog
-
-namespace kickvane::catalog {
-namespace {
-
 TEST(Catalog, LooksUpEntriesByKeyWithinTheirSection) {
-    EXPECT_EQ(FindCategory("CDV")->switchIndex, 12);
-    EXPECT_EQ(FindOption("Khac", "CoCaro")->index, 5);
     // "MacDinh" is a key of two sections; each lookup finds its own.
     EXPECT_EQ(FindOption("Bong", "MacDinh")->isDefault, false);
     EXPECT_EQ(FindOption("Bang Ti So", "MacDinh")->isDefault, true);

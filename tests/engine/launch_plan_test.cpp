@@ -146,47 +146,39 @@ TEST(PlanLaunch, MissingLauncherOrWineIsSaid_AndANativeLauncherRunsDirectly) {
     EXPECT_EQ(native.plan.description, "directly");
 }
 
+// The system install (bin/ and share/kickvane) is the install test's.
 TEST(ToolFolder, PortableWhenWritable_ElseUserFolderSeededOnceWithoutOverwriting) {
     FakeHome home;
     const fs::path portable = home / "portable";
-    WriteFile(portable / "data/data2/ball/ball.dds", "ball");
-    WriteFile(portable / "sound.wav", "RIFF");
     const fs::path user = home / ".local/share";
-    auto writable = [](const fs::path&) { return true; };
-    auto readOnly = [](const fs::path&) { return false; };
-    EXPECT_EQ(ChooseToolFolder(portable, user, writable).folder, portable);
-    EXPECT_TRUE(ChooseToolFolder(portable, user, writable).seedFrom.empty());
-    EXPECT_EQ(ChooseToolFolder(portable, user, readOnly).folder, user / "kickvane");
-    EXPECT_EQ(ChooseToolFolder(portable, user, readOnly).seedFrom, portable);
-
-    // A system install: the program in bin/, its sets in share/kickvane.
-    const fs::path installed = home / "usr/share/kickvane";
-    WriteFile(installed / "data/data2/ball/ball.dds", "ball");
-    WriteFile(installed / "skin/skin1/a.jpg", "skin");
-    WriteFile(installed / "sound.wav", "RIFF");
-    fs::create_directories(home / "usr/bin");
-    const ToolFolderChoice system = ChooseToolFolder(home / "usr/bin", user, writable);
-    EXPECT_EQ(system.folder, user / "kickvane");
-    EXPECT_EQ(system.seedFrom, installed);
-    // Neither layout: the program's own folder, as before.
-    EXPECT_EQ(ChooseToolFolder(home / "bare", user).folder, home / "bare");
+    const fs::path seeded = user / "kickvane";
+    WriteFile(portable / "data/data2/ball/ball.dds", "ball");
+    WriteFile(portable / "skin/skin1/a.jpg", "skin");
+    WriteFile(portable / "sound.wav", "RIFF");
+    const ToolFolderChoice writable =
+        ChooseToolFolder(portable, user, [](const fs::path&) { return true; });
+    EXPECT_EQ(writable.folder, portable);
+    EXPECT_TRUE(writable.seedFrom.empty());
+    const ToolFolderChoice readOnly =
+        ChooseToolFolder(portable, user, [](const fs::path&) { return false; });
+    EXPECT_EQ(readOnly.folder, seeded);
+    EXPECT_EQ(readOnly.seedFrom, portable);
+    EXPECT_EQ(ChooseToolFolder(home / "bare", user).folder, home / "bare");  // neither layout
 
     // The user changed a file before the first seeding ended; it is kept. Once seeded, nothing
     // is copied again, not even files the user removed.
-    WriteFile(user / "kickvane/sound.wav", "mine");
-    ASSERT_TRUE(SeedToolFolder(installed, user / "kickvane").ok());
-    EXPECT_EQ(testing::ReadText(user / "kickvane/data/data2/ball/ball.dds"), "ball");
-    EXPECT_EQ(testing::ReadText(user / "kickvane/skin/skin1/a.jpg"), "skin");
-    EXPECT_EQ(testing::ReadText(user / "kickvane/sound.wav"), "mine");
-    fs::remove(user / "kickvane/skin/skin1/a.jpg");
-    WriteFile(installed / "data/data2/ball/ball.dds", "new ball");
-    ASSERT_TRUE(SeedToolFolder(installed, user / "kickvane").ok());
-    EXPECT_FALSE(fs::exists(user / "kickvane/skin/skin1/a.jpg"));
-    EXPECT_EQ(testing::ReadText(user / "kickvane/data/data2/ball/ball.dds"), "ball");
+    WriteFile(seeded / "sound.wav", "mine");
+    ASSERT_TRUE(SeedToolFolder(portable, seeded).ok());
+    EXPECT_EQ(testing::ReadText(seeded / "skin/skin1/a.jpg"), "skin");
+    EXPECT_EQ(testing::ReadText(seeded / "sound.wav"), "mine");
+    fs::remove(seeded / "skin/skin1/a.jpg");
+    WriteFile(portable / "data/data2/ball/ball.dds", "new ball");
+    ASSERT_TRUE(SeedToolFolder(portable, seeded).ok());
+    EXPECT_FALSE(fs::exists(seeded / "skin/skin1/a.jpg"));
+    EXPECT_EQ(testing::ReadText(seeded / "data/data2/ball/ball.dds"), "ball");
 
-    // A folder that cannot be created is a failure with a reason.
-    WriteFile(home / "file", "x");
-    EXPECT_FALSE(SeedToolFolder(installed, home / "file/kickvane").ok());
+    WriteFile(home / "file", "x");  // a folder that cannot be created
+    EXPECT_FALSE(SeedToolFolder(portable, home / "file/kickvane").ok());
 }
 
 }  // namespace

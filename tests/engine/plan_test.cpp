@@ -61,28 +61,5 @@ TEST(BuildPlan, VariantStepsComeBeforeTheFixedStepsAndAGroupWithoutChoiceHasOnly
             "merge ToolZDataRoot\\pitch -> ZDataRoot\\pitch"}));
 }
 
-TEST(BuildPlan, EachOptionCopiesTheSetItsCatalogRowNamesAndOnlyTheDefaultsTheBaseSet) {
-    for (const catalog::VariantGroup& group : catalog::Groups()) {
-        for (const catalog::PatchOption& option : group.options) {
-            EXPECT_EQ(option.sourceFolder.empty(), option.key.ends_with("MacDinh")) << option.key;
-            PatchSelection selection = OnlyCategory(group.ownerSwitch);
-            selection.setOptionValue(group.array, option.index, true);
-            const std::vector<PlanStep> steps = BuildPlan(selection);
-            ASSERT_FALSE(steps.empty()) << option.key;
-            const Location& source = steps.front().source;
-            EXPECT_EQ(source.root == Root::Extras, !option.sourceFolder.empty()) << option.key;
-            EXPECT_TRUE(source.root != Root::Extras ||
-                        source.relative.starts_with(option.sourceFolder))
-                << option.key;
-        }
-    }
-}
-
-TEST(BuildPlan, InterfaceStepsRunOnlyWhenTheirSourceExists) {
-    for (const PlanStep& step : BuildPlan(OnlyCategory(3))) {
-        EXPECT_EQ(step.guard, StepGuard::IfSourceFolderExists) << engine::Describe(step);
-    }
-}
-
 }  // namespace
 }  // namespace kickvane::engine

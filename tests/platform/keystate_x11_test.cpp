@@ -11,7 +11,6 @@
 #include "platform/keystate.h"
 #include "platform/process.h"
 #include "platform/scoped_env.h"
-#include "platform/wait_until.h"
 #include "support/x_server.h"
 
 // Xlib last: its macros (Status, None, Bool) would clash with the project's names.
@@ -21,7 +20,7 @@ namespace kickvane::platform {
 namespace {
 
 using testing::ScopedEnv;
-using testing::WaitUntil;
+using testing::WaitFor;
 using testing::XServer;
 
 constexpr int kF7 = 0x76;
@@ -52,7 +51,7 @@ protected:
     // the first sample that sees the press.
     KeySample SampleUntilPressed() {
         KeySample sample;
-        WaitUntil([&] { return (sample = sampler_->Sample(kF7)).pressedSinceLast; });
+        WaitFor([&] { return (sample = sampler_->Sample(kF7)).pressedSinceLast; });
         return sample;
     }
 
@@ -81,7 +80,7 @@ TEST_F(KeySamplerX11Test, ReportsDown_WhileKeyIsHeld) {
     EXPECT_TRUE(sampler_->Sample(kF7).down);  // still held on the next sample
 
     Xdotool("keyup");
-    WaitUntil([&] { return !sampler_->Sample(kF7).down; });
+    WaitFor([&] { return !sampler_->Sample(kF7).down; });
     EXPECT_FALSE(sampler_->Sample(kF7).any());
 }
 
@@ -94,7 +93,7 @@ TEST_F(KeySamplerX11Test, SeesPress_WhileAnotherProgramGrabsTheKeyboard) {
     XSelectInput(game, window, KeyPressMask);
     XMapRaised(game, window);
     XSync(game, False);
-    ASSERT_TRUE(WaitUntil([&] {
+    ASSERT_TRUE(WaitFor([&] {
         return XGrabKeyboard(game, window, False, GrabModeAsync, GrabModeAsync, CurrentTime) ==
                GrabSuccess;
     }));
@@ -103,7 +102,7 @@ TEST_F(KeySamplerX11Test, SeesPress_WhileAnotherProgramGrabsTheKeyboard) {
     Xdotool("key");
     EXPECT_TRUE(SampleUntilPressed().pressedSinceLast);
     XEvent event;
-    EXPECT_TRUE(WaitUntil([&] { return XCheckTypedWindowEvent(game, window, KeyPress, &event); }))
+    EXPECT_TRUE(WaitFor([&] { return XCheckTypedWindowEvent(game, window, KeyPress, &event); }))
         << "the grabbing program received the key as well";
     XCloseDisplay(game);
 }

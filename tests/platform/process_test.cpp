@@ -8,7 +8,7 @@
 
 #include "platform/filesystem.h"
 #include "platform/scoped_env.h"
-#include "platform/wait_until.h"
+#include "support/process.h"
 #include "support/temp_dir.h"
 
 namespace kickvane::platform {
@@ -18,7 +18,7 @@ namespace fs = std::filesystem;
 using testing::ReadText;
 using testing::ScopedEnv;
 using testing::TempDir;
-using testing::WaitUntil;
+using testing::WaitFor;
 using testing::WriteFile;
 
 void WriteExecutable(const fs::path& path, std::string_view content) {
@@ -29,14 +29,19 @@ void WriteExecutable(const fs::path& path, std::string_view content) {
 TEST(StartDetached, RunsProgramInWorkingFolder_WithArgumentsUntouchedByAShell_AndLeavesNoChild) {
     TempDir dir;
     fs::create_directories(dir / "game");
+    const ScopedEnv kept("KICKVANE_TEST_KEPT", "kept");
+    const ScopedEnv replaced("WINEPREFIX", "/old/prefix");
     // The report is written beside and renamed into place, so a file that exists is whole.
     WriteExecutable(dir / "tools/launcher.sh",
                     "#!/bin/sh\n"
-                    "{ pwd; printf '%s\\n' \"$#\" \"$@\"; cat; echo end; } > report.tmp\n"
+                    "{ pwd; printf '%s\\n' \"$#\" \"$@\"; cat; echo "
+                    "\"$KICKVANE_TEST_KEPT|$WINEPREFIX|$WINEARCH\"; "
+                    "} > report.tmp\n"
                     "mv report.tmp report.txt\n");
 
-    const Status started = StartDetached(dir / "tools/launcher.sh",
-                                         {"two words", "$(touch injected)", ""}, dir / "game");
+    const Status started =
+        StartDetached(dir / "tools/launcher.sh", {"two words", "$(touch injected)", ""},
+                      dir / "game", false, {{"WINEPREFIX", "/new prefix"}, {"WINEARCH", "win32"}});
     ASSERT_TRUE(started.ok()) << started.reason();
     // The tool keeps no child: the middle process is reaped and the program is not ours.
     errno = 0;
@@ -44,11 +49,16 @@ TEST(StartDetached, RunsProgramInWorkingFolder_WithArgumentsUntouchedByAShell_An
     EXPECT_EQ(errno, ECHILD);
 
     ASSERT_TRUE(
-        WaitUntil([&] { return fs::exists(dir / "game/report.txt"); }, std::chrono::seconds(30)));
-    // Standard input is empty (/dev/null), so `cat` ends at once and adds nothing.
+        WaitFor([&] { return fs::exists(dir / "game/report.txt"); }, std::chrono::seconds(30)));
+    // Standard input is empty (/dev/null), so `cat` ends at once and adds nothing. The variables
+    // are added or replaced for the program only.
     EXPECT_EQ(ReadText(dir / "game/report.txt"),
-              fs::canonical(dir / "game").string() + "\n3\ntwo words\n$(touch injected)\n\nend\n");
+              fs::canonical(dir / "game").string() +
+                  "\n3\ntwo words\n$(touch injected)\n\nkept|/new prefix|win32\n");
     EXPECT_FALSE(fs::exists(dir / "game/injected"));
+    EXPECT_EQ(GetEnv("WINEPREFIX"), "/old/prefix");
+    EXPECT_FALSE(
+        StartDetached(dir / "tools/launcher.sh", {}, dir.path(), false, {{"A=B", "x"}}).ok());
 }
 
 TEST(StartDetached, FailsWithReason_WhenProgramOrFolderCannotBeUsed) {
@@ -102,25 +112,6 @@ TEST(FindOnPath, FindsExecutablesInPathFolders_NeverInTheCurrentFolder) {
         EXPECT_TRUE(FindOnPath(name).empty()) << name;
     }
     fs::current_path(previous);
-}
-
-TEST(StartDetached, EnvironmentAdditionsReplaceOrAddVariables_AndLeaveTheRestAlone) {
-    TempDir dir;
-    const ScopedEnv kept("KICKVANE_TEST_KEPT", "kept");
-    const ScopedEnv replaced("WINEPREFIX", "/old/prefix");
-    WriteExecutable(
-        dir / "env.sh",
-        "#!/bin/sh\n"
-        "printf '%s|%s|%s\\n' \"$KICKVANE_TEST_KEPT\" \"$WINEPREFIX\" \"$WINEARCH\" > r.tmp\n"
-        "mv r.tmp r.txt\n");
-    const Status started = StartDetached(dir / "env.sh", {}, dir.path(), false,
-                                         {{"WINEPREFIX", "/new prefix"}, {"WINEARCH", "win32"}});
-    ASSERT_TRUE(started.ok()) << started.reason();
-    ASSERT_TRUE(WaitUntil([&] { return fs::exists(dir / "r.txt"); }, std::chrono::seconds(30)));
-    EXPECT_EQ(ReadText(dir / "r.txt"), "kept|/new prefix|win32\n");
-    EXPECT_EQ(GetEnv("WINEPREFIX"), "/old/prefix");  // the tool's own environment is unchanged
-
-    EXPECT_FALSE(StartDetached(dir / "env.sh", {}, dir.path(), false, {{"A=B", "x"}}).ok());
 }
 
 }  // namespace

@@ -47,28 +47,23 @@ protected:
     ScopedEnv xdgRuntime_{"XDG_RUNTIME_DIR", runtime_.path().string()};
 };
 
-TEST_F(SingleInstanceTest, RefusesSecondCopy_WhileFirstRuns_AndAllowsOneAfterIt) {
+TEST_F(SingleInstanceTest, RefusesSecondCopy_AndDeliversSentCommandsInOrderThroughADescriptor) {
     auto first = AcquireSingleInstance("kv-test");
     ASSERT_NE(first, nullptr);
     EXPECT_EQ(AcquireSingleInstance("kv-test"), nullptr);
     EXPECT_NE(AcquireSingleInstance("kv-other"), nullptr);  // another name, another use
-
-    first.reset();
-    EXPECT_NE(AcquireSingleInstance("kv-test"), nullptr);
-}
-
-TEST_F(SingleInstanceTest, DeliversSentCommandsInOrder_ThroughReadableDescriptor) {
-    auto running = AcquireSingleInstance("kv-test");
-    ASSERT_NE(running, nullptr);
-    EXPECT_EQ(running->TakeCommand(), std::nullopt);  // nothing waiting: returns at once
+    EXPECT_EQ(first->TakeCommand(), std::nullopt);          // nothing waiting: returns at once
 
     ASSERT_TRUE(SendToRunningInstance("show", "kv-test"));
     ASSERT_TRUE(SendToRunningInstance("trigger", "kv-test"));
-    pollfd readable{running->commandDescriptor(), POLLIN, 0};
+    pollfd readable{first->commandDescriptor(), POLLIN, 0};
     ASSERT_EQ(::poll(&readable, 1, 10000), 1);
-    EXPECT_EQ(running->TakeCommand(), "show");
-    EXPECT_EQ(running->TakeCommand(), "trigger");
-    EXPECT_EQ(running->TakeCommand(), std::nullopt);
+    EXPECT_EQ(first->TakeCommand(), "show");
+    EXPECT_EQ(first->TakeCommand(), "trigger");
+    EXPECT_EQ(first->TakeCommand(), std::nullopt);
+
+    first.reset();
+    EXPECT_NE(AcquireSingleInstance("kv-test"), nullptr);
 }
 
 TEST_F(SingleInstanceTest, SendFails_WhenNoCopyRuns_AndACopyThatDiedLeavesNothingStale) {

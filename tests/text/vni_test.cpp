@@ -13,11 +13,6 @@ std::string Convert(std::string_view text) {
     return VniToUnicodeUtf8(text);
 }
 
-TEST(Vni, ConvertsMessagesOfTheTool) {
-    EXPECT_EQ(Convert("U71ng du5ng d9ang cha5y ro62i ma2"), "Ứng dụng đang chạy rồi mà");
-    EXPECT_EQ(Convert("D9a4 co1 phie6n ba3n mo71i! "), "Đã có phiên bản mới! ");
-}
-
 // The shape marks (6, 7, 8, 9) are applied first, the tones after them; the letter a mark
 // produces is never the letter of a later digit in the same pass.
 TEST(Vni, AppliesShapesThenTones_AndADigitAfterAConvertedLetterStays) {
