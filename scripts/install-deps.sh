@@ -20,6 +20,9 @@ packages=(
   clang rsync
   # the Windows program: its tests run under Wine; the release is a zip
   wine wine64 zip
+  # DejaVu's math font: Wine shows the host's fonts, and Qt's last resort for a missing font is
+  # the first family by name, this one; the Wine test of the window's text boxes needs that case
+  fonts-dejavu-extra
 )
 
 missing=()

@@ -1,14 +1,17 @@
 #include "shell/run_window.h"
 
 #include <QApplication>
+#include <QFont>
 #include <QScreen>
 #include <QSocketNotifier>
 #include <QTimer>
 
 #include "platform/single_instance.h"
 #include "platform/sound.h"
+#include "popup/popup_model.h"
 #include "shell/main_window.h"
 #include "shell/message_box.h"
+#include "shell/qt_text.h"
 
 namespace kickvane::shell {
 
@@ -30,9 +33,31 @@ void CentreOnScreen(QWidget& window) {
 
 }  // namespace
 
+void UseReadableFonts() {
+    // A Wine prefix without Wine's own fonts has neither the system's dialog font ("MS Shell
+    // Dlg", which Wine maps to Tahoma) nor Tahoma. Qt then takes the first family by name, which
+    // can be DejaVu's math font: its Windows line height is four times its size, and line edits,
+    // which centre their text by that height, draw it above the box. Sans-serif families with
+    // Vietnamese letters stand in instead; where the named font exists they are never used.
+    const QStringList readable{QStringLiteral("Tahoma"),
+                               QStringLiteral("Segoe UI"),
+                               QStringLiteral("Microsoft Sans Serif"),
+                               QStringLiteral("Arial"),
+                               QStringLiteral("DejaVu Sans"),
+                               QStringLiteral("Liberation Sans"),
+                               QStringLiteral("Noto Sans")};
+    for (const QString& family :
+         {QApplication::font().family(), ToQString(popup::kPopupFontFamily)}) {
+        QStringList others = readable;
+        others.removeAll(family);
+        QFont::insertSubstitutions(family, others);
+    }
+}
+
 int RunWindow(int& argc, char** argv, const std::filesystem::path& toolFolder) {
     QApplication app(argc, argv);
     QApplication::setApplicationName(QStringLiteral("Kickvane"));
+    UseReadableFonts();
 
     const std::unique_ptr<platform::SingleInstance> instance = platform::AcquireSingleInstance();
     if (!instance) {

@@ -8,6 +8,10 @@ namespace kickvane::shell {
 // A second start while a copy runs shows a notice and ends without touching anything.
 int RunWindow(int& argc, char** argv, const std::filesystem::path& toolFolder);
 
+// Gives the fonts the interface asks for by name (the system's own and the popups' Tahoma)
+// readable stand-ins for systems that lack them. Called once the application exists.
+void UseReadableFonts();
+
 inline constexpr const char* kTriggerCommand = "trigger";
 
 }  // namespace kickvane::shell

@@ -1,18 +1,36 @@
 // The static Qt for Windows links what the program needs: https through Schannel for the update
-// host, and the JPEG and PNG readers for the skins and previews.
+// host, and the JPEG and PNG readers for the skins and previews. One application on the Windows
+// platform serves every test of this program, its fonts set up as the tool's are.
 #include <gtest/gtest.h>
 
-#include <QCoreApplication>
+#include <QApplication>
 #include <QImageReader>
 #include <QSslSocket>
+#include <memory>
+
+#include "shell/run_window.h"
 
 namespace {
 
+class QtApplication : public ::testing::Environment {
+public:
+    void SetUp() override {
+        app_ = std::make_unique<QApplication>(argc_, argv_);
+        kickvane::shell::UseReadableFonts();
+    }
+    void TearDown() override { app_.reset(); }
+
+private:
+    int argc_ = 1;
+    char name_[20] = "qt_windows_tests";
+    char* argv_[2] = {name_, nullptr};
+    std::unique_ptr<QApplication> app_;
+};
+
+[[maybe_unused]] ::testing::Environment* const kQtApplication =
+    ::testing::AddGlobalTestEnvironment(new QtApplication);
+
 TEST(QtForWindows, HasHttpsAndTheImageFormatsOfTheArtwork) {
-    int argc = 1;
-    char name[] = "qt_windows_tests";
-    char* argv[] = {name, nullptr};
-    QCoreApplication app(argc, argv);
     EXPECT_TRUE(QSslSocket::supportsSsl());
     EXPECT_EQ(QSslSocket::activeBackend(), QStringLiteral("schannel"));
     const QList<QByteArray> formats = QImageReader::supportedImageFormats();
