@@ -31,10 +31,13 @@ public:
     }
 
     // The name of the existing entry for `name` in any letter case, else `name` as given, and
-    // whether there was one.
-    std::pair<std::string, bool> Name(const std::string& name) const {
-        auto found = names_.find(platform::FoldCase(name));
+    // whether there was one; `folded` is FoldCase(name) where the caller has it already.
+    std::pair<std::string, bool> Name(const std::string& name, const std::string& folded) const {
+        auto found = names_.find(folded);
         return found == names_.end() ? std::pair{name, false} : std::pair{found->second, true};
+    }
+    std::pair<std::string, bool> Name(const std::string& name) const {
+        return Name(name, platform::FoldCase(name));
     }
 
 private:
@@ -70,19 +73,10 @@ unsigned CopyWorkers(size_t files) {
     return static_cast<unsigned>(std::clamp<size_t>(files / kFilesPerWorker, 1, cores));
 }
 
-// Whether two of the files would land on one name on a file system that ignores letter case;
-// those are copied one after the other, so that the last in name order wins as it always has.
-bool NamesCollide(const std::vector<FileJob>& jobs) {
-    std::unordered_set<std::string> folded;
-    folded.reserve(jobs.size());
-    return !std::all_of(jobs.begin(), jobs.end(), [&folded](const FileJob& job) {
-        return folded.insert(platform::FoldCase(job.targetName)).second;
-    });
-}
-
 // Copies the files of one folder, several at once where there are many. On a failure no further
 // file is started, and the failure of the first file in name order among those tried is returned.
-Status CopyFiles(platform::FolderCopy& files, const std::vector<FileJob>& jobs, CopyCount* count) {
+Status CopyFiles(platform::FolderCopy& files, const std::vector<FileJob>& jobs, bool oneByOne,
+                 CopyCount* count) {
     std::atomic<size_t> next{0};
     std::atomic<bool> stop{false};
     std::atomic<int> copied{0};
@@ -112,7 +106,7 @@ Status CopyFiles(platform::FolderCopy& files, const std::vector<FileJob>& jobs, 
         }
     };
     {
-        const unsigned workers = NamesCollide(jobs) ? 1 : CopyWorkers(jobs.size());
+        const unsigned workers = oneByOne ? 1 : CopyWorkers(jobs.size());
         std::vector<std::jthread> helpers;
         try {
             while (helpers.size() + 1 < workers) {
@@ -133,6 +127,10 @@ Status CopyFiles(platform::FolderCopy& files, const std::vector<FileJob>& jobs, 
 Status CopyTree(const fs::path& source, const fs::path& target, CopyCount* count) {
     std::vector<FileJob> jobs;
     std::vector<std::string> folders;
+    // Two files that would land on one name on a file system that ignores letter case are
+    // copied one after the other, so that the last in name order wins as it always has.
+    std::unordered_set<std::string> foldedNames;
+    bool namesCollide = false;
     std::error_code ec;
     const FolderIndex index(target);
     for (fs::directory_iterator it(source, ec), end; !ec && it != end; it.increment(ec)) {
@@ -140,10 +138,12 @@ Status CopyTree(const fs::path& source, const fs::path& target, CopyCount* count
         std::error_code typeError;
         if (it->is_directory(typeError)) {
             folders.push_back(std::move(name));
-        } else {
-            auto [targetName, exists] = index.Name(name);
-            jobs.push_back({std::move(name), std::move(targetName), exists});
+            continue;
         }
+        std::string folded = platform::FoldCase(name);
+        auto [targetName, exists] = index.Name(name, folded);
+        namesCollide = !foldedNames.insert(std::move(folded)).second || namesCollide;
+        jobs.push_back({std::move(name), std::move(targetName), exists});
     }
     if (ec) {
         return Status::Fail("cannot read folder " + source.string() + ": " + ec.message());
@@ -153,7 +153,7 @@ Status CopyTree(const fs::path& source, const fs::path& target, CopyCount* count
     std::sort(folders.begin(), folders.end());
     {
         platform::FolderCopy files(source, target);  // both folders opened once for all files
-        if (Status copied = CopyFiles(files, jobs, count); !copied) {
+        if (Status copied = CopyFiles(files, jobs, namesCollide, count); !copied) {
             return copied;
         }
     }
