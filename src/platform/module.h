@@ -6,16 +6,16 @@
 namespace kickvane::platform {
 
 // A shared library loaded at run time: a part of the program that only some of its commands need,
-// so that the others start without loading what it depends on. POSIX builds only.
+// so that the others start without loading what it depends on. POSIX builds only. The library
+// stays loaded for the rest of the process: what it registered with the libraries it uses (Qt's
+// types, say) may be looked at again while the process ends.
 class Module {
 public:
-    // Loads `file`; on failure `error()` says why.
+    // Loads `file`; on failure Find finds nothing and `error()` says why.
     explicit Module(const std::filesystem::path& file);
-    ~Module();
     Module(const Module&) = delete;
     Module& operator=(const Module&) = delete;
 
-    bool loaded() const { return handle_ != nullptr; }
     const std::string& error() const { return error_; }
 
     // The address of the exported symbol `name`, or null (with `error()` set).

@@ -21,13 +21,12 @@ Module::Module(const std::filesystem::path& file)
     }
 }
 
-// The module stays mapped: what it registered with the libraries it uses (Qt's types, say) may be
-// looked at again while the process ends.
-Module::~Module() = default;
-
 void* Module::Find(const char* name) {
+    if (!handle_) {
+        return nullptr;  // error_ keeps why the library did not load
+    }
     ::dlerror();
-    void* address = handle_ ? ::dlsym(handle_, name) : nullptr;
+    void* address = ::dlsym(handle_, name);
     if (!address) {
         error_ = LastError();
     }
