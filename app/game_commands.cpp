@@ -2,20 +2,21 @@
 #include <iostream>
 
 #include "commands.h"
-#include "engine/find_game.h"
-#include "engine/tool_folder.h"
+#include "game/find_game.h"
 #include "platform/filesystem.h"
 #include "session/session.h"
+#include "session/tool_folder.h"
 
 namespace kickvane::app {
 
 namespace fs = std::filesystem;
 
 fs::path DefaultToolFolder() {
-    const engine::ToolFolderChoice choice = engine::ChooseToolFolder(
-        platform::ProgramFolder(), engine::UserFolders::FromEnvironment().dataHome);
+    const session::ToolFolderChoice choice = session::ChooseToolFolder(
+        platform::ProgramFolder(), game::UserFolders::FromEnvironment().dataHome);
     if (!choice.seedFrom.empty()) {
-        if (const Status seeded = engine::SeedToolFolder(choice.seedFrom, choice.folder); !seeded) {
+        if (const Status seeded = session::SeedToolFolder(choice.seedFrom, choice.folder);
+            !seeded) {
             std::cerr << "kickvane: cannot set up " << choice.folder.string() << ": "
                       << seeded.reason() << '\n';
         }
@@ -55,9 +56,9 @@ int RunFindGame(Args args) {
         PrintUsage(std::cerr);
         return 2;
     }
-    const engine::FindOutcome outcome =
-        engine::FindGame(engine::UserFolders::FromEnvironment(), engine::SearchLimits{});
-    for (const engine::FoundGame& game : outcome.games) {
+    const game::FindOutcome outcome =
+        game::FindGame(game::UserFolders::FromEnvironment(), game::SearchLimits{});
+    for (const game::FoundGame& game : outcome.games) {
         std::cout << game.folder.string() << '\t' << game.source << '\n';
     }
     for (const std::string& skipped : outcome.skipped) {

@@ -13,7 +13,7 @@
 #include <string>
 #include <vector>
 
-#include "engine/find_game.h"
+#include "game/find_game.h"
 
 namespace {
 
@@ -59,14 +59,14 @@ int main(int argc, char** argv) {
     Touch(prefix / "drive_c/Games/Garena/FIFA Online 2/GameLoader.exe");
     std::ofstream(prefix / "system.reg") << "WINE REGISTRY Version 2\n#arch=win64\n";
 
-    const kickvane::engine::UserFolders folders{home, home / ".config", home / ".local/share", {}};
+    const kickvane::game::UserFolders folders{home, home / ".config", home / ".local/share", {}};
     std::vector<double> search;
     std::vector<double> find;
     size_t found = 0;
     bool cutShort = false;
     for (int round = 0; round < 5; ++round) {
         auto start = Clock::now();
-        const auto outcome = kickvane::engine::FindGame(folders, kickvane::engine::SearchLimits{});
+        const auto outcome = kickvane::game::FindGame(folders, kickvane::game::SearchLimits{});
         search.push_back(std::chrono::duration<double, std::milli>(Clock::now() - start).count());
         found = outcome.games.size();
         cutShort = outcome.cutShort;

@@ -11,9 +11,9 @@
 #include "catalog/settings.h"
 #include "engine/apply.h"
 #include "engine/hotkey_poll.h"
-#include "engine/launcher.h"
 #include "engine/plan.h"
 #include "engine/quick_load.h"
+#include "game/launcher.h"
 #include "text/message.h"
 
 // The tool's state and commands, free of any user interface. The window, the tray, the trigger
@@ -52,7 +52,7 @@ struct UpdateState {
 enum class LaunchFrom { Window, Tray };
 
 struct LaunchRun {
-    engine::LaunchOutcome launch;
+    game::LaunchOutcome launch;
     bool hideToTray = false;
     Outcome shown;
 };
@@ -70,7 +70,7 @@ struct QuickLoadRun {
     Outcome shown;
 };
 
-using Launcher = std::function<engine::LaunchOutcome(std::string_view gameFolder)>;
+using Launcher = std::function<game::LaunchOutcome(std::string_view gameFolder)>;
 
 class Session {
 public:
@@ -78,7 +78,7 @@ public:
     // null where there is none. `launch` starts the game's launcher.
     explicit Session(std::filesystem::path toolFolder,
                      std::unique_ptr<platform::KeySampler> keys = nullptr,
-                     Launcher launch = engine::LaunchGame);
+                     Launcher launch = game::LaunchGame);
 
     const std::filesystem::path& toolFolder() const { return toolFolder_; }
     const catalog::Settings& settings() const { return settings_; }

@@ -9,7 +9,7 @@
 #include <array>
 #include <filesystem>
 
-#include "engine/wine_prefix.h"
+#include "game/wine_prefix.h"
 #include "platform/filesystem.h"
 #include "shell/alert_popup.h"
 #include "shell/qt_text.h"
@@ -74,7 +74,7 @@ QString FolderDialogStart(const QString& wanted) {
         }
     }
     // Nothing typed yet: where Windows games live here, the Wine prefix's drive C.
-    const engine::UserFolders user = engine::UserFolders::FromEnvironment();
+    const game::UserFolders user = game::UserFolders::FromEnvironment();
     for (const fs::path& prefix :
          {user.winePrefix, user.home.empty() ? fs::path() : user.home / ".wine"}) {
         if (!prefix.empty() && platform::IsDirectory(prefix / "drive_c")) {

@@ -24,7 +24,7 @@ const QString kTitle = QStringLiteral("Tìm FIFA Online 2");
 const QString kCaption = QStringLiteral("Tì&m");
 
 // The list of several finds; the chosen folder goes into the box.
-void OpenChoice(QWidget* owner, QLineEdit* box, const std::vector<engine::FoundGame>& games) {
+void OpenChoice(QWidget* owner, QLineEdit* box, const std::vector<game::FoundGame>& games) {
     auto* dialog = new QDialog(owner);
     dialog->setAttribute(Qt::WA_DeleteOnClose);
     dialog->setWindowTitle(kTitle);
@@ -33,7 +33,7 @@ void OpenChoice(QWidget* owner, QLineEdit* box, const std::vector<engine::FoundG
         new QLabel(QStringLiteral("Tìm thấy nhiều bản FIFA Online 2. Chọn một:"), dialog));
     auto* list = new QListWidget(dialog);
     list->setAccessibleName(QStringLiteral("Các thư mục tìm thấy"));
-    for (const engine::FoundGame& game : games) {
+    for (const game::FoundGame& game : games) {
         auto* item = new QListWidgetItem(PathToQString(game.folder) + QStringLiteral("\n    ") +
                                          ToQString(game.source));
         item->setData(Qt::UserRole, PathToQString(game.folder));
@@ -57,7 +57,7 @@ void OpenChoice(QWidget* owner, QLineEdit* box, const std::vector<engine::FoundG
     dialog->open();
 }
 
-void OpenNothingFound(QWidget* owner, const engine::FindOutcome& outcome) {
+void OpenNothingFound(QWidget* owner, const game::FindOutcome& outcome) {
     QString text = QStringLiteral("Không tìm thấy Gameloader.exe.\n\nĐã tìm trong:");
     for (const std::string& place : outcome.looked) {
         text += QStringLiteral("\n  ") + ToQString(place);
@@ -75,8 +75,8 @@ void OpenNothingFound(QWidget* owner, const engine::FindOutcome& outcome) {
 
 }  // namespace
 
-GameFinderButton::GameFinderButton(QLineEdit* gameFolderBox, engine::UserFolders folders,
-                                   engine::SearchLimits limits)
+GameFinderButton::GameFinderButton(QLineEdit* gameFolderBox, game::UserFolders folders,
+                                   game::SearchLimits limits)
     : QPushButton(kCaption, gameFolderBox->parentWidget()),
       gameFolderBox_(gameFolderBox),
       folders_(std::move(folders)),
@@ -116,13 +116,13 @@ void GameFinderButton::start() {
     // result comes back to the window's thread through the event queue.
     worker_ = std::thread([this, folders = folders_, limits = limits_] {
         auto outcome =
-            std::make_shared<engine::FindOutcome>(engine::FindGame(folders, limits, &cancel_));
+            std::make_shared<game::FindOutcome>(game::FindGame(folders, limits, &cancel_));
         QMetaObject::invokeMethod(
             this, [this, outcome] { finish(*outcome); }, Qt::QueuedConnection);
     });
 }
 
-void GameFinderButton::finish(const engine::FindOutcome& outcome) {
+void GameFinderButton::finish(const game::FindOutcome& outcome) {
     finished_ = true;
     if (worker_.joinable()) {
         worker_.join();
@@ -141,7 +141,7 @@ void GameFinderButton::finish(const engine::FindOutcome& outcome) {
 }
 
 GameFinderButton* AddGameFinder(QLineEdit* gameFolderBox, QPushButton* browseButton) {
-    auto* button = new GameFinderButton(gameFolderBox, engine::UserFolders::FromEnvironment());
+    auto* button = new GameFinderButton(gameFolderBox, game::UserFolders::FromEnvironment());
     QRect box = gameFolderBox->geometry();
     box.setWidth(box.width() - kButtonWidth - kGap);
     gameFolderBox->setGeometry(box);

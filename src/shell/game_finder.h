@@ -4,7 +4,7 @@
 #include <atomic>
 #include <thread>
 
-#include "engine/find_game.h"
+#include "game/find_game.h"
 
 class QLineEdit;
 
@@ -16,8 +16,8 @@ namespace kickvane::shell {
 class GameFinderButton final : public QPushButton {
     Q_OBJECT
 public:
-    GameFinderButton(QLineEdit* gameFolderBox, engine::UserFolders folders,
-                     engine::SearchLimits limits = {});
+    GameFinderButton(QLineEdit* gameFolderBox, game::UserFolders folders,
+                     game::SearchLimits limits = {});
     ~GameFinderButton() override;
 
     bool searching() const { return worker_.joinable() && !finished_; }
@@ -28,12 +28,12 @@ signals:
 
 private:
     void start();
-    void finish(const engine::FindOutcome& outcome);
+    void finish(const game::FindOutcome& outcome);
     void stopWorker();
 
     QLineEdit* gameFolderBox_;
-    engine::UserFolders folders_;
-    engine::SearchLimits limits_;
+    game::UserFolders folders_;
+    game::SearchLimits limits_;
     std::thread worker_;
     std::atomic<bool> cancel_{false};
     bool finished_ = true;

@@ -5,7 +5,7 @@
 
 #include <cstdlib>
 
-#include "engine/fake_home.h"
+#include "game/fake_home.h"
 #include "platform/scoped_env.h"
 #include "support/process.h"
 #include "support/temp_dir.h"

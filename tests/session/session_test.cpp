@@ -22,7 +22,7 @@ protected:
                   "[Thiet lap]\r\nDuongDan=" + game().string() + "\r\nPhimTat=" + hotkey + "\r\n");
     }
 
-    std::unique_ptr<Session> Open(Launcher launch = engine::LaunchGame) {
+    std::unique_ptr<Session> Open(Launcher launch = game::LaunchGame) {
         auto keys = std::make_unique<FakeKeySampler>();
         keys_ = keys.get();
         return std::make_unique<Session>(tool(), std::move(keys), std::move(launch));
@@ -118,7 +118,7 @@ TEST_F(SessionTest, LaunchFromTheWindowHidesItAndFromTheTrayLeavesItAlone) {
     auto session = Open([&](std::string_view folder) {
         ++launches;
         EXPECT_EQ(folder, "C:\\Program Files");
-        return engine::LaunchOutcome{};
+        return game::LaunchOutcome{};
     });
     const LaunchRun fromWindow = session->Launch(LaunchFrom::Window);
     EXPECT_TRUE(fromWindow.hideToTray);

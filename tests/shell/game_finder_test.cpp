@@ -22,7 +22,7 @@ using testing::WriteFile;
 // A game folder box, and a home folder of its own.
 class GameFinderTest : public ::testing::Test {
 protected:
-    engine::UserFolders folders() const {
+    game::UserFolders folders() const {
         return {dir_ / "home", dir_ / "home/.config", dir_ / "home/.local/share", {}};
     }
 

@@ -19,11 +19,11 @@ protected:
         std::filesystem::create_directories(tool());
         auto keys = std::make_unique<FakeKeySampler>();
         keys_ = keys.get();
-        session::Launcher launch = engine::LaunchGame;
+        session::Launcher launch = game::LaunchGame;
         if (countLaunches_) {
             launch = [this](std::string_view) {
                 ++launches_;
-                return engine::LaunchOutcome{};
+                return game::LaunchOutcome{};
             };
         }
         sessions_.push_back(std::make_unique<session::Session>(folder.empty() ? tool() : folder,

@@ -5,9 +5,9 @@
 #include <string>
 #include <vector>
 
-#include "engine/wine_prefix.h"
+#include "game/wine_prefix.h"
 
-namespace kickvane::engine {
+namespace kickvane::game {
 
 // A folder that holds the game's launcher, and how it was found.
 struct FoundGame {
@@ -31,4 +31,4 @@ struct FindOutcome {
 FindOutcome FindGame(const UserFolders& folders, const SearchLimits& limits,
                      const std::atomic<bool>* cancel = nullptr);
 
-}  // namespace kickvane::engine
+}  // namespace kickvane::game

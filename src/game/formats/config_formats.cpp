@@ -1,4 +1,4 @@
-#include "engine/config_formats.h"
+#include "game/formats/config_formats.h"
 
 #include <fstream>
 #include <system_error>
@@ -6,7 +6,7 @@
 #include "platform/filesystem.h"
 #include "platform/text.h"
 
-namespace kickvane::engine {
+namespace kickvane::game {
 
 namespace fs = std::filesystem;
 
@@ -704,4 +704,4 @@ std::string DesktopEntryValue(std::string_view text, std::string_view key) {
     return {};
 }
 
-}  // namespace kickvane::engine
+}  // namespace kickvane::game

@@ -1,13 +1,13 @@
-#include "engine/game_managers.h"
+#include "game/game_managers.h"
 
 #include <algorithm>
 #include <set>
 #include <system_error>
 
-#include "engine/config_formats.h"
+#include "game/formats/config_formats.h"
 #include "platform/filesystem.h"
 
-namespace kickvane::engine {
+namespace kickvane::game {
 
 namespace {
 
@@ -390,4 +390,4 @@ ManagerScan ScanGameManagers(const UserFolders& folders) {
     return Scanner(folders).Run();
 }
 
-}  // namespace kickvane::engine
+}  // namespace kickvane::game

@@ -1,4 +1,4 @@
-#include "engine/tool_folder.h"
+#include "session/tool_folder.h"
 
 #include <fstream>
 #include <random>
@@ -6,7 +6,7 @@
 
 #include "platform/filesystem.h"
 
-namespace kickvane::engine {
+namespace kickvane::session {
 
 namespace {
 
@@ -89,4 +89,4 @@ Status SeedToolFolder(const fs::path& from, const fs::path& to) {
     return platform::WriteFileAtomically(to / kSeededMark, "");
 }
 
-}  // namespace kickvane::engine
+}  // namespace kickvane::session

@@ -1,12 +1,12 @@
-#include "engine/find_game.h"
+#include "game/find_game.h"
 
 #include <set>
 #include <system_error>
 
-#include "engine/game_managers.h"
+#include "game/game_managers.h"
 #include "platform/filesystem.h"
 
-namespace kickvane::engine {
+namespace kickvane::game {
 
 namespace {
 
@@ -124,4 +124,4 @@ FindOutcome FindGame(const UserFolders& folders, const SearchLimits& limits,
     return Finder(folders, limits, cancel).Run();
 }
 
-}  // namespace kickvane::engine
+}  // namespace kickvane::game

@@ -5,7 +5,7 @@
 
 #include "platform/status.h"
 
-namespace kickvane::engine {
+namespace kickvane::session {
 
 namespace fs = std::filesystem;
 
@@ -41,4 +41,4 @@ ToolFolderChoice ChooseToolFolder(const fs::path& programFolder, const fs::path&
 // kept as they are; once the seeded mark is written, later calls copy nothing.
 Status SeedToolFolder(const fs::path& from, const fs::path& to);
 
-}  // namespace kickvane::engine
+}  // namespace kickvane::session

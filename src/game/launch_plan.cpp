@@ -1,11 +1,11 @@
-#include "engine/launch_plan.h"
+#include "game/launch_plan.h"
 
 #include <system_error>
 
-#include "engine/game_managers.h"
+#include "game/game_managers.h"
 #include "platform/filesystem.h"
 
-namespace kickvane::engine {
+namespace kickvane::game {
 
 namespace {
 
@@ -148,4 +148,4 @@ LaunchDecision PlanLaunch(std::string_view gameFolder, const UserFolders& folder
     return decision;
 }
 
-}  // namespace kickvane::engine
+}  // namespace kickvane::game

@@ -1,13 +1,13 @@
-#include "engine/wine_prefix.h"
+#include "game/wine_prefix.h"
 
 #include <deque>
 #include <fstream>
 #include <system_error>
 
-#include "engine/config_formats.h"
+#include "game/formats/config_formats.h"
 #include "platform/filesystem.h"
 
-namespace kickvane::engine {
+namespace kickvane::game {
 
 namespace {
 
@@ -243,4 +243,4 @@ TreeSearch SearchTreeForFile(const fs::path& root, std::string_view fileName,
     return search;
 }
 
-}  // namespace kickvane::engine
+}  // namespace kickvane::game

@@ -4,7 +4,7 @@
 #include <string>
 #include <string_view>
 
-#include "engine/wine_prefix.h"
+#include "game/wine_prefix.h"
 #include "support/temp_dir.h"
 
 namespace kickvane::testing {
@@ -17,7 +17,7 @@ public:
     fs::path home() const { return dir_ / "home"; }
     fs::path operator/(std::string_view relative) const { return home() / relative; }
 
-    engine::UserFolders folders() const {
+    game::UserFolders folders() const {
         return {home(), home() / ".config", home() / ".local/share", {}};
     }
 

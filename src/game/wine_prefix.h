@@ -10,7 +10,7 @@
 
 // Wine prefixes: the folders with "drive_c", the registry files and the "dosdevices" drive links
 // in which Windows programs live on Linux.
-namespace kickvane::engine {
+namespace kickvane::game {
 
 namespace fs = std::filesystem;
 
@@ -84,4 +84,4 @@ struct TreeSearch {
 TreeSearch SearchTreeForFile(const fs::path& root, std::string_view fileName,
                              const SearchLimits& limits, const std::atomic<bool>* cancel);
 
-}  // namespace kickvane::engine
+}  // namespace kickvane::game

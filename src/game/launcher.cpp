@@ -1,10 +1,10 @@
-#include "engine/launcher.h"
+#include "game/launcher.h"
 
-#include "engine/launch_plan.h"
+#include "game/launch_plan.h"
 #include "platform/process.h"
 #include "text/vni.h"
 
-namespace kickvane::engine {
+namespace kickvane::game {
 
 namespace {
 
@@ -36,4 +36,4 @@ LaunchOutcome LaunchGame(std::string_view gameFolder) {
     return outcome;
 }
 
-}  // namespace kickvane::engine
+}  // namespace kickvane::game

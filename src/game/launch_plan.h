@@ -6,10 +6,10 @@
 #include <string_view>
 #include <vector>
 
-#include "engine/wine_prefix.h"
+#include "game/wine_prefix.h"
 #include "platform/process.h"
 
-namespace kickvane::engine {
+namespace kickvane::game {
 
 // What to run to start the game's launcher.
 struct LaunchPlan {
@@ -41,4 +41,4 @@ using ProgramLookup = std::function<fs::path(const std::string&)>;
 LaunchDecision PlanLaunch(std::string_view gameFolder, const UserFolders& folders,
                           const ProgramLookup& findProgram);
 
-}  // namespace kickvane::engine
+}  // namespace kickvane::game

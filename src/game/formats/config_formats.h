@@ -10,7 +10,7 @@
 // Small, forgiving readers of the configuration files that Wine and the game managers keep: the
 // subset of YAML, JSON and Valve's KeyValues text that those files use, Wine's registry files,
 // and desktop entries. They only read; a file that does not parse gives a reason, never a crash.
-namespace kickvane::engine {
+namespace kickvane::game {
 
 // Scalar values by their path of keys joined with '.' ("game.exe", "libraryfolders.0.path";
 // list items count from 0). Values keep the order of the file.
@@ -72,4 +72,4 @@ RegistryFile ParseWineRegistry(std::string_view text, const std::vector<std::str
 // The value of `key` in the [Desktop Entry] group of a desktop entry; empty when there is none.
 std::string DesktopEntryValue(std::string_view text, std::string_view key);
 
-}  // namespace kickvane::engine
+}  // namespace kickvane::game

@@ -1,13 +1,13 @@
-#include "engine/find_game.h"
+#include "game/find_game.h"
 
 #include <gtest/gtest.h>
 
 #include <map>
 
-#include "engine/fake_home.h"
-#include "engine/game_managers.h"
+#include "game/fake_home.h"
+#include "game/game_managers.h"
 
-namespace kickvane::engine {
+namespace kickvane::game {
 namespace {
 
 namespace fs = std::filesystem;
@@ -176,4 +176,4 @@ TEST(WinePrefix, FindsThePrefixThatHoldsOrMapsAFolder_AndMapsWindowsPaths) {
 }
 
 }  // namespace
-}  // namespace kickvane::engine
+}  // namespace kickvane::game

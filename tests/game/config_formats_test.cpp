@@ -1,8 +1,8 @@
-#include "engine/config_formats.h"
+#include "game/formats/config_formats.h"
 
 #include <gtest/gtest.h>
 
-namespace kickvane::engine {
+namespace kickvane::game {
 namespace {
 
 TEST(ParseYamlSubset,
@@ -143,4 +143,4 @@ TEST(ConfigReaders, EveryTruncationOfAFileIsHandled) {
 }
 
 }  // namespace
-}  // namespace kickvane::engine
+}  // namespace kickvane::game

@@ -1,10 +1,10 @@
 // Lutris's game database, read through SQLite without ever writing to it.
 #include <sqlite3.h>
 
-#include "engine/game_managers.h"
+#include "game/game_managers.h"
 #include "platform/filesystem.h"
 
-namespace kickvane::engine {
+namespace kickvane::game {
 
 std::optional<LutrisGameRow> ReadLutrisGame(const fs::path& database, std::string_view configName,
                                             std::string* problem) {
@@ -46,4 +46,4 @@ std::optional<LutrisGameRow> ReadLutrisGame(const fs::path& database, std::strin
     return row;
 }
 
-}  // namespace kickvane::engine
+}  // namespace kickvane::game

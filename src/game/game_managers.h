@@ -6,12 +6,12 @@
 #include <string_view>
 #include <vector>
 
-#include "engine/wine_prefix.h"
+#include "game/wine_prefix.h"
 
 // What the game managers of Linux know about Windows games: Lutris, Bottles, Heroic, PlayOnLinux,
 // Steam (games added to it from outside), Wine's own menu entries, in their usual and their
 // Flatpak and Snap locations. Their files are only ever read.
-namespace kickvane::engine {
+namespace kickvane::game {
 
 enum class Manager { Wine, Lutris, Bottles, Heroic, PlayOnLinux, Steam, WineMenu };
 
@@ -55,4 +55,4 @@ struct LutrisGameRow {
 std::optional<LutrisGameRow> ReadLutrisGame(const fs::path& database, std::string_view configName,
                                             std::string* problem);
 
-}  // namespace kickvane::engine
+}  // namespace kickvane::game

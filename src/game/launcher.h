@@ -7,7 +7,7 @@
 
 #include "text/message.h"
 
-namespace kickvane::engine {
+namespace kickvane::game {
 
 inline constexpr std::string_view kLauncherMissingVni =
     "Kho6ng ti2m tha61y Gameloader.exe hoa85c d9u7o72ng da64n kho6ng chi1nh xa1c!";
@@ -31,4 +31,4 @@ struct LaunchOutcome {
 // outcome says why in a message for the user.
 LaunchOutcome LaunchGame(std::string_view gameFolder);
 
-}  // namespace kickvane::engine
+}  // namespace kickvane::game

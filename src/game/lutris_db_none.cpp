@@ -1,7 +1,7 @@
 // A build without SQLite: Lutris games are then started by their short name.
-#include "engine/game_managers.h"
+#include "game/game_managers.h"
 
-namespace kickvane::engine {
+namespace kickvane::game {
 
 std::optional<LutrisGameRow> ReadLutrisGame(const fs::path&, std::string_view,
                                             std::string* problem) {
@@ -9,4 +9,4 @@ std::optional<LutrisGameRow> ReadLutrisGame(const fs::path&, std::string_view,
     return std::nullopt;
 }
 
-}  // namespace kickvane::engine
+}  // namespace kickvane::game
