@@ -405,12 +405,13 @@ void DrawPictures(const Skin& skin, ImageSurface& dc, Sheet& sheet,
 }  // namespace
 
 int RunSkinGallery(const std::filesystem::path& outPng, std::ostream& err) {
-    // Fonts need a QGuiApplication; run one on the offscreen platform if the caller has none.
-    static int argc = 3;
-    static char arg0[] = "kickvane";
-    static char arg1[] = "-platform";
-    static char arg2[] = "offscreen";
-    static char* argv[] = {arg0, arg1, arg2, nullptr};
+    // Fonts need a QGuiApplication; run one on the offscreen platform if the caller has none. The
+    // application takes the options it reads out of argv, so each run gets a fresh copy.
+    int argc = 3;
+    char arg0[] = "kickvane";
+    char arg1[] = "-platform";
+    char arg2[] = "offscreen";
+    char* argv[] = {arg0, arg1, arg2, nullptr};
     std::unique_ptr<QGuiApplication> ownApp;
     if (QCoreApplication::instance() == nullptr) {
         ownApp = std::make_unique<QGuiApplication>(argc, argv);
