@@ -18,5 +18,5 @@ extern "C" KICKVANE_EXPORT int kickvane_open_window(int* argc, char** argv,
 }
 
 extern "C" KICKVANE_EXPORT int kickvane_draw_skin_gallery(const char* outFile) {
-    return kickvane::skin::RunSkinGallery(kickvane::platform::PathFromUtf8(outFile), std::cerr);
+    return kickvane::skin::runSkinGallery(kickvane::platform::PathFromUtf8(outFile), std::cerr);
 }

@@ -3,6 +3,7 @@
 #include <memory>
 #include <ostream>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include <QCoreApplication>
@@ -21,24 +22,13 @@ constexpr int kSheetWidth = 1180;
 constexpr int kLabelWidth = 200;
 constexpr int kCaptionHeight = 14;
 constexpr int kGap = 10;
-constexpr WindowHandle kHotWindow = 1;  // the window the gallery's cursor rests on
-constexpr WindowHandle kCalmWindow = 2;
-
-// The gallery's cursor always rests on kHotWindow, so hot looks can be shown side by side.
-class FixedPointer final : public PointerProbe {
-public:
-    Status WindowAtCursor(WindowHandle& window) const override {
-        window = kHotWindow;
-        return Status::Ok();
-    }
-};
 
 // Lays out labelled rows of cells on the sheet, left to right, wrapping at the sheet's edge.
 class Sheet {
 public:
     explicit Sheet(QImage& image) : image_(image) {}
 
-    void Title(const QString& text) {
+    void title(const QString& text) {
         QPainter painter(&image_);
         QFont font = painter.font();
         font.setPointSize(font.pointSize() + 5);
@@ -51,8 +41,8 @@ public:
     }
 
     // Starts a row of cells under `label`.
-    void Row(const QString& label) {
-        Finish();
+    void row(const QString& label) {
+        finish();
         QPainter painter(&image_);
         painter.setPen(QColor(200, 208, 220));
         painter.drawLine(kGap, y_ - 5, kSheetWidth - kGap, y_ - 5);
@@ -68,7 +58,7 @@ public:
     }
 
     // A cell of `width` x `height` with `caption` under it; returns where to paint.
-    Rect Cell(int width, int height, const QString& caption) {
+    Rect cell(int width, int height, const QString& caption) {
         const QFontMetrics metrics(QFont{});
         const int captionWidth = metrics.horizontalAdvance(caption) + 4;
         const int slot = std::max(width, captionWidth);
@@ -89,7 +79,7 @@ public:
         return cell;
     }
 
-    int Finish() {
+    int finish() {
         y_ = std::max(y_, rowBottom_ + 2 * kGap);
         return y_;
     }
@@ -102,299 +92,355 @@ private:
     int rowBottom_ = 0;
 };
 
-QString N(int v) {
+QString number(int v) {
     return QString::number(v);
 }
 
-// Draws every painter; collects the failures the reporting painters return.
-void DrawPainters(Skin& skin, ImageSurface& dc, Sheet& sheet, std::vector<std::string>& faults) {
+// The text the gallery's list and combo boxes show.
+constexpr const char* kItemText = "Sân cỏ mùa xuân";
+
+// Draws every painter; collects the failures the reporting painters return. The captions keep
+// the sheet's first numbering of parts and looks.
+void drawPainters(Skin& skin, ImageSurface& dc, Sheet& sheet, std::vector<std::string>& faults) {
     const auto check = [&](Status s, const char* what) {
         if (!s) {
             faults.push_back(std::string(what) + ": " + s.reason());
         }
     };
+    constexpr ControlLook kLooks[] = {ControlLook::Normal, ControlLook::Hot, ControlLook::Pressed,
+                                      ControlLook::Disabled};
 
-    sheet.Row("ThemeButton");
-    for (int state : {1, 2, 3, 4, 5}) {
-        const char* names[] = {"", "normal", "hot", "pressed", "disabled", "default"};
-        skin.ThemeButton(0, dc, state, false, false, sheet.Cell(80, 24, names[state]));
-    }
-    skin.ThemeButton(0, dc, 1, false, false, sheet.Cell(140, 40, "normal, large"));
-
-    sheet.Row("ThemeCheck");
-    for (int state = 1; state <= 12; ++state) {
-        check(skin.ThemeCheck(0, dc, state, 0, sheet.Cell(13, 13, N(state))), "ThemeCheck");
-    }
-    sheet.Row("ThemeOption");
-    for (int state = 1; state <= 8; ++state) {
-        check(skin.ThemeOption(0, dc, state, 0, sheet.Cell(13, 13, N(state))), "ThemeOption");
-    }
-
-    sheet.Row("ThemeProgress");
+    sheet.row("ThemeButton");
     {
-        const Rect lying = sheet.Cell(180, 18, "lying, 60 %");
-        skin.ThemeProgress(0, dc, 0, lying.right, lying.bottom,
-                           Rect{lying.left, lying.top, lying.left + 110, lying.bottom});
-        const Rect upright = sheet.Cell(18, 100, "upright, 40 %");
-        skin.ThemeProgress(0, dc, 1, upright.right, upright.bottom,
-                           Rect{upright.left, upright.top, upright.right, upright.top + 42});
-        const Rect empty = sheet.Cell(180, 18, "trough only");
-        skin.ThemeProgress(0, dc, 0, empty.right, empty.bottom, Rect{empty.left, empty.top, 0, 0});
+        const char* names[] = {"normal", "hot", "pressed", "disabled", "default"};
+        const ButtonLook looks[] = {ButtonLook::Normal, ButtonLook::Hot, ButtonLook::Pressed,
+                                    ButtonLook::Disabled, ButtonLook::Default};
+        for (int i = 0; i < 5; ++i) {
+            skin.paintButton(dc, looks[i], sheet.cell(80, 24, names[i]));
+        }
+        skin.paintButton(dc, ButtonLook::Normal, sheet.cell(140, 40, "normal, large"));
     }
 
-    sheet.Row("ThemeScroll buttons");
-    for (bool vertical : {false, true}) {
-        for (int part : {0, 1}) {
-            struct Look {
-                int state;
-                WindowHandle window;
-                const char* name;
-            };
-            for (const Look& look : {Look{0, kCalmWindow, "normal"}, Look{0, kHotWindow, "hover"},
-                                     Look{2, kCalmWindow, "hot"}, Look{1, kCalmWindow, "pressed"},
-                                     Look{3, kCalmWindow, "disabled"}}) {
-                skin.ThemeScroll(look.window, dc, sheet.Cell(17, 17, look.name), part, look.state,
-                                 vertical);
+    sheet.row("ThemeCheck");
+    for (CheckState state : {CheckState::Unticked, CheckState::Ticked, CheckState::Mixed}) {
+        for (ControlLook look : kLooks) {
+            const int n = 4 * static_cast<int>(state) + static_cast<int>(look) + 1;
+            check(skin.paintCheckBox(dc, state, look, sheet.cell(13, 13, number(n))), "ThemeCheck");
+        }
+    }
+    sheet.row("ThemeOption");
+    for (OptionState state : {OptionState::Clear, OptionState::Selected}) {
+        for (ControlLook look : kLooks) {
+            const int n = 4 * static_cast<int>(state) + static_cast<int>(look) + 1;
+            check(skin.paintOptionButton(dc, state, look, sheet.cell(13, 13, number(n))),
+                  "ThemeOption");
+        }
+    }
+
+    sheet.row("ThemeProgress");
+    {
+        const Rect lying = sheet.cell(180, 18, "lying, 60 %");
+        skin.paintProgressTrough(dc, Orientation::Horizontal, lying);
+        skin.paintProgressBar(dc, Orientation::Horizontal,
+                              Rect{lying.left, lying.top, lying.left + 110, lying.bottom});
+        const Rect upright = sheet.cell(18, 100, "upright, 40 %");
+        skin.paintProgressTrough(dc, Orientation::Vertical, upright);
+        skin.paintProgressBar(dc, Orientation::Vertical,
+                              Rect{upright.left, upright.top, upright.right, upright.top + 42});
+        skin.paintProgressTrough(dc, Orientation::Horizontal, sheet.cell(180, 18, "trough only"));
+    }
+
+    sheet.row("ThemeScroll buttons");
+    for (ArrowDirection direction :
+         {ArrowDirection::Left, ArrowDirection::Right, ArrowDirection::Up, ArrowDirection::Down}) {
+        struct Look {
+            ScrollButtonLook look;
+            const char* name;
+        };
+        for (const Look& look :
+             {Look{ScrollButtonLook::Normal, "normal"}, Look{ScrollButtonLook::Hover, "hover"},
+              Look{ScrollButtonLook::Hot, "hot"}, Look{ScrollButtonLook::Pressed, "pressed"},
+              Look{ScrollButtonLook::Disabled, "disabled"}}) {
+            skin.paintScrollButton(dc, direction, look.look, sheet.cell(17, 17, look.name));
+        }
+    }
+    sheet.row("ThemeScroll bars");
+    {
+        const Rect bar = sheet.cell(200, 17, "lying bar");
+        skin.paintScrollTrack(dc, Orientation::Horizontal,
+                              Rect{bar.left + 17, bar.top, bar.right - 17, bar.bottom});
+        skin.paintScrollButton(dc, ArrowDirection::Left, ScrollButtonLook::Normal,
+                               Rect{bar.left, bar.top, bar.left + 17, bar.bottom});
+        skin.paintScrollButton(dc, ArrowDirection::Right, ScrollButtonLook::Normal,
+                               Rect{bar.right - 17, bar.top, bar.right, bar.bottom});
+        skin.paintScrollThumb(dc, Orientation::Horizontal, ControlLook::Normal,
+                              Rect{bar.left + 50, bar.top, bar.left + 110, bar.bottom});
+        const Rect upright = sheet.cell(17, 120, "upright bar");
+        skin.paintScrollTrack(
+            dc, Orientation::Vertical,
+            Rect{upright.left, upright.top + 17, upright.right, upright.bottom - 17});
+        skin.paintScrollButton(dc, ArrowDirection::Up, ScrollButtonLook::Normal,
+                               Rect{upright.left, upright.top, upright.right, upright.top + 17});
+        skin.paintScrollButton(
+            dc, ArrowDirection::Down, ScrollButtonLook::Normal,
+            Rect{upright.left, upright.bottom - 17, upright.right, upright.bottom});
+        skin.paintScrollThumb(
+            dc, Orientation::Vertical, ControlLook::Hot,
+            Rect{upright.left, upright.top + 30, upright.right, upright.top + 70});
+        for (ControlLook look : kLooks) {
+            skin.paintScrollThumb(dc, Orientation::Horizontal, look,
+                                  sheet.cell(50, 17, "thumb " + number(static_cast<int>(look))));
+        }
+        const ControlLook boxes[] = {ControlLook::Normal, ControlLook::Pressed, ControlLook::Hot};
+        for (int i = 0; i < 3; ++i) {
+            skin.paintSizeBox(dc, boxes[i], sheet.cell(17, 17, "box " + number(i)));
+        }
+    }
+
+    sheet.row("ThemeSpinButton");
+    {
+        struct Button {
+            ArrowDirection direction;
+            const char* name;
+        };
+        for (const Button& button :
+             {Button{ArrowDirection::Up, "up"}, Button{ArrowDirection::Down, "down"},
+              Button{ArrowDirection::Left, "left"}, Button{ArrowDirection::Right, "right"}}) {
+            const bool upDown =
+                button.direction == ArrowDirection::Up || button.direction == ArrowDirection::Down;
+            for (ControlLook look : kLooks) {
+                skin.paintSpinButton(
+                    dc, button.direction, look,
+                    sheet.cell(upDown ? 17 : 10, upDown ? 10 : 17,
+                               QString(button.name) + " " + number(static_cast<int>(look))));
             }
         }
     }
-    sheet.Row("ThemeScroll bars");
-    {
-        const Rect bar = sheet.Cell(200, 17, "lying bar");
-        skin.ThemeScroll(kCalmWindow, dc, Rect{bar.left + 17, bar.top, bar.right - 17, bar.bottom},
-                         2, 0, false);
-        skin.ThemeScroll(kCalmWindow, dc, Rect{bar.left, bar.top, bar.left + 17, bar.bottom}, 0, 0,
-                         false);
-        skin.ThemeScroll(kCalmWindow, dc, Rect{bar.right - 17, bar.top, bar.right, bar.bottom}, 1,
-                         0, false);
-        skin.ThemeScroll(kCalmWindow, dc, Rect{bar.left + 50, bar.top, bar.left + 110, bar.bottom},
-                         5, 0, false);
-        const Rect upright = sheet.Cell(17, 120, "upright bar");
-        skin.ThemeScroll(kCalmWindow, dc,
-                         Rect{upright.left, upright.top + 17, upright.right, upright.bottom - 17},
-                         3, 0, true);
-        skin.ThemeScroll(kCalmWindow, dc,
-                         Rect{upright.left, upright.top, upright.right, upright.top + 17}, 0, 0,
-                         true);
-        skin.ThemeScroll(kCalmWindow, dc,
-                         Rect{upright.left, upright.bottom - 17, upright.right, upright.bottom}, 1,
-                         0, true);
-        skin.ThemeScroll(kCalmWindow, dc,
-                         Rect{upright.left, upright.top + 30, upright.right, upright.top + 70}, 5,
-                         1, true);
-        for (int state = 0; state < 4; ++state) {
-            skin.ThemeScroll(0, dc, sheet.Cell(50, 17, "thumb " + N(state)), 5, state, false);
-        }
-        for (int state = 0; state < 3; ++state) {
-            skin.ThemeScroll(0, dc, sheet.Cell(17, 17, "box " + N(state)), 4, state, false);
-        }
-    }
 
-    sheet.Row("ThemeSpinButton");
-    for (int button : {2, 1, 0, 3}) {
-        const bool upright = button == 1 || button == 2;
-        const char* names[] = {"left", "down", "up", "right"};
-        for (int state = 0; state < 4; ++state) {
-            skin.ThemeSpinButton(dc, state, button,
-                                 sheet.Cell(upright ? 17 : 10, upright ? 10 : 17,
-                                            QString(names[button]) + " " + N(state)));
-        }
-    }
-
-    sheet.Row("ThemeTrackbar");
-    for (int orientation : {0, 1}) {
-        const bool lying = orientation == 0;
+    sheet.row("ThemeTrackbar");
+    for (Orientation bar : {Orientation::Horizontal, Orientation::Vertical}) {
+        const bool lying = bar == Orientation::Horizontal;
         const Rect channelCell =
-            sheet.Cell(lying ? 120 : 24, lying ? 24 : 100, lying ? "lying" : "upright");
+            sheet.cell(lying ? 120 : 24, lying ? 24 : 100, lying ? "lying" : "upright");
         const Rect channel = lying ? Rect{channelCell.left, channelCell.top + 9, channelCell.right,
                                           channelCell.top + 13}
                                    : Rect{channelCell.left + 9, channelCell.top,
                                           channelCell.left + 13, channelCell.bottom};
-        skin.ThemeTrackbar(0, dc, true, false, 1, 0, orientation, channel);
+        skin.paintTrackBarChannel(dc, channel);
         const Rect thumb = lying ? Rect{channelCell.left + 40, channelCell.top,
                                         channelCell.left + 51, channelCell.top + 21}
                                  : Rect{channelCell.left, channelCell.top + 40,
                                         channelCell.left + 21, channelCell.top + 51};
-        skin.ThemeTrackbar(0, dc, true, false, 1, 1, orientation, thumb);
-        for (int ticks : {0, 1, 2}) {
-            for (int look = 0; look < 3; ++look) {
+        skin.paintTrackBarThumb(dc, bar, ThumbPoint::BottomOrRight, ThumbLook::Normal, thumb);
+        const ThumbPoint points[] = {ThumbPoint::TopOrLeft, ThumbPoint::BottomOrRight,
+                                     ThumbPoint::None};
+        for (int ticks = 0; ticks < 3; ++ticks) {
+            struct Look {
+                ThumbLook look;
+                const char* name;
+            };
+            for (const Look& look : {Look{ThumbLook::Normal, ""}, Look{ThumbLook::Hot, " hot"},
+                                     Look{ThumbLook::Disabled, " off"}}) {
                 const int width = lying ? (ticks == 2 ? 15 : 11) : 21;
                 const int height = lying ? 21 : (ticks == 2 ? 15 : 11);
-                const char* looks[] = {"", " hot", " off"};
-                skin.ThemeTrackbar(0, dc, look != 2, look == 1, ticks, 1, orientation,
-                                   sheet.Cell(width, height, "t" + N(ticks) + looks[look]));
+                skin.paintTrackBarThumb(dc, bar, points[ticks], look.look,
+                                        sheet.cell(width, height, "t" + number(ticks) + look.name));
             }
         }
     }
 
-    sheet.Row("ThemeTab");
+    sheet.row("ThemeTab");
     {
-        const Rect panel = sheet.Cell(260, 90, "panel and heads 0-3");
-        skin.ThemeTab(0, dc, 0, 0, Rect{panel.left, panel.top + 22, panel.right, panel.bottom}, 0);
-        const int states[] = {0, 1, 3, 2};  // the selected head last, over its neighbours
+        const Rect panel = sheet.cell(260, 90, "panel and heads 0-3");
+        skin.paintTabPanel(dc, Rect{panel.left, panel.top + 22, panel.right, panel.bottom});
+        // The selected head last, over its neighbours.
+        const TabLook looks[] = {TabLook::Normal, TabLook::Hot, TabLook::SelectedFocused,
+                                 TabLook::Selected};
         const int lefts[] = {0, 60, 180, 120};
         for (int i = 0; i < 4; ++i) {
-            const int top = states[i] == 2 ? panel.top : panel.top + 2;
-            skin.ThemeTab(
-                0, dc, 1, states[i],
-                Rect{panel.left + lefts[i] + 2, top, panel.left + lefts[i] + 62, panel.top + 23},
-                0);
+            const int top = looks[i] == TabLook::Selected ? panel.top : panel.top + 2;
+            skin.paintTabHead(
+                dc, looks[i],
+                Rect{panel.left + lefts[i] + 2, top, panel.left + lefts[i] + 62, panel.top + 23});
         }
     }
 
-    sheet.Row("ThemeListbox");
-    skin.ThemeListbox(kCalmWindow, dc, 1, sheet.Cell(180, 24, "plDraw 1"));
-    skin.ThemeListbox(kCalmWindow, dc, 2, sheet.Cell(180, 24, "plDraw 2"));
+    sheet.row("ThemeListbox");
+    skin.paintListBoxItem(dc, ItemLook::Normal, sheet.cell(180, 24, "plDraw 1"), kItemText);
+    skin.paintListBoxItem(dc, ItemLook::Hot, sheet.cell(180, 24, "plDraw 2"), kItemText);
 
-    sheet.Row("ThemeCombobox");
+    sheet.row("ThemeCombobox");
     {
-        const Rect field = sheet.Cell(180, 21, "field, text, button");
-        skin.ThemeCombobox(kCalmWindow, dc, 0, 0, field);
-        skin.ThemeCombobox(kCalmWindow, dc, 2, 0,
-                           Rect{field.left + 4, field.top, field.right - 17, field.bottom});
-        skin.ThemeCombobox(kCalmWindow, dc, 1, 1,
-                           Rect{field.right - 15, field.top + 1, field.right - 1, field.bottom});
-        const Rect selected = sheet.Cell(120, 18, "selection");
-        skin.ThemeCombobox(kCalmWindow, dc, 1, 0, selected);
-        skin.ThemeCombobox(kCalmWindow, dc, 2, 0, selected);
-        for (int state = 1; state <= 4; ++state) {
-            const Rect cell = sheet.Cell(17, 20, "button " + N(state));
-            skin.ThemeCombobox(0, dc, state, 1,
-                               Rect{cell.left + 2, cell.top, cell.right, cell.bottom + 1});
+        const Rect field = sheet.cell(180, 21, "field, text, button");
+        skin.paintComboBox(dc, ComboPart::Field, field);
+        skin.paintComboText(dc, Rect{field.left + 4, field.top, field.right - 17, field.bottom},
+                            kItemText);
+        skin.paintComboButton(dc, ControlLook::Normal,
+                              Rect{field.right - 15, field.top + 1, field.right - 1, field.bottom});
+        const Rect selected = sheet.cell(120, 18, "selection");
+        skin.paintComboBox(dc, ComboPart::Selection, selected);
+        skin.paintComboText(dc, selected, kItemText);
+        for (ControlLook look : kLooks) {
+            const Rect cell = sheet.cell(17, 20, "button " + number(static_cast<int>(look) + 1));
+            skin.paintComboButton(dc, look,
+                                  Rect{cell.left + 2, cell.top, cell.right, cell.bottom + 1});
         }
-        const Rect push = sheet.Cell(60, 21, "plDraw 2");
-        skin.ThemeCombobox(0, dc, 0, 2, Rect{push.left + 2, push.top, push.right, push.bottom + 1});
+        const Rect push = sheet.cell(60, 21, "plDraw 2");
+        skin.paintComboBox(dc, ComboPart::PushButton,
+                           Rect{push.left + 2, push.top, push.right, push.bottom + 1});
     }
 
-    sheet.Row("ThemePropertyGrid");
-    skin.ThemePropertyGrid(0, dc, 0, 1, sheet.Cell(90, 50, "panel"));
-    skin.ThemePropertyGrid(0, dc, 1, 1, sheet.Cell(90, 50, "focus"));
-    for (int state = 0; state < 3; ++state) {
-        skin.ThemePropertyGrid(0, dc, state, 0, sheet.Cell(90, 18, "cell " + N(state)));
-    }
+    sheet.row("ThemePropertyGrid");
+    skin.paintPropertyGrid(dc, PropertyGridPart::Panel, sheet.cell(90, 50, "panel"));
+    skin.paintPropertyGrid(dc, PropertyGridPart::FocusFrame, sheet.cell(90, 50, "focus"));
+    skin.paintPropertyGrid(dc, PropertyGridPart::Cell, sheet.cell(90, 18, "cell 0"));
+    skin.paintPropertyGrid(dc, PropertyGridPart::SelectedCell, sheet.cell(90, 18, "cell 1"));
+    skin.paintPropertyGrid(dc, PropertyGridPart::CategoryRow, sheet.cell(90, 18, "cell 2"));
 
-    sheet.Row("ThemeDate");
+    sheet.row("ThemeDate");
     {
-        const Rect date = sheet.Cell(140, 22, "field and button");
-        skin.ThemeDate(0, dc, 0, 1, date);
-        skin.ThemeDate(0, dc, 0, 2,
+        const Rect date = sheet.cell(140, 22, "field and button");
+        skin.paintDate(dc, DatePart::Field, date);
+        skin.paintDate(dc, DatePart::DropButton,
                        Rect{date.right - 19, date.top + 2, date.right - 2, date.bottom - 2});
     }
 
-    sheet.Row("DrawListview");
-    for (int state = 0; state < 4; ++state) {
-        skin.DrawListview(0, dc, 0, state, sheet.Cell(80, 21, "header " + N(state)));
+    sheet.row("DrawListview");
+    for (HeaderLook look :
+         {HeaderLook::Empty, HeaderLook::Normal, HeaderLook::Hot, HeaderLook::Pressed}) {
+        skin.paintListHeader(dc, look,
+                             sheet.cell(80, 21, "header " + number(static_cast<int>(look))));
     }
-    skin.DrawListview(0, dc, 1, 0, sheet.Cell(80, 21, "plDraw 1"));
-    skin.DrawListview(0, dc, 2, 0, sheet.Cell(80, 40, "plDraw 2"));
+    skin.paintListHeader(dc, HeaderLook::Normal, sheet.cell(80, 21, "plDraw 1"));
+    skin.paintListOutline(dc, sheet.cell(80, 40, "plDraw 2"));
 
-    sheet.Row("ThemeStatusBar");
+    sheet.row("ThemeStatusBar");
     {
-        const Rect bar = sheet.Cell(400, 22, "bar, panels, progress, grip");
-        skin.ThemeStatusBar(0, dc, 0, bar);
-        skin.ThemeStatusBar(0, dc, 2, Rect{bar.left + 4, bar.top + 3, bar.left + 150, bar.bottom});
-        skin.ThemeStatusBar(0, dc, 3,
+        const Rect bar = sheet.cell(400, 22, "bar, panels, progress, grip");
+        skin.paintStatusBar(dc, StatusBarPart::Bar, bar);
+        skin.paintStatusBar(dc, StatusBarPart::Panel,
+                            Rect{bar.left + 4, bar.top + 3, bar.left + 150, bar.bottom});
+        skin.paintStatusBar(dc, StatusBarPart::ProgressTrough,
                             Rect{bar.left + 160, bar.top + 3, bar.left + 300, bar.bottom - 1});
-        skin.ThemeStatusBar(0, dc, 4,
+        skin.paintStatusBar(dc, StatusBarPart::ProgressBar,
                             Rect{bar.left + 160, bar.top + 3, bar.left + 240, bar.bottom - 1});
-        skin.ThemeStatusBar(0, dc, 1, Rect{bar.right - 18, bar.top, bar.right, bar.bottom});
-        skin.ThemeStatusBar(0, dc, 5, sheet.Cell(200, 22, "simple mode"));
+        skin.paintStatusBar(dc, StatusBarPart::SizeGrip,
+                            Rect{bar.right - 18, bar.top, bar.right, bar.bottom});
+        skin.paintStatusBar(dc, StatusBarPart::SimpleBar, sheet.cell(200, 22, "simple mode"));
     }
 
-    sheet.Row("ThemeCommandBarMenu");
+    sheet.row("ThemeCommandBarMenu");
     for (int part = 0; part <= 11; ++part) {
-        for (int state = 0; state <= 2; ++state) {
+        const auto menuPart = static_cast<MenuPart>(part);
+        // Three looks of each part; a menu's own buttons have no normal look.
+        MenuLook looks[] = {MenuLook::Normal, MenuLook::Hot, MenuLook::Disabled};
+        if (menuPart == MenuPart::BarItem) {
+            looks[2] = MenuLook::Open;
+        } else if (menuPart == MenuPart::Button) {
+            looks[0] = MenuLook::Hot, looks[1] = MenuLook::Pressed, looks[2] = MenuLook::Checked;
+        }
+        for (int i = 0; i < 3; ++i) {
             const bool mark = part >= 3 && part <= 7;
-            skin.ThemeCommandBarMenu(0, dc, part, state,
-                                     sheet.Cell(mark ? 20 : 48, 20, N(part) + "/" + N(state)));
+            skin.paintMenu(dc, menuPart, looks[i],
+                           sheet.cell(mark ? 20 : 48, 20, number(part) + "/" + number(i)));
         }
     }
 
-    sheet.Row("ThemeUniToolbar");
+    sheet.row("ThemeUniToolbar");
     {
-        const Rect bar = sheet.Cell(360, 30, "background and items");
-        // The toolbar paints from (0, 0); draw it on its own picture and place that.
+        const Rect bar = sheet.cell(360, 30, "background and items");
+        // The toolbar is drawn on its own picture, which is then placed on the sheet.
         QImage toolbar(bar.right - bar.left, bar.bottom - bar.top, QImage::Format_RGB32);
         toolbar.fill(QColor(236, 239, 244));
         ImageSurface tb(toolbar);
-        skin.ThemeUniToolbar(0, tb, 0, 0, 0, 0, 0, 0, 0, toolbar.width(), toolbar.height());
+        skin.paintToolbarBackground(tb, Rect{0, 0, toolbar.width(), toolbar.height()});
         int left = 4;
-        for (int status : {1, 2, 3, 4, 5}) {
-            skin.ThemeUniToolbar(0, tb, 1, 0, left, 2, left + 23, 26, status, 0, 0);
+        for (ToolbarLook look : {ToolbarLook::Hot, ToolbarLook::Pressed, ToolbarLook::Checked,
+                                 ToolbarLook::CheckedHot, ToolbarLook::Raised}) {
+            skin.paintToolbarButton(tb, ToolbarButtonPart::Button, look,
+                                    Rect{left, 4, left + 23, 26});
             left += 27;
         }
-        skin.ThemeUniToolbar(0, tb, 2, 0, left, 2, left + 34, 26, 1, 0, 0);
+        skin.paintToolbarButton(tb, ToolbarButtonPart::ButtonWithDropDown, ToolbarLook::Hot,
+                                Rect{left, 4, left + 34, 26});
         left += 38;
-        skin.ThemeUniToolbar(0, tb, 3, 0, left, 2, left + 11, 26, 2, 0, 0);
+        skin.paintToolbarButton(tb, ToolbarButtonPart::DropDown, ToolbarLook::Pressed,
+                                Rect{left, 4, left + 11, 26});
         left += 15;
-        skin.ThemeUniToolbar(0, tb, 4, 0, left, 2, left + 15, 26, 2, 0, 0);
+        skin.paintToolbarComboButton(tb, ControlLook::Hot, Rect{left, 4, left + 15, 26});
         left += 19;
-        skin.ThemeUniToolbar(0, tb, 5, 0, left, 2, left + 60, 26, 0, 0, 0);
-        check(dc.Copy(toolbar, Piece{0, 0, toolbar.width(), toolbar.height()},
+        skin.paintToolbarPanel(tb, Rect{left, 4, left + 60, 26});
+        check(dc.copy(toolbar, Piece{0, 0, toolbar.width(), toolbar.height()},
                       Piece{bar.left, bar.top, toolbar.width(), toolbar.height()}),
               "toolbar");
     }
 
-    sheet.Row("ThemeMDITab");
+    sheet.row("ThemeMDITab");
     {
-        const Rect strip = sheet.Cell(300, 60, "strip, tabs, frame, buttons");
-        const auto f = [](int v) { return static_cast<float>(v); };
-        int measure = 0;
-        check(skin.ThemeMDITab(0, dc, 6, f(strip.left), f(strip.top + 18), f(strip.right),
-                               f(strip.bottom), measure),
-              "ThemeMDITab");
-        check(skin.ThemeMDITab(0, dc, 1, f(strip.left), f(strip.top), f(strip.right),
-                               f(strip.top + 19), measure),
-              "ThemeMDITab");
-        check(skin.ThemeMDITab(0, dc, 5, f(strip.left + 84), f(strip.top + 2), f(strip.left + 164),
-                               f(strip.top + 19), measure),
-              "ThemeMDITab");
-        check(skin.ThemeMDITab(0, dc, 12, f(strip.left + 164), f(strip.top + 2),
-                               f(strip.left + 165), f(strip.top + 19), measure),
-              "ThemeMDITab");
-        check(skin.ThemeMDITab(0, dc, 5, f(strip.left + 165), f(strip.top + 2), f(strip.left + 245),
-                               f(strip.top + 19), measure),
-              "ThemeMDITab");
-        check(skin.ThemeMDITab(0, dc, 2, f(strip.left + 4), f(strip.top + 1), f(strip.left + 84),
-                               f(strip.top + 19), measure),
-              "ThemeMDITab");
-        check(skin.ThemeMDITab(0, dc, 10, f(strip.right - 36), f(strip.top + 3),
-                               f(strip.right - 20), f(strip.top + 17), measure),
-              "ThemeMDITab");
-        check(skin.ThemeMDITab(0, dc, 11, f(strip.right - 18), f(strip.top + 3), f(strip.right - 2),
-                               f(strip.top + 17), measure),
-              "ThemeMDITab");
-    }
-
-    sheet.Row("ThemeMenus");
-    {
-        const int cases[][2] = {{0, 0}, {1, 0}, {1, 1}, {2, 0}, {2, 1}, {3, 0},
-                                {4, 0}, {4, 1}, {5, 0}, {5, 1}, {5, 2}, {6, 0}};
-        for (const auto& [part, state] : cases) {
-            const Rect cell = sheet.Cell(48, 20, N(part) + "/" + N(state));
-            skin.ThemeMenus(0, dc, part, state, cell.left, cell.top, cell.right, cell.bottom);
+        const Rect strip = sheet.cell(300, 60, "strip, tabs, frame, buttons");
+        const auto [l, t, r, b] = strip;
+        const std::pair<WindowTabPart, Rect> parts[] = {
+            {WindowTabPart::PageFrame, Rect{l, t + 18, r, b}},
+            {WindowTabPart::Strip, Rect{l, t, r, t + 19}},
+            {WindowTabPart::InactiveTab, Rect{l + 84, t + 2, l + 164, t + 19}},
+            {WindowTabPart::Divider, Rect{l + 164, t + 2, l + 165, t + 19}},
+            {WindowTabPart::InactiveTab, Rect{l + 165, t + 2, l + 245, t + 19}},
+            {WindowTabPart::ActiveTab, Rect{l + 4, t + 1, l + 84, t + 19}},
+            {WindowTabPart::HotButton, Rect{r - 36, t + 3, r - 20, t + 17}},
+            {WindowTabPart::PressedButton, Rect{r - 18, t + 3, r - 2, t + 17}},
+        };
+        for (const auto& [part, box] : parts) {
+            check(skin.paintWindowTab(dc, part, box), "ThemeMDITab");
         }
     }
 
-    sheet.Row("ThemePopupColor");
-    for (int part = 0; part <= 3; ++part) {
-        check(skin.ThemePopupColor(0, dc, part, sheet.Cell(30, 20, N(part))), "ThemePopupColor");
+    sheet.row("ThemeMenus");
+    {
+        struct Case {
+            MenuBox part;
+            MenuBoxLook look;
+            const char* caption;
+        };
+        const Case cases[] = {
+            {MenuBox::Background, MenuBoxLook::Normal, "0/0"},
+            {MenuBox::Item, MenuBoxLook::Normal, "1/0"},
+            {MenuBox::Item, MenuBoxLook::Hot, "1/1"},
+            {MenuBox::Margin, MenuBoxLook::Normal, "2/0"},
+            {MenuBox::Margin, MenuBoxLook::Hot, "2/1"},
+            {MenuBox::Separator, MenuBoxLook::Normal, "3/0"},
+            {MenuBox::Highlight, MenuBoxLook::Normal, "4/0"},
+            {MenuBox::Highlight, MenuBoxLook::Hot, "4/1"},
+            {MenuBox::Button, MenuBoxLook::Normal, "5/0"},
+            {MenuBox::Button, MenuBoxLook::Pressed, "5/1"},
+            {MenuBox::Button, MenuBoxLook::Hot, "5/2"},
+            {MenuBox::Outline, MenuBoxLook::Normal, "6/0"},
+        };
+        for (const Case& c : cases) {
+            skin.paintMenuBox(dc, c.part, c.look, sheet.cell(48, 20, c.caption));
+        }
     }
 
-    sheet.Row("DrawTextbox");
+    sheet.row("ThemePopupColor");
     {
-        const Rect box = sheet.Cell(160, 22, "bState 0");
-        skin.DrawTextbox(0, dc, 0, box.left, box.top, box.right, box.bottom);
+        const ColorPopupPart parts[] = {ColorPopupPart::Background, ColorPopupPart::SelectedCell,
+                                        ColorPopupPart::SelectedCell, ColorPopupPart::Outline};
+        for (int i = 0; i < 4; ++i) {
+            check(skin.paintColorPopup(dc, parts[i], sheet.cell(30, 20, number(i))),
+                  "ThemePopupColor");
+        }
     }
+
+    sheet.row("DrawTextbox");
+    skin.paintTextBoxOutline(dc, sheet.cell(160, 22, "bState 0"));
 }
 
-void DrawPictures(const Skin& skin, ImageSurface& dc, Sheet& sheet,
+void drawPictures(const Skin& skin, ImageSurface& dc, Sheet& sheet,
                   std::vector<std::string>& faults) {
-    sheet.Row("The 32 pictures");
-    for (const NamedPicture& picture : ListPictures(skin.Pictures())) {
+    sheet.row("The 32 pictures");
+    for (const NamedPicture& picture : listPictures(skin.pictures())) {
         const QImage& image = *picture.image;
-        const Rect cell = sheet.Cell(image.width(), image.height(), picture.name);
-        if (Status s = dc.Copy(image, Piece{0, 0, image.width(), image.height()},
+        const Rect cell = sheet.cell(image.width(), image.height(), picture.name);
+        if (Status s = dc.copy(image, Piece{0, 0, image.width(), image.height()},
                                Piece{cell.left, cell.top, image.width(), image.height()});
             !s) {
             faults.push_back(std::string(picture.name) + ": " + s.reason());
@@ -404,7 +450,7 @@ void DrawPictures(const Skin& skin, ImageSurface& dc, Sheet& sheet,
 
 }  // namespace
 
-int RunSkinGallery(const std::filesystem::path& outPng, std::ostream& err) {
+int runSkinGallery(const std::filesystem::path& outPng, std::ostream& err) {
     // Fonts need a QGuiApplication; run one on the offscreen platform if the caller has none. The
     // application takes the options it reads out of argv, so each run gets a fresh copy.
     int argc = 3;
@@ -424,15 +470,13 @@ int RunSkinGallery(const std::filesystem::path& outPng, std::ostream& err) {
     image.fill(QColor(236, 239, 244));
     ImageSurface dc(image);
     Skin skin;
-    skin.SetPointerProbe(std::make_shared<FixedPointer>());
-    skin.SetWindowTextReader([](WindowHandle) { return std::string("Sân cỏ mùa xuân"); });
 
     Sheet sheet(image);
-    sheet.Title("Kickvane skin gallery");
+    sheet.title("Kickvane skin gallery");
     std::vector<std::string> faults;
-    DrawPainters(skin, dc, sheet, faults);
-    DrawPictures(skin, dc, sheet, faults);
-    const int height = std::min(sheet.Finish(), image.height());
+    drawPainters(skin, dc, sheet, faults);
+    drawPictures(skin, dc, sheet, faults);
+    const int height = std::min(sheet.finish(), image.height());
 
     if (!faults.empty()) {
         for (const std::string& fault : faults) {

@@ -9,6 +9,6 @@ namespace kickvane::skin {
 // sheet and saves it as a PNG. Works without a Qt application object (it then runs one on the
 // offscreen platform for as long as it draws). Returns 0 on success; otherwise writes why to `err`
 // and returns 1.
-int RunSkinGallery(const std::filesystem::path& outPng, std::ostream& err);
+int runSkinGallery(const std::filesystem::path& outPng, std::ostream& err);
 
 }  // namespace kickvane::skin

@@ -11,11 +11,11 @@
 namespace kickvane::skin {
 namespace {
 
-QColor ToQColor(Colour rgb) {
-    return QColor(RedOf(rgb), GreenOf(rgb), BlueOf(rgb));
+QColor toQColor(Colour colour) {
+    return QColor(redOf(colour), greenOf(colour), blueOf(colour));
 }
 
-Status CheckPieces(const QImage& source, const Piece& from, const Piece& to) {
+Status checkPieces(const QImage& source, const Piece& from, const Piece& to) {
     if (source.isNull()) {
         return Status::Fail("no source picture");
     }
@@ -36,12 +36,12 @@ Status CheckPieces(const QImage& source, const Piece& from, const Piece& to) {
     return Status::Ok();
 }
 
-QRect ToQRect(const Piece& to) {
+QRect toQRect(const Piece& to) {
     return QRect(to.x, to.y, to.width, to.height);
 }
 
 // The part of `area` inside the picture; computed in 64 bits so that no edge can overflow.
-QRect ClipToImage(const QImage& target, const Rect& area) {
+QRect clipToImage(const QImage& target, const Rect& area) {
     const long long left = std::max<long long>(area.left, 0);
     const long long top = std::max<long long>(area.top, 0);
     const long long right = std::min<long long>(area.right, target.width());
@@ -53,7 +53,7 @@ QRect ClipToImage(const QImage& target, const Rect& area) {
                  static_cast<int>(bottom - top));
 }
 
-bool Touches(const QImage& target, const Piece& to) {
+bool touches(const QImage& target, const Piece& to) {
     const auto right = static_cast<long long>(to.x) + to.width;
     const auto bottom = static_cast<long long>(to.y) + to.height;
     return right > 0 && bottom > 0 && to.x < target.width() && to.y < target.height();
@@ -61,28 +61,28 @@ bool Touches(const QImage& target, const Piece& to) {
 
 }  // namespace
 
-Status ImageSurface::CheckTarget() const {
+Status ImageSurface::checkTarget() const {
     if (target_.isNull()) {
         return Status::Fail("no target picture");
     }
     return Status::Ok();
 }
 
-Status ImageSurface::CheckCopy(const QImage& source, const Piece& from, const Piece& to,
+Status ImageSurface::checkCopy(const QImage& source, const Piece& from, const Piece& to,
                                bool& draw) const {
-    if (Status s = CheckTarget(); !s) {
+    if (Status s = checkTarget(); !s) {
         return s;
     }
-    if (Status s = CheckPieces(source, from, to); !s) {
+    if (Status s = checkPieces(source, from, to); !s) {
         return s;
     }
-    draw = !from.IsEmpty() && !to.IsEmpty() && Touches(target_, to);
+    draw = !from.isEmpty() && !to.isEmpty() && touches(target_, to);
     return Status::Ok();
 }
 
-Status ImageSurface::Copy(const QImage& source, const Piece& from, const Piece& to) {
+Status ImageSurface::copy(const QImage& source, const Piece& from, const Piece& to) {
     bool draw = false;
-    if (Status s = CheckCopy(source, from, to, draw); !s || !draw) {
+    if (Status s = checkCopy(source, from, to, draw); !s || !draw) {
         return s;
     }
     // Copying the piece out first keeps smooth scaling from sampling the neighbouring frames.
@@ -90,21 +90,21 @@ Status ImageSurface::Copy(const QImage& source, const Piece& from, const Piece& 
     QPainter painter(&target_);
     painter.setCompositionMode(QPainter::CompositionMode_Source);
     painter.setRenderHint(QPainter::SmoothPixmapTransform, mode_ == StretchMode::Halftone);
-    painter.drawImage(ToQRect(to), piece);
+    painter.drawImage(toQRect(to), piece);
     return Status::Ok();
 }
 
-Status ImageSurface::CopyKeyed(const QImage& source, const Piece& from, const Piece& to,
+Status ImageSurface::copyKeyed(const QImage& source, const Piece& from, const Piece& to,
                                Colour key) {
     bool draw = false;
-    if (Status s = CheckCopy(source, from, to, draw); !s || !draw) {
+    if (Status s = checkCopy(source, from, to, draw); !s || !draw) {
         return s;
     }
     // The key becomes a fully transparent mask; everything else stays opaque, and nearest-pixel
     // scaling keeps the mask exact.
     QImage piece =
         source.copy(from.x, from.y, from.width, from.height).convertToFormat(QImage::Format_ARGB32);
-    const QRgb keyRgb = qRgb(RedOf(key), GreenOf(key), BlueOf(key));
+    const QRgb keyRgb = qRgb(redOf(key), greenOf(key), blueOf(key));
     for (int y = 0; y < piece.height(); ++y) {
         auto* line = reinterpret_cast<QRgb*>(piece.scanLine(y));
         for (int x = 0; x < piece.width(); ++x) {
@@ -114,32 +114,32 @@ Status ImageSurface::CopyKeyed(const QImage& source, const Piece& from, const Pi
     QPainter painter(&target_);
     painter.setCompositionMode(QPainter::CompositionMode_SourceOver);
     painter.setRenderHint(QPainter::SmoothPixmapTransform, false);
-    painter.drawImage(ToQRect(to), piece);
+    painter.drawImage(toQRect(to), piece);
     return Status::Ok();
 }
 
-Status ImageSurface::Fill(const Rect& area, Colour rgb) {
-    if (Status s = CheckTarget(); !s) {
+Status ImageSurface::fill(const Rect& area, Colour colour) {
+    if (Status s = checkTarget(); !s) {
         return s;
     }
-    const QRect box = ClipToImage(target_, area);
+    const QRect box = clipToImage(target_, area);
     if (box.isEmpty()) {
         return Status::Ok();
     }
     QPainter painter(&target_);
-    painter.fillRect(box, ToQColor(rgb));
+    painter.fillRect(box, toQColor(colour));
     return Status::Ok();
 }
 
-Status ImageSurface::Line(int x1, int y1, int x2, int y2, Colour rgb, int width) {
-    if (Status s = CheckTarget(); !s) {
+Status ImageSurface::line(int x1, int y1, int x2, int y2, Colour colour, int width) {
+    if (Status s = checkTarget(); !s) {
         return s;
     }
     if (width < 1) {
         return Status::Fail("line width below one pixel");
     }
     QPainter painter(&target_);
-    QPen pen(ToQColor(rgb));
+    QPen pen(toQColor(colour));
     pen.setWidth(width);
     pen.setCapStyle(Qt::SquareCap);
     painter.setPen(pen);
@@ -147,8 +147,8 @@ Status ImageSurface::Line(int x1, int y1, int x2, int y2, Colour rgb, int width)
     return Status::Ok();
 }
 
-Status ImageSurface::Text(const Rect& box, std::string_view utf8, Colour rgb) {
-    if (Status s = CheckTarget(); !s) {
+Status ImageSurface::text(const Rect& box, std::string_view utf8, Colour colour) {
+    if (Status s = checkTarget(); !s) {
         return s;
     }
     if (qobject_cast<QGuiApplication*>(QCoreApplication::instance()) == nullptr) {
@@ -157,7 +157,7 @@ Status ImageSurface::Text(const Rect& box, std::string_view utf8, Colour rgb) {
     if (box.right <= box.left || box.bottom <= box.top || utf8.empty()) {
         return Status::Ok();
     }
-    const QRect clip = ClipToImage(target_, box);
+    const QRect clip = clipToImage(target_, box);
     if (clip.isEmpty()) {
         return Status::Ok();
     }
@@ -170,7 +170,7 @@ Status ImageSurface::Text(const Rect& box, std::string_view utf8, Colour rgb) {
     const QRect area(box.left, box.top, static_cast<int>(width), static_cast<int>(height));
     QPainter painter(&target_);
     painter.setClipRect(clip);
-    painter.setPen(ToQColor(rgb));
+    painter.setPen(toQColor(colour));
     const QString text = QString::fromUtf8(utf8.data(), static_cast<qsizetype>(utf8.size()));
     const QString shown = painter.fontMetrics().elidedText(text, Qt::ElideRight, area.width());
     painter.drawText(area, Qt::AlignLeft | Qt::AlignVCenter | Qt::TextSingleLine, shown);

@@ -12,19 +12,19 @@ class ImageSurface final : public Surface {
 public:
     explicit ImageSurface(QImage& target) : target_(target) {}
 
-    void SetStretchMode(StretchMode mode) override { mode_ = mode; }
+    void setStretchMode(StretchMode mode) override { mode_ = mode; }
     StretchMode stretchMode() const { return mode_; }
 
-    Status Copy(const QImage& source, const Piece& from, const Piece& to) override;
-    Status CopyKeyed(const QImage& source, const Piece& from, const Piece& to, Colour key) override;
-    Status Fill(const Rect& area, Colour rgb) override;
-    Status Line(int x1, int y1, int x2, int y2, Colour rgb, int width) override;
-    Status Text(const Rect& box, std::string_view utf8, Colour rgb) override;
+    Status copy(const QImage& source, const Piece& from, const Piece& to) override;
+    Status copyKeyed(const QImage& source, const Piece& from, const Piece& to, Colour key) override;
+    Status fill(const Rect& area, Colour colour) override;
+    Status line(int x1, int y1, int x2, int y2, Colour colour, int width) override;
+    Status text(const Rect& box, std::string_view utf8, Colour colour) override;
 
 private:
-    Status CheckTarget() const;
+    Status checkTarget() const;
     // Checks a copy before it draws: a failure, or ok with `draw` false when nothing would show.
-    Status CheckCopy(const QImage& source, const Piece& from, const Piece& to, bool& draw) const;
+    Status checkCopy(const QImage& source, const Piece& from, const Piece& to, bool& draw) const;
 
     QImage& target_;
     StretchMode mode_ = StretchMode::Plain;

@@ -14,12 +14,12 @@ struct NinePieces {
     std::array<Piece, 9> from;
 };
 
-bool FitsInt(long long v) {
+bool fitsInt(long long v) {
     return v >= std::numeric_limits<int>::min() && v <= std::numeric_limits<int>::max();
 }
 
-std::optional<Piece> MakePiece(long long x, long long y, long long w, long long h) {
-    if (!FitsInt(x) || !FitsInt(y) || !FitsInt(w) || !FitsInt(h)) {
+std::optional<Piece> makePiece(long long x, long long y, long long w, long long h) {
+    if (!fitsInt(x) || !fitsInt(y) || !fitsInt(w) || !fitsInt(h)) {
         return std::nullopt;
     }
     return Piece{static_cast<int>(x), static_cast<int>(y), static_cast<int>(w),
@@ -30,7 +30,7 @@ enum class Layout { Pieces, Nothing, Invalid };
 
 // Works out the nine target and source pieces in 64 bits, so that extreme coordinates cannot
 // overflow.
-Layout Lay(const QImage& source, const Margins& m, const Rect& t, const Frame& f, NinePieces& out) {
+Layout lay(const QImage& source, const Margins& m, const Rect& t, const Frame& f, NinePieces& out) {
     if (m.left < 0 || m.top < 0 || m.right < 0 || m.bottom < 0) {
         return Layout::Invalid;
     }
@@ -70,8 +70,8 @@ Layout Lay(const QImage& source, const Margins& m, const Rect& t, const Frame& f
         {ml, Y0 + mt, srcW, srcH},
     }};
     for (std::size_t i = 0; i < 9; ++i) {
-        const auto target = MakePiece(to[i][0], to[i][1], to[i][2], to[i][3]);
-        const auto src = MakePiece(from[i][0], from[i][1], from[i][2], from[i][3]);
+        const auto target = makePiece(to[i][0], to[i][1], to[i][2], to[i][3]);
+        const auto src = makePiece(from[i][0], from[i][1], from[i][2], from[i][3]);
         if (!target || !src) {
             return Layout::Invalid;
         }
@@ -82,10 +82,10 @@ Layout Lay(const QImage& source, const Margins& m, const Rect& t, const Frame& f
 }
 
 template <typename CopyFn>
-Status PaintPieces(Surface& target, const QImage& source, const Margins& margins,
+Status paintPieces(Surface& target, const QImage& source, const Margins& margins,
                    const Rect& targetRect, const Frame& frame, bool halftone, CopyFn copy) {
     NinePieces pieces;
-    switch (Lay(source, margins, targetRect, frame, pieces)) {
+    switch (lay(source, margins, targetRect, frame, pieces)) {
         case Layout::Invalid:
             return Status::Fail("frame margins or position do not fit the picture");
         case Layout::Nothing:
@@ -94,10 +94,10 @@ Status PaintPieces(Surface& target, const QImage& source, const Margins& margins
             break;
     }
     if (halftone) {
-        target.SetStretchMode(StretchMode::Halftone);
+        target.setStretchMode(StretchMode::Halftone);
     }
     for (std::size_t i = 0; i < 9; ++i) {
-        if (pieces.to[i].IsEmpty() || pieces.from[i].IsEmpty()) {
+        if (pieces.to[i].isEmpty() || pieces.from[i].isEmpty()) {
             continue;
         }
         if (Status s = copy(pieces.from[i], pieces.to[i]); !s) {
@@ -109,7 +109,7 @@ Status PaintPieces(Surface& target, const QImage& source, const Margins& margins
 
 }  // namespace
 
-Frame FrameOf(const QImage& picture, int count, int index) {
+Frame frameOf(const QImage& picture, int count, int index) {
     if (count <= 0) {
         return Frame{picture.width(), 0, 0};
     }
@@ -120,25 +120,25 @@ Frame FrameOf(const QImage& picture, int count, int index) {
                                                         std::numeric_limits<int>::max()))};
 }
 
-Status PaintNine(Surface& target, const QImage& source, const Margins& margins,
+Status paintNine(Surface& target, const QImage& source, const Margins& margins,
                  const Rect& targetRect, const Frame& frame) {
-    return PaintPieces(
+    return paintPieces(
         target, source, margins, targetRect, frame, true,
-        [&](const Piece& from, const Piece& to) { return target.Copy(source, from, to); });
+        [&](const Piece& from, const Piece& to) { return target.copy(source, from, to); });
 }
 
-Status PaintNineInCurrentMode(Surface& target, const QImage& source, const Margins& margins,
+Status paintNineInCurrentMode(Surface& target, const QImage& source, const Margins& margins,
                               const Rect& targetRect, const Frame& frame) {
-    return PaintPieces(
+    return paintPieces(
         target, source, margins, targetRect, frame, false,
-        [&](const Piece& from, const Piece& to) { return target.Copy(source, from, to); });
+        [&](const Piece& from, const Piece& to) { return target.copy(source, from, to); });
 }
 
-Status PaintNineKeyed(Surface& target, const QImage& source, const Margins& margins,
+Status paintNineKeyed(Surface& target, const QImage& source, const Margins& margins,
                       const Rect& targetRect, const Frame& frame, Colour key) {
-    return PaintPieces(target, source, margins, targetRect, frame, true,
+    return paintPieces(target, source, margins, targetRect, frame, true,
                        [&](const Piece& from, const Piece& to) {
-                           return target.CopyKeyed(source, from, to, key);
+                           return target.copyKeyed(source, from, to, key);
                        });
 }
 

@@ -16,7 +16,7 @@ struct Frame {
 
 // Frame `index` of a picture cut into `count` equal bands from the top down. The band height is
 // the picture height divided by `count`, rounded to a whole pixel.
-Frame FrameOf(const QImage& picture, int count, int index);
+Frame frameOf(const QImage& picture, int count, int index);
 
 // Draws `frame` of `source` stretched to `target`: the four corners keep their size, the four
 // sides stretch along their length and the middle along both axes. Sets the halftone stretch mode
@@ -25,16 +25,16 @@ Frame FrameOf(const QImage& picture, int count, int index);
 // side). A target narrower than left + right margin or lower than top + bottom margin draws
 // nothing and is no error. Fails, without drawing, on negative margins, margins that do not fit
 // the frame, and a frame outside the picture; stops at the first failing copy.
-Status PaintNine(Surface& target, const QImage& source, const Margins& margins,
+Status paintNine(Surface& target, const QImage& source, const Margins& margins,
                  const Rect& targetRect, const Frame& frame);
 
 // The same with keyed copies: target pixels stay where the frame has the colour `key`.
-Status PaintNineKeyed(Surface& target, const QImage& source, const Margins& margins,
+Status paintNineKeyed(Surface& target, const QImage& source, const Margins& margins,
                       const Rect& targetRect, const Frame& frame, Colour key);
 
 // PaintNine's pieces copied in the surface's current stretch mode, for parts drawn with plain
 // stretching copies.
-Status PaintNineInCurrentMode(Surface& target, const QImage& source, const Margins& margins,
+Status paintNineInCurrentMode(Surface& target, const QImage& source, const Margins& margins,
                               const Rect& targetRect, const Frame& frame);
 
 }  // namespace kickvane::skin

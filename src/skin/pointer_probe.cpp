@@ -10,7 +10,7 @@ namespace {
 
 // The visible child window of `window` under the global point, searched depth first; the last
 // child is the topmost.
-QWindow* DeepestAt(QWindow* window, const QPoint& global) {
+QWindow* deepestAt(QWindow* window, const QPoint& global) {
     const QObjectList& children = window->children();
     for (auto it = children.rbegin(); it != children.rend(); ++it) {
         auto* child = qobject_cast<QWindow*>(*it);
@@ -19,7 +19,7 @@ QWindow* DeepestAt(QWindow* window, const QPoint& global) {
         }
         const QRect area(child->mapToGlobal(QPoint(0, 0)), child->size());
         if (area.contains(global)) {
-            return DeepestAt(child, global);
+            return deepestAt(child, global);
         }
     }
     return window;
@@ -27,7 +27,7 @@ QWindow* DeepestAt(QWindow* window, const QPoint& global) {
 
 }  // namespace
 
-Status QtPointerProbe::WindowAtCursor(WindowHandle& window) const {
+Status QtPointerProbe::windowAtCursor(WindowHandle& window) const {
     window = 0;
     if (qobject_cast<QGuiApplication*>(QCoreApplication::instance()) == nullptr) {
         return Status::Fail("reading the cursor needs a running application");
@@ -35,7 +35,7 @@ Status QtPointerProbe::WindowAtCursor(WindowHandle& window) const {
     const QPoint global = QCursor::pos();
     QWindow* top = QGuiApplication::topLevelAt(global);
     if (top != nullptr) {
-        window = static_cast<WindowHandle>(DeepestAt(top, global)->winId());
+        window = static_cast<WindowHandle>(deepestAt(top, global)->winId());
     }
     return Status::Ok();
 }

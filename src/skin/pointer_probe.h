@@ -13,14 +13,14 @@ public:
 
     // Sets `window` to the window under the cursor, 0 when the cursor is over no window of ours.
     // Fails when the cursor position cannot be read.
-    virtual Status WindowAtCursor(WindowHandle& window) const = 0;
+    virtual Status windowAtCursor(WindowHandle& window) const = 0;
 };
 
 // Asks Qt: the cursor position and the deepest visible QWindow that contains it. A handle is the
 // QWindow's winId(). Fails without a running QGuiApplication.
 class QtPointerProbe final : public PointerProbe {
 public:
-    Status WindowAtCursor(WindowHandle& window) const override;
+    Status windowAtCursor(WindowHandle& window) const override;
 };
 
 }  // namespace kickvane::skin

@@ -26,28 +26,28 @@ class ShapeHelper {
 public:
     // The RGB value of `colour`; nullopt for an unknown system colour or a colour value that is
     // neither RGB nor a system colour.
-    static std::optional<Colour> TranslateColor(Colour colour);
+    static std::optional<Colour> translateColor(Colour colour);
 
     // `colour` with `amount` added to each channel, clamped to 0..255 (negative darkens).
-    static std::optional<Colour> ShadeColor(Colour colour, int amount);
+    static std::optional<Colour> shadeColor(Colour colour, int amount);
 
-    Status FillBox(Surface& dc, int left, int top, int right, int bottom, Colour colour) const;
+    Status fillBox(Surface& dc, int left, int top, int right, int bottom, Colour colour) const;
 
     // A one-pixel outline along the inside of the rectangle.
-    Status FrameBox(Surface& dc, int left, int top, int right, int bottom, Colour colour) const;
+    Status frameBox(Surface& dc, int left, int top, int right, int bottom, Colour colour) const;
 
     // A sunken two-pixel edge along the inside of the rectangle: shadow above and left, light
     // below and right.
-    Status SunkenEdge(Surface& dc, const Rect& box) const;
+    Status sunkenEdge(Surface& dc, const Rect& box) const;
 
-    Status DrawLine(Surface& dc, int x1, int y1, int x2, int y2, Colour colour, int width) const;
+    Status drawLine(Surface& dc, int x1, int y1, int x2, int y2, Colour colour, int width) const;
 
     // One line of text, left aligned and vertically centred in `box`.
-    Status DrawText(Surface& dc, const Rect& box, std::string_view utf8, Colour colour) const;
+    Status drawText(Surface& dc, const Rect& box, std::string_view utf8, Colour colour) const;
 
     // A named part of the system's visual style (class name, part, state). Knows the size grip
     // of a status bar ("Status", part 3) and draws any other part as a plain raised box.
-    Status DrawThemePart(Surface& dc, std::string_view className, int part, int state,
+    Status drawThemePart(Surface& dc, std::string_view className, int part, int state,
                          const Rect& box) const;
 };
 

@@ -4,209 +4,167 @@
 
 namespace kickvane::skin {
 
-using rect_math::FloorHalf;
-using rect_math::Moved;
+using rect_math::floorHalf;
+using rect_math::moved;
 
 namespace {
 
 constexpr int kCellSize = 13;
 constexpr Margins kMargins3{3, 3, 3, 3};
-constexpr Colour kOutlineBlue = 13603685;  // red 101, green 147, blue 207
+constexpr Colour kOutlineBlue = rgb(101, 147, 207);
+
+// Pictures with one frame or cell per look hold them in the order of ControlLook.
+int lookIndex(ControlLook look) {
+    return static_cast<int>(look);
+}
 
 }  // namespace
 
-Piece GlyphPlace(const Rect& box) {
-    const long long x = box.left + FloorHalf(static_cast<long long>(box.right) - box.left) - 4;
-    const long long y = box.top + FloorHalf(static_cast<long long>(box.bottom) - box.top) - 4;
-    if (!rect_math::FitsInt(x) || !rect_math::FitsInt(y)) {
+Piece glyphPlace(const Rect& box) {
+    const long long x = box.left + floorHalf(static_cast<long long>(box.right) - box.left) - 4;
+    const long long y = box.top + floorHalf(static_cast<long long>(box.bottom) - box.top) - 4;
+    if (!rect_math::fitsInt(x) || !rect_math::fitsInt(y)) {
         return Piece{0, 0, 0, 0};
     }
     return Piece{static_cast<int>(x), static_cast<int>(y), 9, 9};
 }
 
-Skin::Skin() : Skin(MakeSkinPictures()) {}
+Skin::Skin() : Skin(makeSkinPictures()) {}
 
 Skin::Skin(SkinPictures pictures)
     : pictures_(std::move(pictures)), probe_(std::make_shared<QtPointerProbe>()) {}
 
-Status Skin::Nine(Surface& dc, const QImage& picture, int count, int index, const Margins& margins,
+Status Skin::nine(Surface& dc, const QImage& picture, int count, int index, const Margins& margins,
                   const Rect& box) const {
-    return PaintNine(dc, picture, margins, box, FrameOf(picture, count, index));
+    return paintNine(dc, picture, margins, box, frameOf(picture, count, index));
 }
 
-Status Skin::NineKeyed(Surface& dc, const QImage& picture, int count, int index,
+Status Skin::nineKeyed(Surface& dc, const QImage& picture, int count, int index,
                        const Margins& margins, const Rect& box) const {
-    return PaintNineKeyed(dc, picture, margins, box, FrameOf(picture, count, index), kMagentaKey);
+    return paintNineKeyed(dc, picture, margins, box, frameOf(picture, count, index), kMagentaKey);
 }
 
-Status Skin::Glyph(Surface& dc, int cell, const Rect& box) const {
-    const Piece place = GlyphPlace(box);
-    if (place.IsEmpty()) {
+Status Skin::glyph(Surface& dc, int cell, const Rect& box) const {
+    const Piece place = glyphPlace(box);
+    if (place.isEmpty()) {
         return Status::Fail("glyph place out of range");
     }
-    const int cellHeight = pictures_.pArrow.height() / 20;
-    return dc.CopyKeyed(pictures_.pArrow, Piece{0, cell * cellHeight, 9, 9}, place, kMagentaKey);
+    const int cellHeight = pictures_.arrows.height() / 20;
+    return dc.copyKeyed(pictures_.arrows, Piece{0, cell * cellHeight, 9, 9}, place, kMagentaKey);
 }
 
-bool Skin::IsHot(WindowHandle window) const {
-    bool over = false;
-    // A cursor that cannot be read shows the plain look.
-    return MDMouseOver(window, over).ok() && over;
-}
-
-std::string Skin::WindowText(WindowHandle window) const {
-    return readText_ ? readText_(window) : std::string();
-}
-
-Status Skin::MDMouseOver(WindowHandle handleWindow, bool& over) const {
-    over = false;
+std::optional<bool> Skin::isUnderCursor(WindowHandle window) const {
     if (!probe_) {
-        return Status::Fail("no way to find the window under the cursor");
+        return std::nullopt;
     }
     WindowHandle atCursor = 0;
-    if (Status s = probe_->WindowAtCursor(atCursor); !s) {
-        return s;
+    if (!probe_->windowAtCursor(atCursor)) {
+        return std::nullopt;
     }
-    over = atCursor != 0 && atCursor == handleWindow;
-    return Status::Ok();
+    return atCursor != 0 && atCursor == window;
 }
 
-Status Skin::ThemeCheck(WindowHandle, Surface& dc, int state, int plDraw, const Rect& box) {
-    if (plDraw != 0) {
-        return Status::Ok();
-    }
-    if (state < 1 || state > 12) {
-        return Status::Fail("check box state out of range");
-    }
-    return dc.Copy(pictures_.pCheck, Piece{0, (state - 1) * kCellSize, kCellSize, kCellSize},
+Status Skin::paintCheckBox(Surface& dc, CheckState state, ControlLook look, const Rect& box) {
+    const int cell = 4 * static_cast<int>(state) + lookIndex(look);
+    return dc.copy(pictures_.checkBox, Piece{0, cell * kCellSize, kCellSize, kCellSize},
                    Piece{box.left, box.top, kCellSize, kCellSize});
 }
 
-Status Skin::ThemeOption(WindowHandle, Surface& dc, int state, int plDraw, const Rect& box) {
-    if (plDraw != 0 && plDraw != 1) {
-        return Status::Ok();
-    }
-    if (state < 1 || state > 8) {
-        return Status::Fail("option button state out of range");
-    }
-    return dc.CopyKeyed(pictures_.pOption, Piece{0, (state - 1) * kCellSize, kCellSize, kCellSize},
+Status Skin::paintOptionButton(Surface& dc, OptionState state, ControlLook look, const Rect& box) {
+    const int cell = 4 * static_cast<int>(state) + lookIndex(look);
+    return dc.copyKeyed(pictures_.optionButton, Piece{0, cell * kCellSize, kCellSize, kCellSize},
                         Piece{box.left, box.top, kCellSize, kCellSize}, kMagentaKey);
 }
 
-void Skin::ThemeButton(WindowHandle, Surface& dc, int state, bool, bool, const Rect& box) {
-    const int frame = state >= 1 && state <= 5 ? state - 1 : 0;
-    (void)Nine(dc, pictures_.pButton, 5, frame, kMargins3, box);
+void Skin::paintButton(Surface& dc, ButtonLook look, const Rect& box) {
+    (void)nine(dc, pictures_.button, 5, static_cast<int>(look), kMargins3, box);
 }
 
-void Skin::ThemeListbox(WindowHandle hwnd, Surface& dc, int plDraw, const Rect& box) {
-    if (plDraw != 1 && plDraw != 2) {
-        return;
-    }
-    (void)Nine(dc, pictures_.pButton, 5, plDraw == 2 ? 1 : 0, kMargins3, box);
-    if (const auto textBox = Moved(box, 26, 0, 0, 0)) {
-        (void)shapes_.DrawText(dc, *textBox, WindowText(hwnd), kSysWindowText);
+void Skin::paintListBoxItem(Surface& dc, ItemLook look, const Rect& box, std::string_view text) {
+    (void)nine(dc, pictures_.button, 5, look == ItemLook::Hot ? 1 : 0, kMargins3, box);
+    if (const auto textBox = moved(box, 26, 0, 0, 0)) {
+        (void)shapes_.drawText(dc, *textBox, text, kSysWindowText);
     }
 }
 
-void Skin::ThemeCombobox(WindowHandle hwnd, Surface& dc, int state, int plDraw, const Rect& box) {
-    const auto picture = Moved(box, -2, 0, 0, -1);
-    switch (plDraw) {
-        case 0:
-            if (state == 0) {
-                (void)shapes_.FillBox(dc, box.left, box.top, box.right, box.bottom, kSysWindow);
-                (void)shapes_.FrameBox(dc, box.left, box.top, box.right, box.bottom, kOutlineBlue);
-            } else if (state == 1) {
-                (void)shapes_.FillBox(dc, box.left, box.top, box.right, box.bottom, kSysHighlight);
-            } else if (state == 2) {
-                if (const auto textBox = Moved(box, 0, 2, -2, -2)) {
-                    (void)shapes_.DrawText(dc, *textBox, WindowText(hwnd), kSysWindowText);
-                }
-            }
+void Skin::paintComboBox(Surface& dc, ComboPart part, const Rect& box) {
+    switch (part) {
+        case ComboPart::Field:
+            (void)shapes_.fillBox(dc, box.left, box.top, box.right, box.bottom, kSysWindow);
+            (void)shapes_.frameBox(dc, box.left, box.top, box.right, box.bottom, kOutlineBlue);
             return;
-        case 1: {
-            if (!picture) {
-                return;
-            }
-            int frame = 0;
-            switch (state) {
-                case 2:
-                    frame = 1;
-                    break;
-                case 3:
-                    frame = 2;
-                    break;
-                case 4:
-                    frame = 3;
-                    break;
-                default:
-                    frame = 0;
-                    break;
-            }
-            (void)Nine(dc, pictures_.pCombobox, 4, frame, kMargins3, *picture);
-            (void)Glyph(dc, ChevronCell(frame), *picture);
+        case ComboPart::Selection:
+            (void)shapes_.fillBox(dc, box.left, box.top, box.right, box.bottom, kSysHighlight);
             return;
-        }
-        case 2:
-            if (state == 0 && picture) {
-                (void)Nine(dc, pictures_.pButton, 5, 0, kMargins3, *picture);
+        case ComboPart::PushButton:
+            if (const auto picture = moved(box, -2, 0, 0, -1)) {
+                (void)nine(dc, pictures_.button, 5, 0, kMargins3, *picture);
             }
-            return;
-        default:
             return;
     }
 }
 
-void Skin::ThemeTab(WindowHandle, Surface& dc, int plDraw, int state, const Rect& box,
-                    int sPosition) {
-    if (sPosition != 0) {
-        return;
-    }
-    if (plDraw == 0) {
-        (void)Nine(dc, pictures_.pTab, 1, 0, Margins{5, 5, 5, 5}, box);
-    } else if (plDraw == 1) {
-        const int frame = state == 1 ? 1 : state == 2 ? 2 : state == 3 ? 4 : 0;
-        (void)Nine(dc, pictures_.pTabTop, 5, frame, Margins{6, 6, 6, 6}, box);
+void Skin::paintComboText(Surface& dc, const Rect& box, std::string_view text) {
+    if (const auto textBox = moved(box, 0, 2, -2, -2)) {
+        (void)shapes_.drawText(dc, *textBox, text, kSysWindowText);
     }
 }
 
-void Skin::ThemePropertyGrid(WindowHandle, Surface& dc, int state, int plDraw, const Rect& box) {
+void Skin::paintComboButton(Surface& dc, ControlLook look, const Rect& box) {
+    if (const auto picture = moved(box, -2, 0, 0, -1)) {
+        (void)nine(dc, pictures_.comboButton, 4, lookIndex(look), kMargins3, *picture);
+        (void)glyph(dc, chevronCell(lookIndex(look)), *picture);
+    }
+}
+
+void Skin::paintTabPanel(Surface& dc, const Rect& box) {
+    (void)nine(dc, pictures_.tabPanel, 1, 0, Margins{5, 5, 5, 5}, box);
+}
+
+void Skin::paintTabHead(Surface& dc, TabLook look, const Rect& box) {
+    // Frame 3 of the heads is a disabled head, which tabs on top do not show.
+    const int frames[] = {0, 1, 2, 4};
+    (void)nine(dc, pictures_.tabHeads, 5, frames[static_cast<int>(look)], Margins{6, 6, 6, 6}, box);
+}
+
+void Skin::paintPropertyGrid(Surface& dc, PropertyGridPart part, const Rect& box) {
     const auto [l, t, r, b] = box;
-    if (plDraw == 1 && state == 0) {
-        (void)Nine(dc, pictures_.pTab, 1, 0, kMargins3, box);
-    } else if (plDraw == 1 && state == 1) {
-        (void)shapes_.FrameBox(dc, l, t, r, b, Rgb(49, 106, 197));
-    } else if (plDraw == 0) {
-        if (state == 0) {
-            (void)shapes_.FillBox(dc, l, t, r, b, kSysWindow);
-            (void)shapes_.FrameBox(dc, l, t, r, b, kSysButtonFace);
-        } else if (state == 1) {
-            (void)shapes_.FillBox(dc, l, t, r, b, kSysHighlight);
-        } else {
-            (void)shapes_.FillBox(dc, l, t, r, b, kSysButtonFace);
-        }
+    switch (part) {
+        case PropertyGridPart::Panel:
+            (void)nine(dc, pictures_.tabPanel, 1, 0, kMargins3, box);
+            return;
+        case PropertyGridPart::FocusFrame:
+            (void)shapes_.frameBox(dc, l, t, r, b, rgb(49, 106, 197));
+            return;
+        case PropertyGridPart::Cell:
+            (void)shapes_.fillBox(dc, l, t, r, b, kSysWindow);
+            (void)shapes_.frameBox(dc, l, t, r, b, kSysButtonFace);
+            return;
+        case PropertyGridPart::SelectedCell:
+            (void)shapes_.fillBox(dc, l, t, r, b, kSysHighlight);
+            return;
+        case PropertyGridPart::CategoryRow:
+            (void)shapes_.fillBox(dc, l, t, r, b, kSysButtonFace);
+            return;
     }
 }
 
-void Skin::ThemeDate(WindowHandle, Surface& dc, int state, int plDraw, const Rect& box) {
-    if (state != 0) {
-        return;
-    }
-    if (plDraw == 1) {
-        (void)Nine(dc, pictures_.pTab, 1, 0, kMargins3, box);
-    } else if (plDraw == 2) {
-        (void)Nine(dc, pictures_.pButton, 5, 0, kMargins3, box);
+void Skin::paintDate(Surface& dc, DatePart part, const Rect& box) {
+    if (part == DatePart::Field) {
+        (void)nine(dc, pictures_.tabPanel, 1, 0, kMargins3, box);
+    } else {
+        (void)nine(dc, pictures_.button, 5, 0, kMargins3, box);
     }
 }
 
-void Skin::DrawListview(WindowHandle, Surface& dc, int plDraw, int state, const Rect& box) {
-    if (plDraw == 0) {
-        const int frame = state == 0 ? 3 : state == 2 ? 2 : state == 3 ? 1 : 0;
-        (void)Nine(dc, pictures_.pListView, 5, frame, kMargins3, box);
-    } else if (plDraw == 1) {
-        (void)Nine(dc, pictures_.pListView, 5, 0, kMargins3, box);
-    } else if (plDraw == 2) {
-        (void)shapes_.FrameBox(dc, box.left, box.top, box.right, box.bottom, kOutlineBlue);
-    }
+void Skin::paintListHeader(Surface& dc, HeaderLook look, const Rect& box) {
+    // The header picture holds normal, pressed, hot, empty.
+    const int frames[] = {3, 0, 2, 1};
+    (void)nine(dc, pictures_.listHeaders, 5, frames[static_cast<int>(look)], kMargins3, box);
+}
+
+void Skin::paintListOutline(Surface& dc, const Rect& box) {
+    (void)shapes_.frameBox(dc, box.left, box.top, box.right, box.bottom, kOutlineBlue);
 }
 
 }  // namespace kickvane::skin

@@ -1,8 +1,8 @@
 #pragma once
 
-#include <functional>
 #include <memory>
-#include <string>
+#include <optional>
+#include <string_view>
 
 #include "platform/status.h"
 #include "skin/paint_nine.h"
@@ -13,154 +13,205 @@
 
 namespace kickvane::skin {
 
-// Reads the text of a window as UTF-8 (the message helper's ReadWindowText); empty when unknown.
-using WindowTextReader = std::function<std::string(WindowHandle)>;
+enum class Orientation { Horizontal, Vertical };
+
+// The four looks most controls have; also the order of their frames and of the arrow glyphs.
+enum class ControlLook {
+    Normal = kGlyphNormal,
+    Hot = kGlyphHot,
+    Pressed = kGlyphPressed,
+    Disabled = kGlyphDisabled
+};
+
+enum class ButtonLook { Normal, Hot, Pressed, Disabled, Default };
+enum class CheckState { Unticked, Ticked, Mixed };
+enum class OptionState { Clear, Selected };
+
+// A scroll bar's arrow button; Hover is the normal button while the cursor is over its bar.
+enum class ScrollButtonLook { Normal, Hover, Hot, Pressed, Disabled };
+
+// Where the point of a track bar's thumb goes: towards the top (left on a vertical bar), towards
+// the bottom (right), or neither.
+enum class ThumbPoint { TopOrLeft, BottomOrRight, None };
+enum class ThumbLook { Normal, Hot, Disabled };
+
+enum class ItemLook { Normal, Hot };
+enum class TabLook { Normal, Hot, Selected, SelectedFocused };
+enum class HeaderLook { Empty, Normal, Hot, Pressed };
+
+enum class ComboPart {
+    Field,       // the white field with its outline
+    Selection,   // the highlighted selection
+    PushButton,  // the whole box drawn as a push button
+};
+
+enum class PropertyGridPart { Panel, FocusFrame, Cell, SelectedCell, CategoryRow };
+enum class DatePart { Field, DropButton };
+
+enum class StatusBarPart {
+    Bar,  // the bar with its divider at the right end
+    SizeGrip,
+    Panel,
+    ProgressTrough,  // the trough of a progress part, over the whole box
+    ProgressBar,     // its bar, inset in the box; the box's right edge is how far it has come
+    SimpleBar,       // the bar of a status bar without panels
+};
+
+// Parts of a command bar's menus. Their looks: see paintMenu.
+enum class MenuPart {
+    BarItem,        // an item of the menu bar
+    ItemHighlight,  // the highlight of a popup item
+    Band,           // the left band of a popup
+    MarkBox,        // the box behind a tick or bullet
+    Tick,
+    Bullet,
+    BoxedTick,          // a tick in its box
+    BoxedBullet,        // a bullet in its box
+    Button,             // a button inside a menu, such as its chevron
+    CheckedBarItem,     // a checked item of the menu bar
+    HighlightOverBand,  // a popup item's highlight that covers the left band
+    RaisedButton,       // a raised button inside a menu
+};
+enum class MenuLook { Normal, Hot, Open, Pressed, Checked, Disabled };
+
+enum class ToolbarButtonPart {
+    Button,
+    ButtonWithDropDown,  // a button with its drop-down part at the right
+    DropDown,            // the drop-down part alone
+};
+enum class ToolbarLook { Flat, Hot, Pressed, Checked, CheckedHot, Raised };
+
+// The flat boxes of menus. Their looks: see paintMenuBox.
+enum class MenuBox { Background, Item, Margin, Separator, Highlight, Button, Outline };
+enum class MenuBoxLook { Normal, Hot, Pressed };
+
+enum class ColorPopupPart { Background, SelectedCell, Outline };
+
+enum class WindowTabPart {
+    Strip,  // the strip the tabs stand on
+    ActiveTab,
+    InactiveTab,
+    PageFrame,  // the frame around the page under the tabs
+    HotButton,  // the box of a strip button under the cursor
+    PressedButton,
+    Divider,  // a line between two inactive tabs, at the box's left edge
+};
+inline constexpr int kWindowTabStripHeight = 15;
+inline constexpr int kWindowTabOverlap = 5;
 
 // Paints skinned pictures of common controls into a surface the caller passes in. The caller owns
-// the window and decides when to paint and in which state; the painters keep no state between
+// the window and decides when to paint and in which look; the painters keep no state between
 // calls and draw only inside the rectangle they are given.
 //
-// Selectors (plDraw, State, ePart, ...) are the small integers the control's owner-draw code
-// passes. Values a painter does not know draw nothing. Most painters suppress errors: a failing
-// step is skipped and the next runs. ThemeCheck, ThemeOption, ThemePopupColor and ThemeMDITab
-// instead stop at the first error and return it.
+// Most painters suppress errors: a failing step is skipped and the next runs. The painters that
+// return a Status (check box, option button, colour popup, window tabs) stop at the first error
+// and return it.
 class Skin {
 public:
-    // Our own generated pictures, the Qt cursor and no window text.
+    // Our own generated pictures and the Qt cursor.
     Skin();
     explicit Skin(SkinPictures pictures);
 
-    const SkinPictures& Pictures() const { return pictures_; }
-    void SetPointerProbe(std::shared_ptr<const PointerProbe> probe) { probe_ = std::move(probe); }
-    void SetWindowTextReader(WindowTextReader reader) { readText_ = std::move(reader); }
+    const SkinPictures& pictures() const { return pictures_; }
+    void setPointerProbe(std::shared_ptr<const PointerProbe> probe) { probe_ = std::move(probe); }
 
-    // Menus of a command bar (the menu bar and its popups), by plDraw:
-    //   0 menu bar item: State 1 hot, 2 open
-    //   1 popup item highlight: State 1 enabled item, 2 disabled item
-    //   2 left band of a popup
-    //   3 box behind a mark: State 0 normal, 1 hot, 2 disabled
-    //   4 tick, 5 bullet: State 0 or 1 normal, 2 disabled
-    //   6 tick in its box, 7 bullet in its box: State as for 3
-    //   8 a button inside a menu (its chevron): State 0 hot, 1 pressed, 2 checked
-    //   9 a checked menu bar item: State 1 hot
-    //   10 popup item highlight over the left band: State as for 1
-    //   11 a raised button inside a menu
-    void ThemeCommandBarMenu(WindowHandle hwnd, Surface& dc, int plDraw, int state,
-                             const Rect& box);
+    // Whether the window under the cursor is exactly `window` (a child window above it counts as
+    // another window); nullopt when the cursor cannot be read. Callers use it to choose hot looks.
+    std::optional<bool> isUnderCursor(WindowHandle window) const;
 
-    // A property grid: plDraw 1 with State 0 the panel; plDraw 0 a cell (State 0 normal, 1
-    // selected, other a category row); plDraw 1 with State 1 the focus frame.
-    void ThemePropertyGrid(WindowHandle hwnd, Surface& dc, int state, int plDraw, const Rect& box);
+    void paintButton(Surface& dc, ButtonLook look, const Rect& box);
 
-    // A date field: plDraw 1 with State 0 the field, plDraw 2 with State 0 its drop button.
-    void ThemeDate(WindowHandle hwnd, Surface& dc, int state, int plDraw, const Rect& box);
+    // A 13 x 13 box at the top left of `box`.
+    Status paintCheckBox(Surface& dc, CheckState state, ControlLook look, const Rect& box);
+    // A round 13 x 13 button at the top left of `box`; the target shows around it.
+    Status paintOptionButton(Surface& dc, OptionState state, ControlLook look, const Rect& box);
 
-    // sButton: 2 up, 1 down, 0 left, 3 right. State: 0 or 4 normal, 1 hot, 2 pressed,
-    // 3 disabled. The arrow sits in the middle of the button.
-    void ThemeSpinButton(Surface& dc, int state, int sButton, const Rect& box);
+    // The trough of a progress bar over `box`.
+    void paintProgressTrough(Surface& dc, Orientation orientation, const Rect& box);
+    // The bar of a progress bar, inset by 2 pixels inside `box`.
+    void paintProgressBar(Surface& dc, Orientation orientation, const Rect& box);
 
-    // The outline of a text box for bState 0 or 1. Width and Height are the right and bottom edges,
-    // as the outline takes them.
-    void DrawTextbox(WindowHandle hwnd, Surface& dc, int bState, int x, int y, int width,
-                     int height);
+    // A scroll bar's arrow button, its arrow in the middle.
+    void paintScrollButton(Surface& dc, ArrowDirection direction, ScrollButtonLook look,
+                           const Rect& box);
+    // The track, stretched only along its length.
+    void paintScrollTrack(Surface& dc, Orientation bar, const Rect& box);
+    void paintScrollThumb(Surface& dc, Orientation bar, ControlLook look, const Rect& box);
+    // The box where two scroll bars meet; a disabled one draws nothing.
+    void paintSizeBox(Surface& dc, ControlLook look, const Rect& box);
 
-    // A track bar: plDraw 0 the channel, plDraw 1 the thumb. Ticks 0 points the thumb up (left
-    // when upright), 1 down (right), 2 neither. cOrientation 0 is a lying bar with an upright
-    // thumb; any other value an upright bar with a lying thumb. Frame: disabled, else hot, else
-    // normal.
-    void ThemeTrackbar(WindowHandle hwnd, Surface& dc, bool bEnable, bool hot, int ticks,
-                       int plDraw, int cOrientation, const Rect& box);
+    // A spin button, its arrow in the middle.
+    void paintSpinButton(Surface& dc, ArrowDirection direction, ControlLook look, const Rect& box);
 
-    // A scroll bar part. ePart: 0 and 1 the arrow buttons (up/down or left/right), 2 and 3 the
-    // track, 4 the size box, 5 the thumb. eState: 0 normal, 1 pressed, 2 hot, 3 disabled. A
-    // normal button shows the hover look while the cursor is over lhWnd.
-    void ThemeScroll(WindowHandle lhWnd, Surface& dc, const Rect& box, int ePart, int eState,
-                     bool sVertical);
+    void paintTrackBarChannel(Surface& dc, const Rect& box);
+    // A horizontal bar carries an upright thumb, a vertical bar a lying one.
+    void paintTrackBarThumb(Surface& dc, Orientation bar, ThumbPoint point, ThumbLook look,
+                            const Rect& box);
 
-    // A list box item: plDraw 1 normal, 2 hot; the window's text follows from left + 26.
-    void ThemeListbox(WindowHandle hwnd, Surface& dc, int plDraw, const Rect& box);
+    // A list box item with its text from 26 pixels right of the box's left edge.
+    void paintListBoxItem(Surface& dc, ItemLook look, const Rect& box, std::string_view text);
 
-    // A status bar: 0 the bar, 1 the size grip, 2 a panel, 3 the trough and 4 the bar of a progress
-    // part, 5 the bar in simple mode.
-    void ThemeStatusBar(WindowHandle handle, Surface& dc, int plDraw, const Rect& box);
+    // The push button look and the drop button take the box from 2 pixels left of `box` to one
+    // pixel above its bottom.
+    void paintComboBox(Surface& dc, ComboPart part, const Rect& box);
+    void paintComboText(Surface& dc, const Rect& box, std::string_view text);
+    // The drop button with its chevron.
+    void paintComboButton(Surface& dc, ControlLook look, const Rect& box);
 
-    // Tabs, when sPosition is 0 (tabs on top): plDraw 0 the panel, plDraw 1 a head with State
-    // 0 normal, 1 hot, 2 selected, 3 selected with focus.
-    void ThemeTab(WindowHandle handle, Surface& dc, int plDraw, int state, const Rect& box,
-                  int sPosition);
+    void paintStatusBar(Surface& dc, StatusBarPart part, const Rect& box);
 
-    // A list view header: plDraw 0 by State (0 the empty header, 1 normal, 2 hot, 3 pressed),
-    // plDraw 1 a normal header, plDraw 2 the outline of the list.
-    void DrawListview(WindowHandle lhWnd, Surface& dc, int plDraw, int state, const Rect& box);
+    void paintTabPanel(Surface& dc, const Rect& box);
+    void paintTabHead(Surface& dc, TabLook look, const Rect& box);
 
-    // A combo box. plDraw 0: State 0 the field, 1 the selection, 2 the window's text. plDraw 1:
-    // the drop button with State 1 or 5 normal, 2 hot, 3 pressed, 4 disabled. plDraw 2 with
-    // State 0: a push-button look.
-    void ThemeCombobox(WindowHandle hwnd, Surface& dc, int state, int plDraw, const Rect& box);
+    void paintListHeader(Surface& dc, HeaderLook look, const Rect& box);
+    void paintListOutline(Surface& dc, const Rect& box);
 
-    // A push button: State 1 normal, 2 hot, 3 pressed, 4 disabled, 5 default; other values normal.
-    void ThemeButton(WindowHandle hwnd, Surface& dc, int state, bool bFocus, bool bHotMove,
-                     const Rect& box);
+    void paintPropertyGrid(Surface& dc, PropertyGridPart part, const Rect& box);
+    void paintDate(Surface& dc, DatePart part, const Rect& box);
 
-    // A progress bar: the trough from (box.left, box.top) to (pgWidth, pgHeight), when that
-    // edge is positive, and the bar inset by 2 inside box. plDraw 0 lying, other upright.
-    void ThemeProgress(WindowHandle handle, Surface& dc, int plDraw, int pgWidth, int pgHeight,
-                       const Rect& box);
+    // The looks each part shows (others draw nothing):
+    //   BarItem: Hot, Open.  ItemHighlight, HighlightOverBand: Hot, Disabled (a disabled item
+    //   under the cursor; the band is drawn for every look).  Band, RaisedButton: any.
+    //   MarkBox, BoxedTick, BoxedBullet: Normal, Hot, Disabled.  Tick, Bullet: Normal, Hot (the
+    //   same), Disabled.  Button: Hot, Pressed, Checked.  CheckedBarItem: Hot, any other.
+    void paintMenu(Surface& dc, MenuPart part, MenuLook look, const Rect& box);
 
-    // A check box of 13 x 13 at the box's top left, when plDraw is 0. State 1 to 4 unticked,
-    // 5 to 8 ticked, 9 to 12 mixed; each normal, hot, pressed, disabled. Fails on other states.
-    Status ThemeCheck(WindowHandle hwnd, Surface& dc, int state, int plDraw, const Rect& box);
+    // The toolbar's background over `bar`.
+    void paintToolbarBackground(Surface& dc, const Rect& bar);
+    // A Flat button draws nothing.
+    void paintToolbarButton(Surface& dc, ToolbarButtonPart part, ToolbarLook look,
+                            const Rect& item);
+    void paintToolbarComboButton(Surface& dc, ControlLook look, const Rect& item);
+    void paintToolbarPanel(Surface& dc, const Rect& item);
 
-    // An option button of 13 x 13 at the box's top left, when plDraw is 0 or 1. State 1 to 4
-    // unset, 5 to 8 set. Fails on other states.
-    Status ThemeOption(WindowHandle hwnd, Surface& dc, int state, int plDraw, const Rect& box);
+    // Flat boxes over `box`; the separator is a line from its top left to its bottom right.
+    //   Background: Normal, Hot.  Item: Normal (outline), Hot (highlighted).  Margin: Normal
+    //   (button face), other (white).  Separator, Outline: any.  Highlight: Normal (blue), other
+    //   (cream).  Button: Normal, Hot, Pressed.
+    void paintMenuBox(Surface& dc, MenuBox part, MenuBoxLook look, const Rect& box);
 
-    // A toolbar. The toolbar's own area is (0, 0, tbWidth, tbHeight); an item's area is
-    // (ItemLeft, ItemTop + 2, ItemWidth, ItemHeight), the last two being right and bottom edges.
-    //   0 background   1 button   2 button with drop-down   3 drop-down part alone
-    //   4 combo drop button   5 panel
-    // tbStatus for buttons: 0 flat (nothing), 1 hot, 2 pressed, 3 checked, 4 checked and hot,
-    // 5 raised; for the combo button as ThemeCombobox's drop button.
-    void ThemeUniToolbar(WindowHandle hwnd, Surface& dc, int plDraw, int itemIndex, int itemLeft,
-                         int itemTop, int itemWidth, int itemHeight, int tbStatus, int tbWidth,
-                         int tbHeight);
+    Status paintColorPopup(Surface& dc, ColorPopupPart part, const Rect& box);
 
-    // Sets `over` to whether the window under the cursor is exactly `handleWindow` (a child
-    // window above it counts as another window). Fails when the cursor cannot be read.
-    Status MDMouseOver(WindowHandle handleWindow, bool& over) const;
+    Status paintWindowTab(Surface& dc, WindowTabPart part, const Rect& box);
 
-    // Flat boxes of menus; mnBottom arrives as a floating value and is rounded.
-    void ThemeMenus(WindowHandle hwnd, Surface& dc, int plDraw, int state, int mnLeft, int mnTop,
-                    int mnRight, double mnBottom);
-
-    // Flat boxes of a colour popup: 0 background, 1 or 2 selected cell, 3 outline.
-    Status ThemePopupColor(WindowHandle hwnd, Surface& dc, int plDraw, const Rect& box);
-
-    // Window tabs. Coordinates are rounded to whole pixels.
-    //   1 tab strip   2 active tab   5 inactive tab   6 frame around the page
-    //   7 sets lReturn to 15 (tab strip height)   8 sets lReturn to 5 (tab overlap)
-    //   10 hot button box   11 pressed button box   12 divider between inactive tabs
-    Status ThemeMDITab(WindowHandle lhWnd, Surface& dc, int plDraw, float x, float y, float x1,
-                       float y1, int& lReturn);
+    // The outline of a text box.
+    void paintTextBoxOutline(Surface& dc, const Rect& box);
 
 private:
     // Frame `index` of `picture` cut into `count` frames, stretched into `box`.
-    Status Nine(Surface& dc, const QImage& picture, int count, int index, const Margins& margins,
+    Status nine(Surface& dc, const QImage& picture, int count, int index, const Margins& margins,
                 const Rect& box) const;
-    Status NineKeyed(Surface& dc, const QImage& picture, int count, int index,
+    Status nineKeyed(Surface& dc, const QImage& picture, int count, int index,
                      const Margins& margins, const Rect& box) const;
-    Status Glyph(Surface& dc, int cell, const Rect& box) const;
-    bool IsHot(WindowHandle window) const;
-    std::string WindowText(WindowHandle window) const;
+    Status glyph(Surface& dc, int cell, const Rect& box) const;
 
     SkinPictures pictures_;
     ShapeHelper shapes_;
     std::shared_ptr<const PointerProbe> probe_;
-    WindowTextReader readText_;
 };
 
 // Where a 9 x 9 glyph goes to sit in the middle of `box`: left + (width / 2) - 4, halves rounded
 // down, and the same downwards.
-Piece GlyphPlace(const Rect& box);
+Piece glyphPlace(const Rect& box);
 
 }  // namespace kickvane::skin

@@ -4,207 +4,191 @@
 
 namespace kickvane::skin {
 
-using rect_math::MakeRect;
-using rect_math::Moved;
+using rect_math::makeRect;
+using rect_math::moved;
 
-void Skin::ThemeProgress(WindowHandle, Surface& dc, int plDraw, int pgWidth, int pgHeight,
-                         const Rect& box) {
-    const bool lying = plDraw == 0;
-    const QImage& picture = lying ? pictures_.pProgress : pictures_.pProgressHor;
-    const Frame trough = lying ? Frame{53, 18, 0} : Frame{18, 53, 0};
-    const Frame bar = lying ? Frame{125, 16, 18} : Frame{16, 51, 53};
-    // pgWidth and pgHeight are the trough's right and bottom edges.
-    if (lying ? pgWidth > 0 : pgHeight > 0) {
-        (void)PaintNine(dc, picture, Margins{2, 2, 2, 2},
-                        Rect{box.left, box.top, pgWidth, pgHeight}, trough);
+namespace {
+
+struct ProgressFrames {
+    const QImage& picture;
+    Frame trough;
+    Frame bar;
+};
+
+ProgressFrames progressFrames(const SkinPictures& pictures, Orientation orientation) {
+    if (orientation == Orientation::Horizontal) {
+        return {pictures.progress, Frame{53, 18, 0}, Frame{125, 16, 18}};
     }
-    if (lying ? box.right > 0 : box.bottom > 0) {
-        if (const auto inset = Moved(box, 2, 2, -2, -2)) {
-            (void)PaintNine(dc, picture, Margins{2, 6, 2, 5}, *inset, bar);
-        }
+    return {pictures.progressVertical, Frame{18, 53, 0}, Frame{16, 51, 53}};
+}
+
+}  // namespace
+
+void Skin::paintProgressTrough(Surface& dc, Orientation orientation, const Rect& box) {
+    const ProgressFrames frames = progressFrames(pictures_, orientation);
+    (void)paintNine(dc, frames.picture, Margins{2, 2, 2, 2}, box, frames.trough);
+}
+
+void Skin::paintProgressBar(Surface& dc, Orientation orientation, const Rect& box) {
+    const ProgressFrames frames = progressFrames(pictures_, orientation);
+    if (const auto inset = moved(box, 2, 2, -2, -2)) {
+        (void)paintNine(dc, frames.picture, Margins{2, 6, 2, 5}, *inset, frames.bar);
     }
 }
 
-void Skin::ThemeScroll(WindowHandle lhWnd, Surface& dc, const Rect& box, int ePart, int eState,
-                       bool sVertical) {
-    switch (ePart) {
-        case 0:
-        case 1: {
-            const int button = (sVertical ? 2 : 0) + ePart;
-            int frame = 0;
-            int glyph = kGlyphNormal;
-            switch (eState) {
-                case 0:
-                    frame = IsHot(lhWnd) ? ScrollHoverFrame(button)
-                                         : ScrollButtonFrame(button, kGlyphNormal);
-                    break;
-                case 1:
-                    frame = ScrollButtonFrame(button, kGlyphPressed);
-                    glyph = kGlyphPressed;
-                    break;
-                case 2:
-                    frame = ScrollButtonFrame(button, kGlyphHot);
-                    glyph = kGlyphHot;
-                    break;
-                case 3:
-                    frame = ScrollButtonFrame(button, kGlyphDisabled);
-                    glyph = kGlyphDisabled;
-                    break;
-                default:
-                    return;
-            }
-            (void)Nine(dc, pictures_.pScrollButton, 20, frame, Margins{5, 5, 5, 5}, box);
-            const ArrowDirection direction =
-                sVertical ? (ePart == 0 ? ArrowDirection::Up : ArrowDirection::Down)
-                          : (ePart == 0 ? ArrowDirection::Left : ArrowDirection::Right);
-            (void)Glyph(dc, ArrowCell(direction, glyph), box);
+void Skin::paintScrollButton(Surface& dc, ArrowDirection direction, ScrollButtonLook look,
+                             const Rect& box) {
+    // The picture holds the buttons left, right, up, down.
+    int button = 0;
+    switch (direction) {
+        case ArrowDirection::Left:
+            button = 0;
+            break;
+        case ArrowDirection::Right:
+            button = 1;
+            break;
+        case ArrowDirection::Up:
+            button = 2;
+            break;
+        case ArrowDirection::Down:
+            button = 3;
+            break;
+    }
+    int glyphLook = kGlyphNormal;
+    switch (look) {
+        case ScrollButtonLook::Normal:
+        case ScrollButtonLook::Hover:
+            break;
+        case ScrollButtonLook::Hot:
+            glyphLook = kGlyphHot;
+            break;
+        case ScrollButtonLook::Pressed:
+            glyphLook = kGlyphPressed;
+            break;
+        case ScrollButtonLook::Disabled:
+            glyphLook = kGlyphDisabled;
+            break;
+    }
+    const int frame = look == ScrollButtonLook::Hover ? scrollHoverFrame(button)
+                                                      : scrollButtonFrame(button, glyphLook);
+    (void)nine(dc, pictures_.scrollButtons, 20, frame, Margins{5, 5, 5, 5}, box);
+    (void)glyph(dc, arrowCell(direction, glyphLook), box);
+}
+
+void Skin::paintScrollTrack(Surface& dc, Orientation bar, const Rect& box) {
+    // The track looks the same in every state; the thumb and buttons show the state.
+    if (bar == Orientation::Vertical) {
+        (void)nine(dc, pictures_.scrollButtons, 20, 8, Margins{0, 5, 0, 5}, box);
+    } else {
+        (void)nine(dc, pictures_.scrollButtons, 20, 3, Margins{5, 0, 5, 0}, box);
+    }
+}
+
+void Skin::paintScrollThumb(Surface& dc, Orientation bar, ControlLook look, const Rect& box) {
+    const QImage& thumb = bar == Orientation::Vertical ? pictures_.scrollThumbVertical
+                                                       : pictures_.scrollThumbHorizontal;
+    (void)nine(dc, thumb, 4, static_cast<int>(look), Margins{5, 5, 5, 5}, box);
+}
+
+void Skin::paintSizeBox(Surface& dc, ControlLook look, const Rect& box) {
+    const auto [l, t, r, b] = box;
+    switch (look) {
+        case ControlLook::Normal:
+            (void)shapes_.fillBox(dc, l, t, r, b, kSysButtonFace);
+            (void)shapes_.frameBox(dc, l, t, r, b, kSysButtonShadow);
+            return;
+        case ControlLook::Pressed:
+        case ControlLook::Hot: {
+            const Colour fill = look == ControlLook::Pressed
+                                    ? ShapeHelper::shadeColor(rgb(191, 208, 237), -20).value()
+                                    : rgb(191, 208, 237);
+            (void)shapes_.fillBox(dc, l, t, r, b, fill);
+            (void)shapes_.frameBox(dc, l, t, r, b, rgb(49, 106, 197));
             return;
         }
-        case 2:
-        case 3:
-            // The track stretches only along its length. It looks the same in every state; the
-            // thumb and buttons show the state.
-            if (eState < 0 || eState > 3) {
-                return;
-            }
-            if (sVertical) {
-                (void)Nine(dc, pictures_.pScrollButton, 20, 8, Margins{0, 5, 0, 5}, box);
-            } else {
-                (void)Nine(dc, pictures_.pScrollButton, 20, 3, Margins{5, 0, 5, 0}, box);
-            }
-            return;
-        case 4: {
-            const auto [l, t, r, b] = box;
-            if (eState == 0) {
-                (void)shapes_.FillBox(dc, l, t, r, b, kSysButtonFace);
-                (void)shapes_.FrameBox(dc, l, t, r, b, kSysButtonShadow);
-            } else if (eState == 1 || eState == 2) {
-                const Colour fill = eState == 1
-                                        ? ShapeHelper::ShadeColor(Rgb(191, 208, 237), -20).value()
-                                        : Rgb(191, 208, 237);
-                (void)shapes_.FillBox(dc, l, t, r, b, fill);
-                (void)shapes_.FrameBox(dc, l, t, r, b, Rgb(49, 106, 197));
-            }
-            return;
-        }
-        case 5:
-            if (eState >= 0 && eState <= 3) {
-                const QImage& thumb =
-                    sVertical ? pictures_.pScrollThumbHor : pictures_.pScrollThumbVer;
-                (void)Nine(dc, thumb, 4, eState, Margins{5, 5, 5, 5}, box);
-            }
-            return;
-        default:
+        case ControlLook::Disabled:
             return;
     }
 }
 
-void Skin::ThemeSpinButton(Surface& dc, int state, int sButton, const Rect& box) {
-    const QImage* picture = nullptr;
-    int group = 0;
-    ArrowDirection direction = ArrowDirection::Up;
-    switch (sButton) {
-        case 0:
-            picture = &pictures_.pSpinHor, group = 0, direction = ArrowDirection::Left;
-            break;
-        case 1:
-            picture = &pictures_.pSpinVer, group = 1, direction = ArrowDirection::Down;
-            break;
-        case 2:
-            picture = &pictures_.pSpinVer, group = 0, direction = ArrowDirection::Up;
-            break;
-        case 3:
-            picture = &pictures_.pSpinHor, group = 1, direction = ArrowDirection::Right;
-            break;
-        default:
-            return;
-    }
-    if (state < 0 || state > 4) {
-        return;
-    }
-    const int place = state == 4 ? 0 : state;  // normal, hot, pressed, disabled
-    (void)Nine(dc, *picture, 8, 4 * group + place, Margins{2, 2, 2, 2}, box);
-    (void)Glyph(dc, ArrowCell(direction, place), box);
+void Skin::paintSpinButton(Surface& dc, ArrowDirection direction, ControlLook look,
+                           const Rect& box) {
+    // Each picture holds its two buttons (up then down, left then right) in the four looks.
+    const bool upDown = direction == ArrowDirection::Up || direction == ArrowDirection::Down;
+    const int group = direction == ArrowDirection::Down || direction == ArrowDirection::Right;
+    const QImage& picture = upDown ? pictures_.spinUpDown : pictures_.spinLeftRight;
+    (void)nine(dc, picture, 8, 4 * group + static_cast<int>(look), Margins{2, 2, 2, 2}, box);
+    (void)glyph(dc, arrowCell(direction, static_cast<int>(look)), box);
 }
 
-void Skin::ThemeTrackbar(WindowHandle, Surface& dc, bool bEnable, bool hot, int ticks, int plDraw,
-                         int cOrientation, const Rect& box) {
-    if (plDraw == 0) {
-        (void)shapes_.FillBox(dc, box.left, box.top, box.right, box.bottom, kSysButtonFace);
-        (void)shapes_.SunkenEdge(dc, box);
-        return;
-    }
-    if (plDraw != 1) {
-        return;
-    }
-    // A lying bar carries an upright thumb, whose point lies at the top or the bottom; an
-    // upright bar a lying thumb, whose margins are the same turned on their side.
-    const bool lyingBar = cOrientation == 0;
+void Skin::paintTrackBarChannel(Surface& dc, const Rect& box) {
+    (void)shapes_.fillBox(dc, box.left, box.top, box.right, box.bottom, kSysButtonFace);
+    (void)shapes_.sunkenEdge(dc, box);
+}
+
+void Skin::paintTrackBarThumb(Surface& dc, Orientation bar, ThumbPoint point, ThumbLook look,
+                              const Rect& box) {
+    // A horizontal bar carries an upright thumb, whose point lies at the top or the bottom; a
+    // vertical bar a lying thumb, whose margins are the same turned on their side.
+    const bool horizontal = bar == Orientation::Horizontal;
     const QImage* thumb = nullptr;
-    switch (ticks) {
-        case 0:
-            thumb = lyingBar ? &pictures_.pTrackBarVerTop : &pictures_.pTrackBarHorLeft;
+    switch (point) {
+        case ThumbPoint::TopOrLeft:
+            thumb = horizontal ? &pictures_.trackThumbUp : &pictures_.trackThumbLeft;
             break;
-        case 1:
-            thumb = lyingBar ? &pictures_.pTrackBarVerBottom : &pictures_.pTrackBarHorRight;
+        case ThumbPoint::BottomOrRight:
+            thumb = horizontal ? &pictures_.trackThumbDown : &pictures_.trackThumbRight;
             break;
-        case 2:
-            thumb = lyingBar ? &pictures_.pTrackBarVerBold : &pictures_.pTrackBarHorBold;
+        case ThumbPoint::None:
+            thumb = horizontal ? &pictures_.trackThumbUpright : &pictures_.trackThumbLying;
             break;
-        default:
-            return;
     }
-    const Margins margins = lyingBar ? Margins{3, 6, 3, 10} : Margins{6, 3, 10, 3};
-    const int frame = !bEnable ? 2 : hot ? 1 : 0;
-    (void)NineKeyed(dc, *thumb, 3, frame, margins, box);
+    const Margins margins = horizontal ? Margins{3, 6, 3, 10} : Margins{6, 3, 10, 3};
+    (void)nineKeyed(dc, *thumb, 3, static_cast<int>(look), margins, box);
 }
 
-void Skin::ThemeStatusBar(WindowHandle handle, Surface& dc, int plDraw, const Rect& box) {
+void Skin::paintStatusBar(Surface& dc, StatusBarPart part, const Rect& box) {
     constexpr Margins kBarMargins{0, 3, 0, 3};
-    const QImage& picture = pictures_.pStatusBar;
+    const QImage& picture = pictures_.statusBar;
     const long long height = static_cast<long long>(box.bottom) - box.top;
     // The divider: the 3 x 22 strip at (0, 44) stretched to a column at the bar's right end.
     const auto divider = [&] {
         const auto column =
-            MakeRect(static_cast<long long>(box.right) - 3, box.top, box.right, box.bottom);
-        if (column && height > 0 && rect_math::FitsInt(height)) {
-            (void)dc.Copy(picture, Piece{0, 44, 3, 22},
+            makeRect(static_cast<long long>(box.right) - 3, box.top, box.right, box.bottom);
+        if (column && height > 0 && rect_math::fitsInt(height)) {
+            (void)dc.copy(picture, Piece{0, 44, 3, 22},
                           Piece{column->left, column->top, 3, static_cast<int>(height)});
         }
     };
-    switch (plDraw) {
-        case 0:
-        case 5:
-            // 5 is the bar of a status bar in simple mode: the same parts, flat.
-            (void)Nine(dc, picture, 4, plDraw == 0 ? 0 : 3, kBarMargins, box);
+    switch (part) {
+        case StatusBarPart::Bar:
+        case StatusBarPart::SimpleBar:
+            // The bar in simple mode has the same parts, flat.
+            (void)nine(dc, picture, 4, part == StatusBarPart::Bar ? 0 : 3, kBarMargins, box);
             divider();
             return;
-        case 1:
-            (void)shapes_.DrawThemePart(dc, "Status", 3, 1, box);
+        case StatusBarPart::SizeGrip:
+            (void)shapes_.drawThemePart(dc, "Status", 3, 1, box);
             return;
-        case 2: {
+        case StatusBarPart::Panel: {
             // A panel: the three columns of the band at y 22, the middle one stretched.
             const long long width = static_cast<long long>(box.right) - box.left;
-            if (width < 2 || height <= 0 || !rect_math::FitsInt(width) ||
-                !rect_math::FitsInt(height)) {
+            if (width < 2 || height <= 0 || !rect_math::fitsInt(width) ||
+                !rect_math::fitsInt(height)) {
                 return;
             }
             const int w = static_cast<int>(width);
             const int h = static_cast<int>(height);
-            (void)dc.Copy(picture, Piece{0, 22, 1, 22}, Piece{box.left, box.top, 1, h});
-            (void)dc.Copy(picture, Piece{1, 22, 1, 22}, Piece{box.left + 1, box.top, w - 2, h});
-            (void)dc.Copy(picture, Piece{2, 22, 1, 22}, Piece{box.right - 1, box.top, 1, h});
+            (void)dc.copy(picture, Piece{0, 22, 1, 22}, Piece{box.left, box.top, 1, h});
+            (void)dc.copy(picture, Piece{1, 22, 1, 22}, Piece{box.left + 1, box.top, w - 2, h});
+            (void)dc.copy(picture, Piece{2, 22, 1, 22}, Piece{box.right - 1, box.top, 1, h});
             return;
         }
-        case 3:
-            // The progress part's trough over the box (the bar is not drawn: right edge 0).
-            ThemeProgress(handle, dc, 0, box.right, box.bottom, Rect{box.left, box.top, 0, 0});
+        case StatusBarPart::ProgressTrough:
+            paintProgressTrough(dc, Orientation::Horizontal, box);
             return;
-        case 4:
-            // Its bar, inset in the box; box.right is where the progress has reached.
-            ThemeProgress(handle, dc, 0, 0, 0, box);
-            return;
-        default:
+        case StatusBarPart::ProgressBar:
+            paintProgressBar(dc, Orientation::Horizontal, box);
             return;
     }
 }

@@ -1,48 +1,49 @@
 // Painters of menus, toolbars, window tabs and flat boxes.
-#include <cmath>
-#include <optional>
-
 #include "skin/rect_math.h"
 #include "skin/skin.h"
 
 namespace kickvane::skin {
 
-using rect_math::MakeRect;
-using rect_math::Moved;
+using rect_math::moved;
 
 namespace {
 
 constexpr Margins kMargins3{3, 3, 3, 3};
-constexpr Colour kPaleBlue = Rgb(191, 208, 237);
-constexpr Colour kEdgeBlue = Rgb(49, 106, 197);
-constexpr Colour kTabStrip = Rgb(191, 219, 255);
+constexpr Colour kPaleBlue = rgb(191, 208, 237);
+constexpr Colour kPressedBlue = rgb(160, 187, 228);
+constexpr Colour kEdgeBlue = rgb(49, 106, 197);
+constexpr Colour kTabStrip = rgb(191, 219, 255);
+constexpr Colour kCream = rgb(247, 246, 238);
+constexpr Colour kCreamEdge = rgb(172, 168, 153);
 
-// A floating coordinate as a whole pixel, rounded to nearest (halves to even); nullopt when it
-// is no number or lies outside the 32-bit range.
-std::optional<int> ToPixel(double value) {
-    if (!std::isfinite(value)) {
-        return std::nullopt;
+// The frame of the toolbar button pictures for a look; a flat button has none.
+std::optional<int> toolbarFrame(ToolbarLook look) {
+    switch (look) {
+        case ToolbarLook::Flat:
+            return std::nullopt;
+        case ToolbarLook::Hot:
+            return kToolbarHot;
+        case ToolbarLook::Pressed:
+            return kToolbarPressed;
+        case ToolbarLook::Checked:
+            return kToolbarChecked;
+        case ToolbarLook::CheckedHot:
+            return kToolbarCheckedHot;
+        case ToolbarLook::Raised:
+            return kToolbarRaised;
     }
-    const double rounded = std::nearbyint(value);
-    if (rounded < -2147483648.0 || rounded > 2147483647.0) {
-        return std::nullopt;
-    }
-    return static_cast<int>(rounded);
+    return std::nullopt;
 }
 
-// Toolbar button states to frames of pToolbarButton and its drop-down pictures.
-std::optional<int> ToolbarFrame(int tbStatus) {
-    switch (tbStatus) {
-        case 1:
-            return kToolbarHot;
-        case 2:
-            return kToolbarPressed;
-        case 3:
-            return kToolbarChecked;
-        case 4:
-            return kToolbarCheckedHot;
-        case 5:
-            return kToolbarRaised;
+// The three looks of a mark box and its mark: normal, hot, disabled.
+std::optional<int> markBoxFrame(MenuLook look) {
+    switch (look) {
+        case MenuLook::Normal:
+            return 0;
+        case MenuLook::Hot:
+            return 1;
+        case MenuLook::Disabled:
+            return 2;
         default:
             return std::nullopt;
     }
@@ -50,284 +51,251 @@ std::optional<int> ToolbarFrame(int tbStatus) {
 
 }  // namespace
 
-void Skin::ThemeCommandBarMenu(WindowHandle, Surface& dc, int plDraw, int state, const Rect& box) {
-    const auto leftBand = [&] {
+void Skin::paintMenu(Surface& dc, MenuPart part, MenuLook look, const Rect& box) {
+    const auto band = [&] {
         const long long w = static_cast<long long>(box.right) - box.left;
         const long long h = static_cast<long long>(box.bottom) - box.top;
-        if (w > 0 && h > 0 && rect_math::FitsInt(w) && rect_math::FitsInt(h)) {
-            (void)dc.Copy(pictures_.pMenuLeft, Piece{0, 0, 28, 2},
+        if (w > 0 && h > 0 && rect_math::fitsInt(w) && rect_math::fitsInt(h)) {
+            (void)dc.copy(pictures_.menuBand, Piece{0, 0, 28, 2},
                           Piece{box.left, box.top, static_cast<int>(w), static_cast<int>(h)});
         }
     };
     const auto highlight = [&] {
-        if (state == 1) {
-            (void)Nine(dc, pictures_.pMenuItem, 2, 0, kMargins3, box);
-        } else if (state == 2) {
-            (void)Nine(dc, pictures_.pMenuCheckBorder, 3, 2, kMargins3, box);
+        if (look == MenuLook::Hot) {
+            (void)nine(dc, pictures_.menuItem, 2, 0, kMargins3, box);
+        } else if (look == MenuLook::Disabled) {
+            (void)nine(dc, pictures_.menuMarkBox, 3, 2, kMargins3, box);
         }
     };
-    // A mark (tick or bullet) in its box, inset by 2 pixels.
-    const auto boxedMark = [&](int normalCell) {
-        if (state < 0 || state > 2) {
+    // The tick and the bullet, and their disabled looks.
+    const auto markCell = [&](bool tick) {
+        return (tick ? 0 : 1) + (look == MenuLook::Disabled ? 2 : 0);
+    };
+    const auto boxedMark = [&](bool tick) {
+        const auto frame = markBoxFrame(look);
+        if (!frame) {
             return;
         }
-        (void)Nine(dc, pictures_.pMenuCheckBorder, 3, state, kMargins3, box);
-        if (const auto inner = Moved(box, 2, 2, -2, -2)) {
-            (void)Nine(dc, pictures_.pMenuCheck, 4, state == 2 ? normalCell + 2 : normalCell,
-                       kMargins3, *inner);
+        (void)nine(dc, pictures_.menuMarkBox, 3, *frame, kMargins3, box);
+        if (const auto inner = moved(box, 2, 2, -2, -2)) {
+            (void)nine(dc, pictures_.menuMarks, 4, markCell(tick), kMargins3, *inner);
         }
     };
-    switch (plDraw) {
-        case 0:  // menu bar item
-            if (state == 1) {
-                (void)Nine(dc, pictures_.pToolbarButton, 5, kToolbarHot, kMargins3, box);
-            } else if (state == 2) {
-                (void)Nine(dc, pictures_.pMenuItem, 2, 1, kMargins3, box);
+    switch (part) {
+        case MenuPart::BarItem:
+            if (look == MenuLook::Hot) {
+                (void)nine(dc, pictures_.toolbarButton, 5, kToolbarHot, kMargins3, box);
+            } else if (look == MenuLook::Open) {
+                (void)nine(dc, pictures_.menuItem, 2, 1, kMargins3, box);
             }
             return;
-        case 1:  // popup item highlight; State 2 is a disabled item under the cursor
+        case MenuPart::ItemHighlight:
             highlight();
             return;
-        case 2:
-            leftBand();
+        case MenuPart::Band:
+            band();
             return;
-        case 3:
-            if (state >= 0 && state <= 2) {
-                (void)Nine(dc, pictures_.pMenuCheckBorder, 3, state, kMargins3, box);
+        case MenuPart::MarkBox:
+            if (const auto frame = markBoxFrame(look)) {
+                (void)nine(dc, pictures_.menuMarkBox, 3, *frame, kMargins3, box);
             }
             return;
-        case 4:
-        case 5:
-            if (state >= 0 && state <= 2) {
-                const int cell = (plDraw == 4 ? 0 : 1) + (state == 2 ? 2 : 0);
-                (void)Nine(dc, pictures_.pMenuCheck, 4, cell, kMargins3, box);
+        case MenuPart::Tick:
+        case MenuPart::Bullet:
+            if (markBoxFrame(look)) {
+                (void)nine(dc, pictures_.menuMarks, 4, markCell(part == MenuPart::Tick), kMargins3,
+                           box);
             }
             return;
-        case 6:
-            boxedMark(0);
+        case MenuPart::BoxedTick:
+            boxedMark(true);
             return;
-        case 7:
-            boxedMark(1);
+        case MenuPart::BoxedBullet:
+            boxedMark(false);
             return;
-        case 8:  // a button inside a menu, such as its chevron
-            if (state >= 0 && state <= 2) {
-                const int frames[] = {kToolbarHot, kToolbarPressed, kToolbarChecked};
-                (void)Nine(dc, pictures_.pToolbarButton, 5, frames[state], kMargins3, box);
+        case MenuPart::Button:
+            if (look == MenuLook::Hot || look == MenuLook::Pressed || look == MenuLook::Checked) {
+                const int frame = look == MenuLook::Hot       ? kToolbarHot
+                                  : look == MenuLook::Pressed ? kToolbarPressed
+                                                              : kToolbarChecked;
+                (void)nine(dc, pictures_.toolbarButton, 5, frame, kMargins3, box);
             }
             return;
-        case 9:  // a checked menu bar item, hot with State 1
-            (void)Nine(dc, pictures_.pToolbarButton, 5,
-                       state == 1 ? kToolbarCheckedHot : kToolbarChecked, kMargins3, box);
+        case MenuPart::CheckedBarItem:
+            (void)nine(dc, pictures_.toolbarButton, 5,
+                       look == MenuLook::Hot ? kToolbarCheckedHot : kToolbarChecked, kMargins3,
+                       box);
             return;
-        case 10:  // a popup item whose highlight covers the left band
-            leftBand();
+        case MenuPart::HighlightOverBand:
+            band();
             highlight();
             return;
-        case 11:  // a raised button in a menu
-            (void)Nine(dc, pictures_.pToolbarButton, 5, kToolbarRaised, kMargins3, box);
-            return;
-        default:
+        case MenuPart::RaisedButton:
+            (void)nine(dc, pictures_.toolbarButton, 5, kToolbarRaised, kMargins3, box);
             return;
     }
 }
 
-void Skin::ThemeUniToolbar(WindowHandle, Surface& dc, int plDraw, int, int itemLeft, int itemTop,
-                           int itemWidth, int itemHeight, int tbStatus, int tbWidth, int tbHeight) {
-    if (plDraw == 0) {
-        (void)Nine(dc, pictures_.pToolbar, 1, 0, kMargins3, Rect{0, 0, tbWidth, tbHeight});
+void Skin::paintToolbarBackground(Surface& dc, const Rect& bar) {
+    (void)nine(dc, pictures_.toolbar, 1, 0, kMargins3, bar);
+}
+
+void Skin::paintToolbarButton(Surface& dc, ToolbarButtonPart part, ToolbarLook look,
+                              const Rect& item) {
+    const auto frame = toolbarFrame(look);
+    if (!frame) {
         return;
     }
-    // Item width and height are the item's right and bottom edges.
-    const auto item =
-        MakeRect(itemLeft, static_cast<long long>(itemTop) + 2, itemWidth, itemHeight);
-    if (!item) {
-        return;
-    }
-    switch (plDraw) {
-        case 1:
-            if (const auto frame = ToolbarFrame(tbStatus)) {
-                (void)Nine(dc, pictures_.pToolbarButton, 5, *frame, kMargins3, *item);
-            }
+    switch (part) {
+        case ToolbarButtonPart::Button:
+            (void)nine(dc, pictures_.toolbarButton, 5, *frame, kMargins3, item);
             return;
-        case 2:
+        case ToolbarButtonPart::ButtonWithDropDown:
             // The right 11 columns hold the divider and arrow and keep their width.
-            if (const auto frame = ToolbarFrame(tbStatus)) {
-                (void)NineKeyed(dc, pictures_.pToolbarButtonDropDown, 5, *frame,
-                                Margins{3, 3, 11, 3}, *item);
-            }
+            (void)nineKeyed(dc, pictures_.toolbarDropDownButton, 5, *frame, Margins{3, 3, 11, 3},
+                            item);
             return;
-        case 3:
-            if (const auto frame = ToolbarFrame(tbStatus)) {
-                (void)NineKeyed(dc, pictures_.pToolbarButtonDropDownRight, 5, *frame, kMargins3,
-                                *item);
-            }
-            return;
-        case 4: {
-            const int frame = tbStatus == 2 ? 1 : tbStatus == 3 ? 2 : tbStatus == 4 ? 3 : 0;
-            (void)Nine(dc, pictures_.pCombobox, 4, frame, kMargins3, *item);
-            return;
-        }
-        case 5:
-            (void)Nine(dc, pictures_.pTab, 1, 0, kMargins3, *item);
-            return;
-        default:
+        case ToolbarButtonPart::DropDown:
+            (void)nineKeyed(dc, pictures_.toolbarDropDownArrow, 5, *frame, kMargins3, item);
             return;
     }
 }
 
-Status Skin::ThemeMDITab(WindowHandle, Surface& dc, int plDraw, float x, float y, float x1,
-                         float y1, int& lReturn) {
-    if (plDraw == 7) {
-        lReturn = 15;
-        return Status::Ok();
-    }
-    if (plDraw == 8) {
-        lReturn = 5;
-        return Status::Ok();
-    }
-    const auto l = ToPixel(x), t = ToPixel(y), r = ToPixel(x1), b = ToPixel(y1);
-    if (!l || !t || !r || !b) {
-        return Status::Fail("window tab coordinates are no whole-pixel values");
-    }
-    const Rect box{*l, *t, *r, *b};
-    switch (plDraw) {
-        case 1: {
+void Skin::paintToolbarComboButton(Surface& dc, ControlLook look, const Rect& item) {
+    (void)nine(dc, pictures_.comboButton, 4, static_cast<int>(look), kMargins3, item);
+}
+
+void Skin::paintToolbarPanel(Surface& dc, const Rect& item) {
+    (void)nine(dc, pictures_.tabPanel, 1, 0, kMargins3, item);
+}
+
+Status Skin::paintWindowTab(Surface& dc, WindowTabPart part, const Rect& box) {
+    const auto [l, t, r, b] = box;
+    switch (part) {
+        case WindowTabPart::Strip: {
             // The tab strip with a line along its foot.
-            if (Status s = shapes_.FillBox(dc, *l, *t, *r, *b, kTabStrip); !s) {
+            if (Status s = shapes_.fillBox(dc, l, t, r, b, kTabStrip); !s) {
                 return s;
             }
-            const auto foot = Moved(box, 0, static_cast<long long>(*b) - *t - 1, 0, 0);
+            const auto foot = moved(box, 0, static_cast<long long>(b) - t - 1, 0, 0);
             if (!foot) {
                 return Status::Ok();
             }
-            return shapes_.FillBox(dc, foot->left, foot->top, foot->right, foot->bottom,
-                                   Rgb(122, 138, 163));
+            return shapes_.fillBox(dc, foot->left, foot->top, foot->right, foot->bottom,
+                                   rgb(122, 138, 163));
         }
-        case 2:
-        case 5: {
+        case WindowTabPart::ActiveTab:
+        case WindowTabPart::InactiveTab: {
             // A tab in three pieces: its rounded ends keep their width, the middle stretches.
-            const int frameTop = plDraw == 2 ? 0 : 21;
-            const long long w = static_cast<long long>(*r) - *l;
-            const long long h = static_cast<long long>(*b) - *t;
+            const int frameTop = part == WindowTabPart::ActiveTab ? 0 : 21;
+            const long long w = static_cast<long long>(r) - l;
+            const long long h = static_cast<long long>(b) - t;
             if (w < 12 || h <= 0) {
                 return Status::Ok();
             }
-            if (!rect_math::FitsInt(w) || !rect_math::FitsInt(h)) {
+            if (!rect_math::fitsInt(w) || !rect_math::fitsInt(h)) {
                 return Status::Fail("window tab too large");
             }
             const int hi = static_cast<int>(h);
             const Piece pieces[3][2] = {
-                {{0, frameTop, 6, 21}, {*l, *t, 6, hi}},
-                {{6, frameTop, 14, 21}, {*l + 6, *t, static_cast<int>(w) - 12, hi}},
-                {{20, frameTop, 6, 21}, {*r - 6, *t, 6, hi}},
+                {{0, frameTop, 6, 21}, {l, t, 6, hi}},
+                {{6, frameTop, 14, 21}, {l + 6, t, static_cast<int>(w) - 12, hi}},
+                {{20, frameTop, 6, 21}, {r - 6, t, 6, hi}},
             };
             for (const auto& [from, to] : pieces) {
-                if (Status s = dc.CopyKeyed(pictures_.pMDITab, from, to, kMagentaKey); !s) {
+                if (Status s = dc.copyKeyed(pictures_.windowTabs, from, to, kMagentaKey); !s) {
                     return s;
                 }
             }
             return Status::Ok();
         }
-        case 6:
-            return PaintNineInCurrentMode(dc, pictures_.pMDITabFrame, Margins{4, 4, 4, 4}, box,
+        case WindowTabPart::PageFrame:
+            return paintNineInCurrentMode(dc, pictures_.windowTabFrame, Margins{4, 4, 4, 4}, box,
                                           Frame{12, 12, 0});
-        case 10:
-        case 11: {
-            const Colour fill = plDraw == 10 ? kPaleBlue : Rgb(160, 187, 228);
-            if (Status s = shapes_.FillBox(dc, *l, *t, *r, *b, fill); !s) {
+        case WindowTabPart::HotButton:
+        case WindowTabPart::PressedButton: {
+            const Colour fill = part == WindowTabPart::HotButton ? kPaleBlue : kPressedBlue;
+            if (Status s = shapes_.fillBox(dc, l, t, r, b, fill); !s) {
                 return s;
             }
-            return shapes_.FrameBox(dc, *l, *t, *r, *b, kEdgeBlue);
+            return shapes_.frameBox(dc, l, t, r, b, kEdgeBlue);
         }
-        case 12: {
-            // A divider between two inactive tabs, kept off their top and bottom.
-            const long long top = static_cast<long long>(*t) + 3;
-            const long long bottom = static_cast<long long>(*b) - 4;
+        case WindowTabPart::Divider: {
+            // Kept off the top and bottom of the tabs beside it.
+            const long long top = static_cast<long long>(t) + 3;
+            const long long bottom = static_cast<long long>(b) - 4;
             if (bottom < top) {
                 return Status::Ok();
             }
-            return shapes_.DrawLine(dc, *l, static_cast<int>(top), *l, static_cast<int>(bottom),
+            return shapes_.drawLine(dc, l, static_cast<int>(top), l, static_cast<int>(bottom),
                                     kSysButtonShadow, 1);
         }
-        default:
-            return Status::Ok();
     }
+    return Status::Ok();
 }
 
-void Skin::ThemeMenus(WindowHandle, Surface& dc, int plDraw, int state, int mnLeft, int mnTop,
-                      int mnRight, double mnBottom) {
-    const auto bottom = ToPixel(mnBottom);
-    if (!bottom) {
-        return;
-    }
-    const int l = mnLeft, t = mnTop, r = mnRight, b = *bottom;
-    const auto fill = [&](Colour c) { (void)shapes_.FillBox(dc, l, t, r, b, c); };
-    const auto frame = [&](Colour c) { (void)shapes_.FrameBox(dc, l, t, r, b, c); };
-    const Colour kCream = Rgb(247, 246, 238);
-    const Colour kCreamEdge = Rgb(172, 168, 153);
-    switch (plDraw) {
-        case 0:
-            if (state == 0 || state == 1) {
+void Skin::paintMenuBox(Surface& dc, MenuBox part, MenuBoxLook look, const Rect& box) {
+    const auto [l, t, r, b] = box;
+    const auto fill = [&](Colour c) { (void)shapes_.fillBox(dc, l, t, r, b, c); };
+    const auto frame = [&](Colour c) { (void)shapes_.frameBox(dc, l, t, r, b, c); };
+    const bool normal = look == MenuBoxLook::Normal;
+    switch (part) {
+        case MenuBox::Background:
+            if (look != MenuBoxLook::Pressed) {
                 fill(kSysButtonFace);
             }
             return;
-        case 1:
-            if (state == 0) {
+        case MenuBox::Item:
+            if (normal) {
                 frame(kSysButtonShadow);
-            } else if (state == 1) {
+            } else if (look == MenuBoxLook::Hot) {
                 fill(kPaleBlue);
                 frame(kEdgeBlue);
             }
             return;
-        case 2:
-            fill(state == 0 ? kSysButtonFace : Rgb(255, 255, 255));
+        case MenuBox::Margin:
+            fill(normal ? kSysButtonFace : rgb(255, 255, 255));
             return;
-        case 3:
-            (void)shapes_.DrawLine(dc, l, t, r, b, kSysButtonShadow, 1);
+        case MenuBox::Separator:
+            (void)shapes_.drawLine(dc, l, t, r, b, kSysButtonShadow, 1);
             return;
-        case 4:
-            fill(state == 0 ? kPaleBlue : kCream);
-            frame(state == 0 ? kEdgeBlue : kCreamEdge);
+        case MenuBox::Highlight:
+            fill(normal ? kPaleBlue : kCream);
+            frame(normal ? kEdgeBlue : kCreamEdge);
             return;
-        case 5:
-            if (state == 0) {
+        case MenuBox::Button:
+            if (normal) {
                 fill(kCream);
                 frame(kCreamEdge);
-            } else if (state == 1 || state == 2) {
-                fill(state == 1 ? Rgb(160, 187, 228) : Rgb(227, 235, 247));
+            } else {
+                fill(look == MenuBoxLook::Pressed ? kPressedBlue : rgb(227, 235, 247));
                 frame(kEdgeBlue);
             }
             return;
-        case 6:
+        case MenuBox::Outline:
             frame(kSysButtonShadow);
             return;
-        default:
-            return;
     }
 }
 
-Status Skin::ThemePopupColor(WindowHandle, Surface& dc, int plDraw, const Rect& box) {
+Status Skin::paintColorPopup(Surface& dc, ColorPopupPart part, const Rect& box) {
     const auto [l, t, r, b] = box;
-    switch (plDraw) {
-        case 0:
-            return shapes_.FillBox(dc, l, t, r, b, kSysButtonFace);
-        case 1:
-        case 2:
-            if (Status s = shapes_.FillBox(dc, l, t, r, b, kPaleBlue); !s) {
+    switch (part) {
+        case ColorPopupPart::Background:
+            return shapes_.fillBox(dc, l, t, r, b, kSysButtonFace);
+        case ColorPopupPart::SelectedCell:
+            if (Status s = shapes_.fillBox(dc, l, t, r, b, kPaleBlue); !s) {
                 return s;
             }
-            return shapes_.FrameBox(dc, l, t, r, b, kEdgeBlue);
-        case 3:
-            return shapes_.FrameBox(dc, l, t, r, b, kSysButtonShadow);
-        default:
-            return Status::Ok();
+            return shapes_.frameBox(dc, l, t, r, b, kEdgeBlue);
+        case ColorPopupPart::Outline:
+            return shapes_.frameBox(dc, l, t, r, b, kSysButtonShadow);
     }
+    return Status::Ok();
 }
 
-void Skin::DrawTextbox(WindowHandle, Surface& dc, int bState, int x, int y, int width, int height) {
-    if (bState == 0 || bState == 1) {
-        (void)shapes_.FrameBox(dc, x, y, width, height, 13603685);
-    }
+void Skin::paintTextBoxOutline(Surface& dc, const Rect& box) {
+    (void)shapes_.frameBox(dc, box.left, box.top, box.right, box.bottom, rgb(101, 147, 207));
 }
 
 }  // namespace kickvane::skin

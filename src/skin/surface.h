@@ -12,21 +12,21 @@ namespace kickvane::skin {
 // A colour as 0x00BBGGRR, or 0x80000000 + n for the system colour n (see ShapeHelper).
 using Colour = std::uint32_t;
 
-constexpr Colour Rgb(int red, int green, int blue) {
+constexpr Colour rgb(int red, int green, int blue) {
     return static_cast<Colour>((red & 0xFF) | ((green & 0xFF) << 8) | ((blue & 0xFF) << 16));
 }
-constexpr int RedOf(Colour c) {
+constexpr int redOf(Colour c) {
     return static_cast<int>(c & 0xFF);
 }
-constexpr int GreenOf(Colour c) {
+constexpr int greenOf(Colour c) {
     return static_cast<int>((c >> 8) & 0xFF);
 }
-constexpr int BlueOf(Colour c) {
+constexpr int blueOf(Colour c) {
     return static_cast<int>((c >> 16) & 0xFF);
 }
 
 // Pixels of this colour in a keyed picture are not copied.
-constexpr Colour kMagentaKey = Rgb(255, 0, 255);
+constexpr Colour kMagentaKey = rgb(255, 0, 255);
 
 // The window being painted. The painters only compare it with the window under the cursor and
 // ask for its text; they never draw into it.
@@ -49,7 +49,7 @@ struct Piece {
     int width = 0;
     int height = 0;
 
-    bool IsEmpty() const { return width <= 0 || height <= 0; }
+    bool isEmpty() const { return width <= 0 || height <= 0; }
     friend bool operator==(const Piece&, const Piece&) = default;
 };
 
@@ -76,23 +76,23 @@ public:
     virtual ~Surface() = default;
 
     // Applies to the stretching copies that follow.
-    virtual void SetStretchMode(StretchMode mode) = 0;
+    virtual void setStretchMode(StretchMode mode) = 0;
 
     // Copies the piece `from` of `source` to `to`, stretching it to the size of `to`.
-    virtual Status Copy(const QImage& source, const Piece& from, const Piece& to) = 0;
+    virtual Status copy(const QImage& source, const Piece& from, const Piece& to) = 0;
 
     // Like Copy, but target pixels stay unchanged where the source pixel has the colour `key`.
     // Always stretches by nearest pixel, so the key never blends into its neighbours.
-    virtual Status CopyKeyed(const QImage& source, const Piece& from, const Piece& to,
+    virtual Status copyKeyed(const QImage& source, const Piece& from, const Piece& to,
                              Colour key) = 0;
 
-    virtual Status Fill(const Rect& area, Colour rgb) = 0;
+    virtual Status fill(const Rect& area, Colour rgb) = 0;
 
     // A line from `from` to `to` (the end point included), `width` pixels thick.
-    virtual Status Line(int x1, int y1, int x2, int y2, Colour rgb, int width) = 0;
+    virtual Status line(int x1, int y1, int x2, int y2, Colour rgb, int width) = 0;
 
     // One line of UTF-8 text, left aligned and vertically centred in `box`, cut at its edges.
-    virtual Status Text(const Rect& box, std::string_view utf8, Colour rgb) = 0;
+    virtual Status text(const Rect& box, std::string_view utf8, Colour rgb) = 0;
 };
 
 }  // namespace kickvane::skin

@@ -6,7 +6,7 @@
 namespace kickvane::skin::testing {
 
 // A picture of one colour, to draw on or to compare with.
-inline QImage Filled(int width, int height, const QColor& colour) {
+inline QImage filled(int width, int height, const QColor& colour) {
     QImage image(width, height, QImage::Format_RGB32);
     image.fill(colour);
     return image;

@@ -15,16 +15,16 @@ namespace {
 
 namespace fs = std::filesystem;
 
-fs::path TempSheet(const std::string& name) {
+fs::path tempSheet(const std::string& name) {
     return fs::temp_directory_path() /
            ("kickvane-" + name + "-" +
             std::to_string(::testing::UnitTest::GetInstance()->random_seed()) + ".png");
 }
 
 TEST(GalleryTest, RunSkinGallery_WritesASheetThatIsNotBlank_OrReportsAFileItCannotWrite) {
-    const fs::path out = TempSheet("skin-gallery");
+    const fs::path out = tempSheet("skin-gallery");
     std::ostringstream err;
-    ASSERT_EQ(RunSkinGallery(out, err), 0) << err.str();
+    ASSERT_EQ(runSkinGallery(out, err), 0) << err.str();
     EXPECT_TRUE(err.str().empty());
 
     const QImage sheet(QString::fromStdString(out.string()));
@@ -40,7 +40,7 @@ TEST(GalleryTest, RunSkinGallery_WritesASheetThatIsNotBlank_OrReportsAFileItCann
     EXPECT_GT(colours.size(), 200u);
 
     std::ostringstream unwritable;
-    EXPECT_NE(RunSkinGallery("/nonexistent-folder/sheet.png", unwritable), 0);
+    EXPECT_NE(runSkinGallery("/nonexistent-folder/sheet.png", unwritable), 0);
     EXPECT_NE(unwritable.str().find("cannot write"), std::string::npos);
 }
 
@@ -51,9 +51,9 @@ TEST(GalleryTest, Sheet_MatchesTheReferencePixelForPixel) {
     if (!qgetenv("FONTCONFIG_FILE").endsWith("gallery_fonts.conf")) {
         GTEST_SKIP() << "the sheet's captions need the fixed fonts that ctest sets";
     }
-    const fs::path out = TempSheet("skin-gallery-compare");
+    const fs::path out = tempSheet("skin-gallery-compare");
     std::ostringstream err;
-    ASSERT_EQ(RunSkinGallery(out, err), 0) << err.str();
+    ASSERT_EQ(runSkinGallery(out, err), 0) << err.str();
     const QImage actual =
         QImage(QString::fromStdString(out.string())).convertToFormat(QImage::Format_RGB32);
     const QImage expected =

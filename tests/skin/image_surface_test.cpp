@@ -13,15 +13,15 @@ namespace {
 using testing::Filled;
 
 TEST(ImageSurfaceTest, Copy_UsesNearestPixelWhenPlain_AndBlendsWhenHalftone) {
-    QImage source = Filled(2, 1, Qt::black);
+    QImage source = filled(2, 1, Qt::black);
     source.setPixelColor(1, 0, Qt::white);
-    QImage nearest = Filled(8, 1, Qt::white);
+    QImage nearest = filled(8, 1, Qt::white);
     QPainter(&nearest).fillRect(0, 0, 4, 1, Qt::black);
     for (const StretchMode mode : {StretchMode::Plain, StretchMode::Halftone}) {
-        QImage target = Filled(8, 1, Qt::red);
+        QImage target = filled(8, 1, Qt::red);
         ImageSurface dc(target);
-        dc.SetStretchMode(mode);
-        ASSERT_TRUE(dc.Copy(source, Piece{0, 0, 2, 1}, Piece{0, 0, 8, 1}).ok());
+        dc.setStretchMode(mode);
+        ASSERT_TRUE(dc.copy(source, Piece{0, 0, 2, 1}, Piece{0, 0, 8, 1}).ok());
         const int middle = target.pixelColor(4, 0).red();
         EXPECT_EQ(target == nearest, mode == StretchMode::Plain);
         EXPECT_EQ(middle > 0 && middle < 255, mode == StretchMode::Halftone) << middle;
@@ -30,60 +30,60 @@ TEST(ImageSurfaceTest, Copy_UsesNearestPixelWhenPlain_AndBlendsWhenHalftone) {
 
 TEST(ImageSurfaceTest, Copy_DoesNotBlendInNeighbouringFrame_WhenSmoothing) {
     // Two frames of two rows each; stretching the red one must stay pure red.
-    QImage source = Filled(1, 4, Qt::blue);
+    QImage source = filled(1, 4, Qt::blue);
     source.setPixelColor(0, 0, Qt::red);
     source.setPixelColor(0, 1, Qt::red);
-    QImage target = Filled(3, 16, Qt::white);
+    QImage target = filled(3, 16, Qt::white);
     ImageSurface dc(target);
-    dc.SetStretchMode(StretchMode::Halftone);
-    ASSERT_TRUE(dc.Copy(source, Piece{0, 0, 1, 2}, Piece{0, 0, 3, 16}).ok());
-    EXPECT_EQ(target, Filled(3, 16, Qt::red));
+    dc.setStretchMode(StretchMode::Halftone);
+    ASSERT_TRUE(dc.copy(source, Piece{0, 0, 1, 2}, Piece{0, 0, 3, 16}).ok());
+    EXPECT_EQ(target, filled(3, 16, Qt::red));
 }
 
 TEST(ImageSurfaceTest, CopyKeyed_KeepsTargetUnderKeyPixels_WhenStretched) {
-    QImage source = Filled(2, 2, QColor(255, 0, 255));
+    QImage source = filled(2, 2, QColor(255, 0, 255));
     source.setPixelColor(0, 0, QColor(10, 20, 30));
-    QImage target = Filled(4, 4, Qt::green);
+    QImage target = filled(4, 4, Qt::green);
     ImageSurface dc(target);
-    dc.SetStretchMode(StretchMode::Halftone);  // keyed copies never blend the key
-    ASSERT_TRUE(dc.CopyKeyed(source, Piece{0, 0, 2, 2}, Piece{0, 0, 4, 4}, kMagentaKey).ok());
+    dc.setStretchMode(StretchMode::Halftone);  // keyed copies never blend the key
+    ASSERT_TRUE(dc.copyKeyed(source, Piece{0, 0, 2, 2}, Piece{0, 0, 4, 4}, kMagentaKey).ok());
 
-    QImage expected = Filled(4, 4, Qt::green);
+    QImage expected = filled(4, 4, Qt::green);
     QPainter(&expected).fillRect(0, 0, 2, 2, QColor(10, 20, 30));
     EXPECT_EQ(target, expected);
 }
 
 TEST(ImageSurfaceTest, Copy_FailsAndLeavesTarget_WhenPieceIsOutsideItsPicture) {
-    const QImage source = Filled(4, 4, Qt::black);
-    QImage target = Filled(4, 4, Qt::white);
+    const QImage source = filled(4, 4, Qt::black);
+    QImage target = filled(4, 4, Qt::white);
     ImageSurface dc(target);
-    EXPECT_FALSE(dc.Copy(source, Piece{2, 2, 3, 3}, Piece{0, 0, 4, 4}).ok());
-    EXPECT_FALSE(dc.CopyKeyed(source, Piece{0, -1, 2, 2}, Piece{0, 0, 4, 4}, kMagentaKey).ok());
-    EXPECT_FALSE(dc.Copy(source, Piece{0, 0, 2, 2}, Piece{INT_MAX, 0, 4, 4}).ok());
-    EXPECT_EQ(target, Filled(4, 4, Qt::white));
+    EXPECT_FALSE(dc.copy(source, Piece{2, 2, 3, 3}, Piece{0, 0, 4, 4}).ok());
+    EXPECT_FALSE(dc.copyKeyed(source, Piece{0, -1, 2, 2}, Piece{0, 0, 4, 4}, kMagentaKey).ok());
+    EXPECT_FALSE(dc.copy(source, Piece{0, 0, 2, 2}, Piece{INT_MAX, 0, 4, 4}).ok());
+    EXPECT_EQ(target, filled(4, 4, Qt::white));
 
     QImage none;
     ImageSurface nowhere(none);
-    EXPECT_FALSE(nowhere.Copy(source, Piece{0, 0, 2, 2}, Piece{0, 0, 2, 2}).ok());
+    EXPECT_FALSE(nowhere.copy(source, Piece{0, 0, 2, 2}, Piece{0, 0, 2, 2}).ok());
 }
 
 TEST(ImageSurfaceTest, Fill_ClipsToPicture_EvenAtCoordinateLimits) {
-    QImage target = Filled(5, 5, Qt::white);
+    QImage target = filled(5, 5, Qt::white);
     ImageSurface dc(target);
-    ASSERT_TRUE(dc.Fill(Rect{INT_MIN, INT_MIN, INT_MAX, 2}, Rgb(1, 2, 3)).ok());
+    ASSERT_TRUE(dc.fill(Rect{INT_MIN, INT_MIN, INT_MAX, 2}, rgb(1, 2, 3)).ok());
     EXPECT_EQ(target.pixelColor(4, 1), QColor(1, 2, 3));
     EXPECT_EQ(target.pixelColor(4, 2), QColor(Qt::white));
-    ASSERT_TRUE(dc.Fill(Rect{3, 3, 1, 5}, Rgb(9, 9, 9)).ok());  // inverted: nothing
+    ASSERT_TRUE(dc.fill(Rect{3, 3, 1, 5}, rgb(9, 9, 9)).ok());  // inverted: nothing
     EXPECT_EQ(target.pixelColor(2, 3), QColor(Qt::white));
 }
 
 TEST(ImageSurfaceTest, Text_DrawsInsideItsBoxOnly) {
-    QImage target = Filled(120, 40, Qt::white);
+    QImage target = filled(120, 40, Qt::white);
     ImageSurface dc(target);
-    ASSERT_TRUE(dc.Text(Rect{10, 10, 60, 30}, "Kickvane Kickvane Kickvane", Rgb(0, 0, 0)).ok());
-    EXPECT_NE(target.copy(10, 10, 50, 20), Filled(50, 20, Qt::white));
+    ASSERT_TRUE(dc.text(Rect{10, 10, 60, 30}, "Kickvane Kickvane Kickvane", rgb(0, 0, 0)).ok());
+    EXPECT_NE(target.copy(10, 10, 50, 20), filled(50, 20, Qt::white));
     QPainter(&target).fillRect(10, 10, 50, 20, Qt::white);
-    EXPECT_EQ(target, Filled(120, 40, Qt::white));  // nothing outside the box
+    EXPECT_EQ(target, filled(120, 40, Qt::white));  // nothing outside the box
 }
 
 }  // namespace

@@ -17,12 +17,12 @@ TEST(PaintNineTest, PaintNine_SmoothsAndCopiesNinePieces_CornersUnscaledSidesStr
     const QImage button(43, 330, QImage::Format_RGB32);
     RecordingSurface dc;  // frame 2 of 5, each 66 high
     ASSERT_TRUE(
-        PaintNine(dc, button, Margins{3, 3, 3, 3}, Rect{10, 10, 110, 40}, FrameOf(button, 5, 2))
+        paintNine(dc, button, Margins{3, 3, 3, 3}, Rect{10, 10, 110, 40}, frameOf(button, 5, 2))
             .ok());
 
     ASSERT_EQ(dc.calls.size(), 10u);
     EXPECT_EQ(dc.calls[0].mode, StretchMode::Halftone);
-    const auto copies = dc.Of(Kind::Copy);
+    const auto copies = dc.of(Kind::Copy);
     ASSERT_EQ(copies.size(), 9u);
     EXPECT_EQ(copies[0].source, &button);
     EXPECT_EQ(copies[0].to, (Piece{10, 10, 3, 3}));  // top-left corner
@@ -39,9 +39,9 @@ TEST(PaintNineTest, PaintNine_StretchesOnlyAlongWidth_WhenSideMarginsAreZero) {
     const QImage picture(17, 340, QImage::Format_RGB32);
     RecordingSurface dc;
     ASSERT_TRUE(
-        PaintNine(dc, picture, Margins{0, 5, 0, 5}, Rect{0, 0, 200, 17}, FrameOf(picture, 20, 3))
+        paintNine(dc, picture, Margins{0, 5, 0, 5}, Rect{0, 0, 200, 17}, frameOf(picture, 20, 3))
             .ok());
-    const auto copies = dc.Of(Kind::Copy);
+    const auto copies = dc.of(Kind::Copy);
     ASSERT_EQ(copies.size(), 3u);  // top, bottom, middle; corners and sides are empty
     EXPECT_EQ(copies[0].to, (Piece{0, 0, 200, 5}));
     EXPECT_EQ(copies[2].to, (Piece{0, 5, 200, 7}));
@@ -50,16 +50,16 @@ TEST(PaintNineTest, PaintNine_StretchesOnlyAlongWidth_WhenSideMarginsAreZero) {
 
 TEST(PaintNineTest, PaintNine_DrawsNothing_WhenTargetNarrowerOrLowerThanMargins) {
     const QImage picture(43, 330, QImage::Format_RGB32);
-    const Frame frame = FrameOf(picture, 5, 0);
+    const Frame frame = frameOf(picture, 5, 0);
     for (const Rect& target : {Rect{0, 0, 5, 40}, Rect{0, 0, 40, 5}, Rect{50, 0, 10, 40}}) {
         RecordingSurface dc;
-        EXPECT_TRUE(PaintNine(dc, picture, Margins{3, 3, 3, 3}, target, frame).ok());
-        EXPECT_TRUE(dc.Of(Kind::Copy).empty());
+        EXPECT_TRUE(paintNine(dc, picture, Margins{3, 3, 3, 3}, target, frame).ok());
+        EXPECT_TRUE(dc.of(Kind::Copy).empty());
     }
     // Exactly as wide as the margins: the corners and nothing between them.
     RecordingSurface dc;
-    EXPECT_TRUE(PaintNine(dc, picture, Margins{3, 3, 3, 3}, Rect{0, 0, 6, 6}, frame).ok());
-    EXPECT_EQ(dc.Of(Kind::Copy).size(), 4u);
+    EXPECT_TRUE(paintNine(dc, picture, Margins{3, 3, 3, 3}, Rect{0, 0, 6, 6}, frame).ok());
+    EXPECT_EQ(dc.of(Kind::Copy).size(), 4u);
 }
 
 TEST(PaintNineTest, PaintNine_FailsWithoutDrawing_OnMarginsFrameOrPiecesThatDoNotFit) {
@@ -80,7 +80,7 @@ TEST(PaintNineTest, PaintNine_FailsWithoutDrawing_OnMarginsFrameOrPiecesThatDoNo
              Case{m3, Frame{21, 11, 0}, Rect{INT_MIN, 0, INT_MAX, 40}},  // out of coordinates
          }) {
         RecordingSurface dc;
-        EXPECT_FALSE(PaintNine(dc, picture, c.margins, c.target, c.frame).ok());
+        EXPECT_FALSE(paintNine(dc, picture, c.margins, c.target, c.frame).ok());
         EXPECT_TRUE(dc.calls.empty());
     }
 }
@@ -89,12 +89,12 @@ TEST(PaintNineTest, PaintNine_FailsWithoutDrawing_OnMarginsFrameOrPiecesThatDoNo
 TEST(PaintNineTest, PaintNineKeyed_CopiesEveryPieceWithTheKey) {
     const QImage frame(6, 6, QImage::Format_RGB32);
     RecordingSurface dc;
-    ASSERT_TRUE(PaintNineKeyed(dc, frame, Margins{2, 2, 2, 2}, Rect{0, 0, 20, 20}, Frame{6, 6, 0},
+    ASSERT_TRUE(paintNineKeyed(dc, frame, Margins{2, 2, 2, 2}, Rect{0, 0, 20, 20}, Frame{6, 6, 0},
                                kMagentaKey)
                     .ok());
-    const auto keyed = dc.Of(Kind::CopyKeyed);
+    const auto keyed = dc.of(Kind::CopyKeyed);
     EXPECT_EQ(keyed.size(), 9u);
-    EXPECT_TRUE(dc.Of(Kind::Copy).empty());
+    EXPECT_TRUE(dc.of(Kind::Copy).empty());
     for (const auto& piece : keyed) {
         EXPECT_EQ(piece.colour, kMagentaKey);
     }

@@ -23,7 +23,7 @@ using Kind = RecordingSurface::Kind;
 class FakePointer final : public PointerProbe {
 public:
     explicit FakePointer(WindowHandle at, bool readable = true) : at_(at), readable_(readable) {}
-    Status WindowAtCursor(WindowHandle& window) const override {
+    Status windowAtCursor(WindowHandle& window) const override {
         window = at_;
         return readable_ ? Status::Ok() : Status::Fail("cursor unreadable");
     }
@@ -34,7 +34,7 @@ private:
 };
 
 // One skin for all tests: generating the pictures is the slow part.
-Skin& TheSkin() {
+Skin& theSkin() {
     static Skin skin;
     return skin;
 }
@@ -42,8 +42,8 @@ Skin& TheSkin() {
 using Paint = std::function<void(Surface&, int state)>;
 
 TEST(PaintersTest, FramedPainters_PickTheirFrameByState_AndAFallbackForOtherStates) {
-    Skin& k = TheSkin();
-    const SkinPictures& p = k.Pictures();
+    Skin& k = theSkin();
+    const SkinPictures& p = k.pictures();
     const Rect box{0, 0, 80, 24};
     const Paint button = [&](Surface& dc, int s) { k.ThemeButton(0, dc, s, false, false, box); };
     const Paint header = [&](Surface& dc, int s) { k.DrawListview(0, dc, 0, s, box); };
@@ -65,22 +65,22 @@ TEST(PaintersTest, FramedPainters_PickTheirFrameByState_AndAFallbackForOtherStat
         std::vector<int> fallbacks;  // states without one
     };
     // Spin buttons: state 4 looks like state 0. Thumbs: looks 0 normal, 1 hot, 2 disabled.
-    const Case cases[] = {{button, &p.pButton, 1, {5}, {0, 6}},
-                          {header, &p.pListView, 1, {0}, {8}},
-                          {tab, &p.pTabTop, 0, {1, 3}, {6}},
-                          {combo, &p.pCombobox, 1, {4}, {7}},
-                          {spinRight, &p.pSpinHor, 0, {2}, {4}},
-                          {spinUp, &p.pSpinVer, 0, {3}, {4}},
-                          {thumb(1, 0), &p.pTrackBarVerBottom, 0, {1, 2}, {}},
-                          {thumb(0, 1), &p.pTrackBarHorLeft, 0, {}, {}},
-                          {thumb(2, 1), &p.pTrackBarHorBold, 0, {2}, {}}};
+    const Case cases[] = {{button, &p.button, 1, {5}, {0, 6}},
+                          {header, &p.listHeaders, 1, {0}, {8}},
+                          {tab, &p.tabHeads, 0, {1, 3}, {6}},
+                          {combo, &p.comboButton, 1, {4}, {7}},
+                          {spinRight, &p.spinLeftRight, 0, {2}, {4}},
+                          {spinUp, &p.spinUpDown, 0, {3}, {4}},
+                          {thumb(1, 0), &p.trackThumbDown, 0, {1, 2}, {}},
+                          {thumb(0, 1), &p.trackThumbLeft, 0, {}, {}},
+                          {thumb(2, 1), &p.trackThumbLying, 0, {2}, {}}};
     // The top of the frame that state `state` copies from, checking the copy on the way.
     const auto frameTop = [](const Case& c, int state) {
         RecordingSurface dc;
         c.paint(dc, state);
-        auto copies = dc.Of(Kind::Copy);
+        auto copies = dc.of(Kind::Copy);
         if (copies.empty()) {
-            copies = dc.Of(Kind::CopyKeyed);  // keyed thumbs
+            copies = dc.of(Kind::CopyKeyed);  // keyed thumbs
         }
         EXPECT_EQ(copies.size(), 9u) << "state " << state;
         EXPECT_TRUE(!copies.empty() && copies[0].source == c.picture) << "state " << state;
@@ -105,37 +105,37 @@ TEST(PaintersTest, FramedPainters_PickTheirFrameByState_AndAFallbackForOtherStat
 }
 
 TEST(PaintersTest, CheckAndOption_CopyTheirCellForPlDrawZero_AndFailForStatesWithoutACell) {
-    QImage target = Filled(40, 40, Qt::black);
+    QImage target = filled(40, 40, Qt::black);
     ImageSurface image(target);
-    ASSERT_TRUE(TheSkin().ThemeCheck(0, image, 3, 1, Rect{5, 7, 0, 0}).ok());
-    EXPECT_EQ(target, Filled(40, 40, Qt::black));
-    ASSERT_TRUE(TheSkin().ThemeCheck(0, image, 3, 0, Rect{5, 7, 0, 0}).ok());
-    EXPECT_EQ(target.copy(5, 7, 13, 13), TheSkin().Pictures().pCheck.copy(0, 26, 13, 13));
+    ASSERT_TRUE(theSkin().ThemeCheck(0, image, 3, 1, Rect{5, 7, 0, 0}).ok());
+    EXPECT_EQ(target, filled(40, 40, Qt::black));
+    ASSERT_TRUE(theSkin().ThemeCheck(0, image, 3, 0, Rect{5, 7, 0, 0}).ok());
+    EXPECT_EQ(target.copy(5, 7, 13, 13), theSkin().pictures().checkBox.copy(0, 26, 13, 13));
 
     RecordingSurface dc;
-    EXPECT_FALSE(TheSkin().ThemeCheck(0, dc, 0, 0, Rect{}).ok());
-    EXPECT_FALSE(TheSkin().ThemeCheck(0, dc, 13, 0, Rect{}).ok());
-    EXPECT_FALSE(TheSkin().ThemeOption(0, dc, 9, 1, Rect{}).ok());
-    EXPECT_TRUE(TheSkin().ThemeOption(0, dc, 9, 2, Rect{}).ok());  // plDraw 2 draws nothing
+    EXPECT_FALSE(theSkin().ThemeCheck(0, dc, 0, 0, Rect{}).ok());
+    EXPECT_FALSE(theSkin().ThemeCheck(0, dc, 13, 0, Rect{}).ok());
+    EXPECT_FALSE(theSkin().ThemeOption(0, dc, 9, 1, Rect{}).ok());
+    EXPECT_TRUE(theSkin().ThemeOption(0, dc, 9, 2, Rect{}).ok());  // plDraw 2 draws nothing
     EXPECT_TRUE(dc.calls.empty());
 
     // An option button is round: its cell is copied with the key, the target shows around it.
-    ASSERT_TRUE(TheSkin().ThemeOption(0, dc, 6, 0, Rect{0, 0, 13, 13}).ok());
-    const auto option = dc.Of(Kind::CopyKeyed);
+    ASSERT_TRUE(theSkin().ThemeOption(0, dc, 6, 0, Rect{0, 0, 13, 13}).ok());
+    const auto option = dc.of(Kind::CopyKeyed);
     ASSERT_EQ(option.size(), 1u);
-    EXPECT_EQ(option[0].source, &TheSkin().Pictures().pOption);
+    EXPECT_EQ(option[0].source, &theSkin().pictures().optionButton);
     EXPECT_EQ(option[0].from, (Piece{0, 5 * 13, 13, 13}));
 }
 
 TEST(PaintersTest, ThemeScroll_PicksButtonFrameByState_HoverOnlyWhileCursorIsOverTheBar) {
-    Skin skin(MakeSkinPictures());
+    Skin skin(makeSkinPictures());
     constexpr WindowHandle kBar = 42;
     const auto frame = [&](bool vertical, int part, int state, WindowHandle atCursor,
                            bool readable = true) {
-        skin.SetPointerProbe(std::make_shared<FakePointer>(atCursor, readable));
+        skin.setPointerProbe(std::make_shared<FakePointer>(atCursor, readable));
         RecordingSurface dc;
         skin.ThemeScroll(kBar, dc, Rect{0, 0, 17, 17}, part, state, vertical);
-        const auto copies = dc.Of(Kind::Copy);
+        const auto copies = dc.of(Kind::Copy);
         return copies.size() == 9u ? copies[0].from.y / 17 : -1;
     };
     // The down button of an upright bar: plain, hover, pressed, hot.
@@ -151,15 +151,15 @@ TEST(PaintersTest, ThemeScroll_PicksButtonFrameByState_HoverOnlyWhileCursorIsOve
 }
 
 TEST(PaintersTest, ListboxAndCombobox_DrawTheWindowsText) {
-    Skin skin(MakeSkinPictures());
-    skin.SetWindowTextReader([](WindowHandle h) { return h == 5 ? "Bóng" : ""; });
+    Skin skin(makeSkinPictures());
+    skin.setWindowTextReader([](WindowHandle h) { return h == 5 ? "Bóng" : ""; });
     RecordingSurface list;
     skin.ThemeListbox(5, list, 1, Rect{10, 20, 200, 44});
     RecordingSurface combo;
     skin.ThemeCombobox(5, combo, 2, 0, Rect{10, 20, 200, 44});
     for (const RecordingSurface* dc : {&list, &combo}) {
-        ASSERT_EQ(dc->Of(Kind::Text).size(), 1u);
-        EXPECT_EQ(dc->Of(Kind::Text)[0].text, "Bóng");
+        ASSERT_EQ(dc->of(Kind::Text).size(), 1u);
+        EXPECT_EQ(dc->of(Kind::Text)[0].text, "Bóng");
     }
 }
 
@@ -167,8 +167,8 @@ TEST(PaintersTest, ListboxAndCombobox_DrawTheWindowsText) {
 TEST(PaintersTest, FlatBoxes_DrawByPartAndState_AndSkipBottomsThatAreNoPixels) {
     const auto fills = [](int part, int state, double bottom) {
         RecordingSurface dc;
-        TheSkin().ThemeMenus(0, dc, part, state, 0, 0, 40, bottom);
-        return dc.FillColours().size();
+        theSkin().ThemeMenus(0, dc, part, state, 0, 0, 40, bottom);
+        return dc.fillColours().size();
     };
     EXPECT_EQ(fills(0, 1, 20.0), 1u);  // a plain box
     EXPECT_EQ(fills(1, 1, 20.0), 2u);  // a framed one
@@ -180,33 +180,33 @@ TEST(PaintersTest, FlatBoxes_DrawByPartAndState_AndSkipBottomsThatAreNoPixels) {
 TEST(PaintersTest, ReportingPainters_ReturnFailuresOfTheirSurface) {
     QImage none;
     ImageSurface nowhere(none);
-    EXPECT_FALSE(TheSkin().ThemePopupColor(0, nowhere, 1, Rect{0, 0, 10, 10}).ok());
+    EXPECT_FALSE(theSkin().ThemePopupColor(0, nowhere, 1, Rect{0, 0, 10, 10}).ok());
     int measure = 0;
-    EXPECT_FALSE(TheSkin().ThemeMDITab(0, nowhere, 2, 0, 0, 80, 20, measure).ok());
-    EXPECT_FALSE(TheSkin().ThemeCheck(0, nowhere, 1, 0, Rect{}).ok());
+    EXPECT_FALSE(theSkin().ThemeMDITab(0, nowhere, 2, 0, 0, 80, 20, measure).ok());
+    EXPECT_FALSE(theSkin().ThemeCheck(0, nowhere, 1, 0, Rect{}).ok());
     // Suppressing painters just draw nothing.
-    TheSkin().ThemeButton(0, nowhere, 1, false, false, Rect{0, 0, 10, 10});
+    theSkin().ThemeButton(0, nowhere, 1, false, false, Rect{0, 0, 10, 10});
 }
 
 TEST(PaintersTest, ThemeMDITab_RoundsItsCoordinates_AndRejectsOnesThatAreNoPixels) {
     RecordingSurface dc;
     int measure = 0;
-    ASSERT_TRUE(TheSkin().ThemeMDITab(0, dc, 10, 1.5f, 2.5f, 20.4f, 18.6f, measure).ok());
-    EXPECT_EQ(dc.Of(Kind::Fill)[0].area, (Rect{2, 2, 20, 19}));
+    ASSERT_TRUE(theSkin().ThemeMDITab(0, dc, 10, 1.5f, 2.5f, 20.4f, 18.6f, measure).ok());
+    EXPECT_EQ(dc.of(Kind::Fill)[0].area, (Rect{2, 2, 20, 19}));
 
     const float inf = std::numeric_limits<float>::infinity();
-    EXPECT_FALSE(TheSkin().ThemeMDITab(0, dc, 10, 0, 0, inf, 10, measure).ok());
-    EXPECT_FALSE(TheSkin().ThemeMDITab(0, dc, 10, 0, 0, 3e9f, 10, measure).ok());
+    EXPECT_FALSE(theSkin().ThemeMDITab(0, dc, 10, 0, 0, inf, 10, measure).ok());
+    EXPECT_FALSE(theSkin().ThemeMDITab(0, dc, 10, 0, 0, 3e9f, 10, measure).ok());
 }
 
 TEST(PaintersTest, EveryPainter_StaysInsideThePicture_WithRectanglesAtTheCoordinateLimits) {
     const int lo = std::numeric_limits<int>::min();
     const int hi = std::numeric_limits<int>::max();
-    Skin& skin = TheSkin();
-    skin.SetPointerProbe(std::make_shared<FakePointer>(1));
+    Skin& skin = theSkin();
+    skin.setPointerProbe(std::make_shared<FakePointer>(1));
     for (const Rect& box : {Rect{lo, lo, hi, hi}, Rect{hi, hi, lo, lo}, Rect{hi - 1, 0, hi, 5},
                             Rect{lo, lo, lo + 1, lo + 1}}) {
-        QImage target = Filled(16, 16, Qt::white);
+        QImage target = filled(16, 16, Qt::white);
         ImageSurface dc(target);
         const auto [l, t, r, b] = box;
         int measure = 0;
@@ -251,7 +251,7 @@ TEST(PaintersTest, MDMouseOver_IsFalseOverAChildWindow_AndTrueOverTheChild) {
         QGuiApplication::topLevelAt(QCursor::pos()) == nullptr) {
         GTEST_SKIP() << "this platform does not place the cursor";
     }
-    Skin skin(MakeSkinPictures());
+    Skin skin(makeSkinPictures());
     bool over = true;
     ASSERT_TRUE(skin.MDMouseOver(static_cast<WindowHandle>(parent.winId()), over).ok());
     EXPECT_FALSE(over);

@@ -23,32 +23,32 @@ public:
         std::string text;
     };
 
-    void SetStretchMode(StretchMode mode) override {
+    void setStretchMode(StretchMode mode) override {
         calls.push_back({Kind::Mode, mode, nullptr, {}, {}, 0, {}, {}});
     }
-    Status Copy(const QImage& source, const Piece& from, const Piece& to) override {
+    Status copy(const QImage& source, const Piece& from, const Piece& to) override {
         calls.push_back({Kind::Copy, {}, &source, from, to, 0, {}, {}});
         return Status::Ok();
     }
-    Status CopyKeyed(const QImage& source, const Piece& from, const Piece& to,
+    Status copyKeyed(const QImage& source, const Piece& from, const Piece& to,
                      Colour key) override {
         calls.push_back({Kind::CopyKeyed, {}, &source, from, to, key, {}, {}});
         return Status::Ok();
     }
-    Status Fill(const Rect& area, Colour rgb) override {
+    Status fill(const Rect& area, Colour rgb) override {
         calls.push_back({Kind::Fill, {}, nullptr, {}, {}, rgb, area, {}});
         return Status::Ok();
     }
-    Status Line(int x1, int y1, int x2, int y2, Colour rgb, int) override {
+    Status line(int x1, int y1, int x2, int y2, Colour rgb, int) override {
         calls.push_back({Kind::Line, {}, nullptr, {}, {}, rgb, Rect{x1, y1, x2, y2}, {}});
         return Status::Ok();
     }
-    Status Text(const Rect& box, std::string_view utf8, Colour rgb) override {
+    Status text(const Rect& box, std::string_view utf8, Colour rgb) override {
         calls.push_back({Kind::Text, {}, nullptr, {}, {}, rgb, box, std::string(utf8)});
         return Status::Ok();
     }
 
-    std::vector<Call> Of(Kind kind) const {
+    std::vector<Call> of(Kind kind) const {
         std::vector<Call> out;
         for (const Call& call : calls) {
             if (call.kind == kind) {
@@ -59,9 +59,9 @@ public:
     }
 
     // Colours of the fills in order, each run of equal colours once (a frame is four fills).
-    std::vector<Colour> FillColours() const {
+    std::vector<Colour> fillColours() const {
         std::vector<Colour> out;
-        for (const Call& call : Of(Kind::Fill)) {
+        for (const Call& call : of(Kind::Fill)) {
             if (out.empty() || out.back() != call.colour) {
                 out.push_back(call.colour);
             }

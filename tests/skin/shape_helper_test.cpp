@@ -12,19 +12,19 @@ using testing::RecordingSurface;
 
 // RGB values pass through, system colours are translated first, unknown ones are none.
 TEST(ShapeHelperTest, ColoursTranslateAndShadeEachChannelWithClamping) {
-    EXPECT_EQ(ShapeHelper::TranslateColor(13603685), Rgb(101, 147, 207));
-    EXPECT_FALSE(ShapeHelper::TranslateColor(0x80000063).has_value());  // no such system colour
-    EXPECT_FALSE(ShapeHelper::TranslateColor(0x01000005).has_value());  // no colour value
-    EXPECT_EQ(ShapeHelper::ShadeColor(Rgb(10, 250, 128), -20), Rgb(0, 230, 108));
-    EXPECT_EQ(ShapeHelper::ShadeColor(Rgb(10, 250, 128), 20), Rgb(30, 255, 148));
-    EXPECT_EQ(ShapeHelper::ShadeColor(kSysButtonFace, -20), Rgb(216, 219, 224));
+    EXPECT_EQ(ShapeHelper::translateColor(13603685), rgb(101, 147, 207));
+    EXPECT_FALSE(ShapeHelper::translateColor(0x80000063).has_value());  // no such system colour
+    EXPECT_FALSE(ShapeHelper::translateColor(0x01000005).has_value());  // no colour value
+    EXPECT_EQ(ShapeHelper::shadeColor(rgb(10, 250, 128), -20), rgb(0, 230, 108));
+    EXPECT_EQ(ShapeHelper::shadeColor(rgb(10, 250, 128), 20), rgb(30, 255, 148));
+    EXPECT_EQ(ShapeHelper::shadeColor(kSysButtonFace, -20), rgb(216, 219, 224));
 }
 
 TEST(ShapeHelperTest, Boxes_FailAndDrawNothing_ForAnUnknownColour) {
     RecordingSurface dc;
     const ShapeHelper shapes;
-    EXPECT_FALSE(shapes.FillBox(dc, 0, 0, 10, 10, 0x80000040).ok());
-    EXPECT_FALSE(shapes.FrameBox(dc, 0, 0, 10, 10, 0x02000000).ok());
+    EXPECT_FALSE(shapes.fillBox(dc, 0, 0, 10, 10, 0x80000040).ok());
+    EXPECT_FALSE(shapes.frameBox(dc, 0, 0, 10, 10, 0x02000000).ok());
     EXPECT_TRUE(dc.calls.empty());
 }
 
@@ -32,7 +32,7 @@ TEST(ShapeHelperTest, FrameBox_OutlinesTheInsideOfItsRectangle) {
     QImage target(10, 10, QImage::Format_RGB32);
     target.fill(Qt::white);
     ImageSurface dc(target);
-    ASSERT_TRUE(ShapeHelper().FrameBox(dc, 2, 2, 8, 8, Rgb(255, 0, 0)).ok());
+    ASSERT_TRUE(ShapeHelper().frameBox(dc, 2, 2, 8, 8, rgb(255, 0, 0)).ok());
     for (int y = 0; y < 10; ++y) {
         for (int x = 0; x < 10; ++x) {
             const bool inBox = x >= 2 && x < 8 && y >= 2 && y < 8;
@@ -47,7 +47,7 @@ TEST(ShapeHelperTest, SunkenEdge_IsDarkAboveAndLeft_LightBelowAndRight) {
     QImage target(12, 12, QImage::Format_RGB32);
     target.fill(QColor(128, 128, 128));
     ImageSurface dc(target);
-    ASSERT_TRUE(ShapeHelper().SunkenEdge(dc, Rect{0, 0, 12, 12}).ok());
+    ASSERT_TRUE(ShapeHelper().sunkenEdge(dc, Rect{0, 0, 12, 12}).ok());
     EXPECT_LT(target.pixelColor(5, 0).lightness(), target.pixelColor(5, 11).lightness());
     EXPECT_LT(target.pixelColor(1, 5).lightness(), target.pixelColor(10, 5).lightness());
     EXPECT_EQ(target.pixelColor(6, 6), QColor(128, 128, 128));
