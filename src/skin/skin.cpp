@@ -21,9 +21,13 @@ int lookIndex(ControlLook look) {
 }  // namespace
 
 Piece glyphPlace(const Rect& box) {
-    const long long x = box.left + floorHalf(static_cast<long long>(box.right) - box.left) - 4;
-    const long long y = box.top + floorHalf(static_cast<long long>(box.bottom) - box.top) - 4;
-    if (!rect_math::fitsInt(x) || !rect_math::fitsInt(y)) {
+    const long long width = static_cast<long long>(box.right) - box.left;
+    const long long height = static_cast<long long>(box.bottom) - box.top;
+    const long long x = box.left + floorHalf(width) - 4;
+    const long long y = box.top + floorHalf(height) - 4;
+    // A box wider or higher than the coordinate range has no middle to speak of.
+    if (!rect_math::fitsInt(width) || !rect_math::fitsInt(height) || !rect_math::fitsInt(x) ||
+        !rect_math::fitsInt(y)) {
         return Piece{0, 0, 0, 0};
     }
     return Piece{static_cast<int>(x), static_cast<int>(y), 9, 9};

@@ -211,7 +211,7 @@ private:
 };
 
 // Where a 9 x 9 glyph goes to sit in the middle of `box`: left + (width / 2) - 4, halves rounded
-// down, and the same downwards.
+// down, and the same downwards. Empty for a box whose width or height leaves the 32-bit range.
 Piece glyphPlace(const Rect& box);
 
 }  // namespace kickvane::skin

@@ -10,7 +10,7 @@
 namespace kickvane::skin {
 namespace {
 
-using testing::Filled;
+using testing::filled;
 
 TEST(ImageSurfaceTest, Copy_UsesNearestPixelWhenPlain_AndBlendsWhenHalftone) {
     QImage source = filled(2, 1, Qt::black);

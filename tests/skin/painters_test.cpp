@@ -1,7 +1,7 @@
-#include <cmath>
 #include <functional>
 #include <limits>
-#include <set>
+#include <string>
+#include <vector>
 
 #include <gtest/gtest.h>
 #include <QCursor>
@@ -16,7 +16,7 @@
 namespace kickvane::skin {
 namespace {
 
-using testing::Filled;
+using testing::filled;
 using testing::RecordingSurface;
 using Kind = RecordingSurface::Kind;
 
@@ -39,207 +39,512 @@ Skin& theSkin() {
     return skin;
 }
 
-using Paint = std::function<void(Surface&, int state)>;
+using Paint = std::function<void(Surface&)>;
 
-TEST(PaintersTest, FramedPainters_PickTheirFrameByState_AndAFallbackForOtherStates) {
+// The first copy a painter asks for: which picture, and the top of the frame it copies from.
+struct FirstCopy {
+    const QImage* picture = nullptr;
+    int frameTop = -1;
+    size_t copies = 0;
+};
+
+FirstCopy firstCopy(const Paint& paint) {
+    RecordingSurface dc;
+    paint(dc);
+    auto copies = dc.of(Kind::Copy);
+    if (copies.empty()) {
+        copies = dc.of(Kind::CopyKeyed);
+    }
+    if (copies.empty()) {
+        return {};
+    }
+    return {copies[0].source, copies[0].from.y, copies.size()};
+}
+
+TEST(PaintersTest, FramedPainters_CopyTheFrameOfTheirLook_AsNinePieces) {
     Skin& k = theSkin();
     const SkinPictures& p = k.pictures();
     const Rect box{0, 0, 80, 24};
-    const Paint button = [&](Surface& dc, int s) { k.ThemeButton(0, dc, s, false, false, box); };
-    const Paint header = [&](Surface& dc, int s) { k.DrawListview(0, dc, 0, s, box); };
-    const Paint tab = [&](Surface& dc, int s) { k.ThemeTab(0, dc, 1, s, box, 0); };
-    const Paint combo = [&](Surface& dc, int s) { k.ThemeCombobox(0, dc, s, 1, box); };
-    const Paint spinRight = [&](Surface& dc, int s) { k.ThemeSpinButton(dc, s, 3, box); };
-    const Paint spinUp = [&](Surface& dc, int s) { k.ThemeSpinButton(dc, s, 2, box); };
-    // Trackbar thumbs by ticks and orientation; looks 0 normal, 1 hot, 2 disabled while hot.
-    const auto thumb = [&](int ticks, int orientation) -> Paint {
-        return [&k, ticks, orientation](Surface& dc, int look) {
-            k.ThemeTrackbar(0, dc, look != 2, look >= 1, ticks, 1, orientation, Rect{0, 0, 21, 21});
-        };
-    };
     struct Case {
+        std::string what;
         Paint paint;
         const QImage* picture;
-        int normal;                  // the state that other states fall back to
-        std::vector<int> ownFrames;  // states with a frame of their own
-        std::vector<int> fallbacks;  // states without one
+        int frameTop;
     };
-    // Spin buttons: state 4 looks like state 0. Thumbs: looks 0 normal, 1 hot, 2 disabled.
-    const Case cases[] = {{button, &p.button, 1, {5}, {0, 6}},
-                          {header, &p.listHeaders, 1, {0}, {8}},
-                          {tab, &p.tabHeads, 0, {1, 3}, {6}},
-                          {combo, &p.comboButton, 1, {4}, {7}},
-                          {spinRight, &p.spinLeftRight, 0, {2}, {4}},
-                          {spinUp, &p.spinUpDown, 0, {3}, {4}},
-                          {thumb(1, 0), &p.trackThumbDown, 0, {1, 2}, {}},
-                          {thumb(0, 1), &p.trackThumbLeft, 0, {}, {}},
-                          {thumb(2, 1), &p.trackThumbLying, 0, {2}, {}}};
-    // The top of the frame that state `state` copies from, checking the copy on the way.
-    const auto frameTop = [](const Case& c, int state) {
-        RecordingSurface dc;
-        c.paint(dc, state);
-        auto copies = dc.of(Kind::Copy);
-        if (copies.empty()) {
-            copies = dc.of(Kind::CopyKeyed);  // keyed thumbs
-        }
-        EXPECT_EQ(copies.size(), 9u) << "state " << state;
-        EXPECT_TRUE(!copies.empty() && copies[0].source == c.picture) << "state " << state;
-        const int top = copies.empty() ? -1 : copies[0].from.y;
-        EXPECT_TRUE(top >= 0 && top < c.picture->height()) << "state " << state;
-        return top;
+    const Case cases[] = {
+        {"button disabled", [&](Surface& dc) { k.paintButton(dc, ButtonLook::Disabled, box); },
+         &p.button, 198},
+        {"button default", [&](Surface& dc) { k.paintButton(dc, ButtonLook::Default, box); },
+         &p.button, 264},
+        {"tab head selected with focus",
+         [&](Surface& dc) { k.paintTabHead(dc, TabLook::SelectedFocused, box); }, &p.tabHeads,
+         4 * 24},
+        {"empty list header", [&](Surface& dc) { k.paintListHeader(dc, HeaderLook::Empty, box); },
+         &p.listHeaders, 3 * 21},
+        {"pressed list header",
+         [&](Surface& dc) { k.paintListHeader(dc, HeaderLook::Pressed, box); }, &p.listHeaders,
+         1 * 21},
+        {"disabled combo button",
+         [&](Surface& dc) { k.paintComboButton(dc, ControlLook::Disabled, box); }, &p.comboButton,
+         3 * 19},
+        {"pressed spin down",
+         [&](Surface& dc) {
+             k.paintSpinButton(dc, ArrowDirection::Down, ControlLook::Pressed, box);
+         },
+         &p.spinUpDown, 6 * 10},
+        {"hot spin left",
+         [&](Surface& dc) { k.paintSpinButton(dc, ArrowDirection::Left, ControlLook::Hot, box); },
+         &p.spinLeftRight, 1 * 17},
+        {"hovered scroll down",
+         [&](Surface& dc) {
+             k.paintScrollButton(dc, ArrowDirection::Down, ScrollButtonLook::Hover, box);
+         },
+         &p.scrollButtons, 19 * 17},
+        {"scroll down",
+         [&](Surface& dc) {
+             k.paintScrollButton(dc, ArrowDirection::Down, ScrollButtonLook::Normal, box);
+         },
+         &p.scrollButtons, 12 * 17},
+        {"disabled scroll right",
+         [&](Surface& dc) {
+             k.paintScrollButton(dc, ArrowDirection::Right, ScrollButtonLook::Disabled, box);
+         },
+         &p.scrollButtons, 7 * 17},
+        {"vertical track", [&](Surface& dc) { k.paintScrollTrack(dc, Orientation::Vertical, box); },
+         &p.scrollButtons, 8 * 17},
+        {"pressed vertical thumb",
+         [&](Surface& dc) {
+             k.paintScrollThumb(dc, Orientation::Vertical, ControlLook::Pressed, box);
+         },
+         &p.scrollThumbVertical, 2 * 17},
+        {"disabled thumb of a horizontal track bar, pointing down",
+         [&](Surface& dc) {
+             k.paintTrackBarThumb(dc, Orientation::Horizontal, ThumbPoint::BottomOrRight,
+                                  ThumbLook::Disabled, box);
+         },
+         &p.trackThumbDown, 2 * 21},
+        {"hot plain thumb of a vertical track bar",
+         [&](Surface& dc) {
+             k.paintTrackBarThumb(dc, Orientation::Vertical, ThumbPoint::None, ThumbLook::Hot, box);
+         },
+         &p.trackThumbLying, 1 * 15},
+        {"checked toolbar button",
+         [&](Surface& dc) {
+             k.paintToolbarButton(dc, ToolbarButtonPart::Button, ToolbarLook::Checked, box);
+         },
+         &p.toolbarButton, kToolbarChecked * 22},
+        {"hot open menu bar item",
+         [&](Surface& dc) { k.paintMenu(dc, MenuPart::BarItem, MenuLook::Open, box); }, &p.menuItem,
+         22},
+        {"pressed menu button",
+         [&](Surface& dc) { k.paintMenu(dc, MenuPart::Button, MenuLook::Pressed, box); },
+         &p.toolbarButton, kToolbarPressed * 22},
+        {"disabled tick",
+         [&](Surface& dc) { k.paintMenu(dc, MenuPart::Tick, MenuLook::Disabled, box); },
+         &p.menuMarks, 2 * 16},
+        {"status bar in simple mode",
+         [&](Surface& dc) { k.paintStatusBar(dc, StatusBarPart::SimpleBar, box); }, &p.statusBar,
+         3 * 22},
     };
     for (const Case& c : cases) {
-        const int normal = frameTop(c, c.normal);
-        std::set<int> tops{normal};
-        for (int state : c.ownFrames) {
-            EXPECT_TRUE(tops.insert(frameTop(c, state)).second) << "state " << state;
-        }
-        for (int state : c.fallbacks) {
-            EXPECT_EQ(frameTop(c, state), normal) << "state " << state;
-        }
+        const FirstCopy copy = firstCopy(c.paint);
+        EXPECT_EQ(copy.picture, c.picture) << c.what;
+        EXPECT_EQ(copy.frameTop, c.frameTop) << c.what;
+        EXPECT_GT(copy.copies, 0u) << c.what;
     }
-    RecordingSurface none;
-    k.ThemeTab(0, none, 1, 0, box, 1);  // side tabs
-    thumb(3, 1)(none, 0);
-    EXPECT_TRUE(none.calls.empty());
 }
 
-TEST(PaintersTest, CheckAndOption_CopyTheirCellForPlDrawZero_AndFailForStatesWithoutACell) {
+TEST(PaintersTest, PartsWithoutThatLook_DrawNothing) {
+    Skin& k = theSkin();
+    const Rect box{0, 0, 40, 20};
+    const Paint none[] = {
+        [&](Surface& dc) {
+            k.paintToolbarButton(dc, ToolbarButtonPart::DropDown, ToolbarLook::Flat, box);
+        },
+        [&](Surface& dc) { k.paintMenu(dc, MenuPart::BarItem, MenuLook::Normal, box); },
+        [&](Surface& dc) { k.paintMenu(dc, MenuPart::ItemHighlight, MenuLook::Normal, box); },
+        [&](Surface& dc) { k.paintMenu(dc, MenuPart::Button, MenuLook::Normal, box); },
+        [&](Surface& dc) { k.paintMenu(dc, MenuPart::MarkBox, MenuLook::Checked, box); },
+        [&](Surface& dc) { k.paintSizeBox(dc, ControlLook::Disabled, box); },
+        [&](Surface& dc) { k.paintMenuBox(dc, MenuBox::Item, MenuBoxLook::Pressed, box); },
+    };
+    for (size_t i = 0; i < std::size(none); ++i) {
+        RecordingSurface dc;
+        none[i](dc);
+        EXPECT_TRUE(dc.calls.empty()) << "case " << i;
+    }
+}
+
+TEST(PaintersTest, CheckBoxAndOptionButton_CopyTheirCell_OptionShowsTheTargetAroundIt) {
+    Skin& k = theSkin();
     QImage target = filled(40, 40, Qt::black);
     ImageSurface image(target);
-    ASSERT_TRUE(theSkin().ThemeCheck(0, image, 3, 1, Rect{5, 7, 0, 0}).ok());
-    EXPECT_EQ(target, filled(40, 40, Qt::black));
-    ASSERT_TRUE(theSkin().ThemeCheck(0, image, 3, 0, Rect{5, 7, 0, 0}).ok());
-    EXPECT_EQ(target.copy(5, 7, 13, 13), theSkin().pictures().checkBox.copy(0, 26, 13, 13));
+    ASSERT_TRUE(
+        k.paintCheckBox(image, CheckState::Unticked, ControlLook::Pressed, Rect{5, 7, 30, 30})
+            .ok());
+    EXPECT_EQ(target.copy(5, 7, 13, 13), k.pictures().checkBox.copy(0, 26, 13, 13));
+    EXPECT_EQ(target.pixelColor(18, 7), QColor(Qt::black));  // 13 wide, whatever the box
 
-    RecordingSurface dc;
-    EXPECT_FALSE(theSkin().ThemeCheck(0, dc, 0, 0, Rect{}).ok());
-    EXPECT_FALSE(theSkin().ThemeCheck(0, dc, 13, 0, Rect{}).ok());
-    EXPECT_FALSE(theSkin().ThemeOption(0, dc, 9, 1, Rect{}).ok());
-    EXPECT_TRUE(theSkin().ThemeOption(0, dc, 9, 2, Rect{}).ok());  // plDraw 2 draws nothing
-    EXPECT_TRUE(dc.calls.empty());
-
-    // An option button is round: its cell is copied with the key, the target shows around it.
-    ASSERT_TRUE(theSkin().ThemeOption(0, dc, 6, 0, Rect{0, 0, 13, 13}).ok());
-    const auto option = dc.of(Kind::CopyKeyed);
-    ASSERT_EQ(option.size(), 1u);
-    EXPECT_EQ(option[0].source, &theSkin().pictures().optionButton);
-    EXPECT_EQ(option[0].from, (Piece{0, 5 * 13, 13, 13}));
+    QImage under = filled(13, 13, Qt::black);
+    ImageSurface dc(under);
+    ASSERT_TRUE(
+        k.paintOptionButton(dc, OptionState::Selected, ControlLook::Hot, Rect{0, 0, 13, 13}).ok());
+    const QImage cell = k.pictures().optionButton.copy(0, 5 * 13, 13, 13);
+    int shownThrough = 0;
+    for (int y = 0; y < 13; ++y) {
+        for (int x = 0; x < 13; ++x) {
+            const bool key = (cell.pixel(x, y) & 0xFFFFFFu) == kMagentaKey;
+            EXPECT_EQ(under.pixel(x, y), key ? QColor(Qt::black).rgb() : cell.pixel(x, y))
+                << x << "," << y;
+            shownThrough += key ? 1 : 0;
+        }
+    }
+    EXPECT_GT(shownThrough, 0);
 }
 
-TEST(PaintersTest, ThemeScroll_PicksButtonFrameByState_HoverOnlyWhileCursorIsOverTheBar) {
-    Skin skin(makeSkinPictures());
-    constexpr WindowHandle kBar = 42;
-    const auto frame = [&](bool vertical, int part, int state, WindowHandle atCursor,
-                           bool readable = true) {
-        skin.setPointerProbe(std::make_shared<FakePointer>(atCursor, readable));
-        RecordingSurface dc;
-        skin.ThemeScroll(kBar, dc, Rect{0, 0, 17, 17}, part, state, vertical);
-        const auto copies = dc.of(Kind::Copy);
-        return copies.size() == 9u ? copies[0].from.y / 17 : -1;
+// The area all copies of a painter cover, by their target pieces.
+Rect coveredBy(const RecordingSurface& dc) {
+    Rect area{std::numeric_limits<int>::max(), std::numeric_limits<int>::max(),
+              std::numeric_limits<int>::min(), std::numeric_limits<int>::min()};
+    for (const auto& call : dc.of(Kind::Copy)) {
+        area.left = std::min(area.left, call.to.x);
+        area.top = std::min(area.top, call.to.y);
+        area.right = std::max(area.right, call.to.x + call.to.width);
+        area.bottom = std::max(area.bottom, call.to.y + call.to.height);
+    }
+    return area;
+}
+
+TEST(PaintersTest, Progress_TroughFillsItsBox_BarIsInsetByTwo) {
+    Skin& k = theSkin();
+    RecordingSurface trough;
+    k.paintProgressTrough(trough, Orientation::Horizontal, Rect{0, 0, 200, 18});
+    EXPECT_EQ(coveredBy(trough), (Rect{0, 0, 200, 18}));
+    EXPECT_EQ(trough.of(Kind::Copy)[0].source, &k.pictures().progress);
+    EXPECT_EQ(trough.of(Kind::Copy)[0].from.y, 0);
+
+    RecordingSurface bar;
+    k.paintProgressBar(bar, Orientation::Horizontal, Rect{0, 0, 100, 18});
+    EXPECT_EQ(coveredBy(bar), (Rect{2, 2, 98, 16}));
+    EXPECT_EQ(bar.of(Kind::Copy)[0].from.y, 18);
+
+    RecordingSurface upright;
+    k.paintProgressBar(upright, Orientation::Vertical, Rect{0, 0, 18, 60});
+    EXPECT_EQ(upright.of(Kind::Copy)[0].source, &k.pictures().progressVertical);
+    EXPECT_EQ(upright.of(Kind::Copy)[0].from.y, 53);
+}
+
+// Flat boxes: the colours of their fills, in order (a frame is one colour).
+TEST(PaintersTest, FlatBoxes_FillAndFrameInTheirColours) {
+    Skin& k = theSkin();
+    const Rect box{0, 0, 40, 20};
+    const Colour face = *ShapeHelper::translateColor(kSysButtonFace);
+    const Colour shadow = *ShapeHelper::translateColor(kSysButtonShadow);
+    const Colour pale = rgb(191, 208, 237);
+    const Colour edge = rgb(49, 106, 197);
+    const Colour cream = rgb(247, 246, 238);
+    const Colour creamEdge = rgb(172, 168, 153);
+    struct Case {
+        std::string what;
+        Paint paint;
+        std::vector<Colour> fills;
     };
-    // The down button of an upright bar: plain, hover, pressed, hot.
-    EXPECT_EQ(frame(true, 1, 0, 7), 12);
-    EXPECT_EQ(frame(true, 1, 0, kBar), 19);
-    EXPECT_EQ(frame(true, 1, 1, kBar), 14);
-    EXPECT_EQ(frame(true, 1, 2, kBar), 13);
-    // The left button, and the right one disabled.
-    EXPECT_EQ(frame(false, 0, 0, 7), 0);
-    EXPECT_EQ(frame(false, 1, 3, 7), 7);
-    // A cursor that cannot be read shows the plain look.
-    EXPECT_EQ(frame(true, 1, 0, kBar, false), 12);
-}
-
-TEST(PaintersTest, ListboxAndCombobox_DrawTheWindowsText) {
-    Skin skin(makeSkinPictures());
-    skin.setWindowTextReader([](WindowHandle h) { return h == 5 ? "Bóng" : ""; });
-    RecordingSurface list;
-    skin.ThemeListbox(5, list, 1, Rect{10, 20, 200, 44});
-    RecordingSurface combo;
-    skin.ThemeCombobox(5, combo, 2, 0, Rect{10, 20, 200, 44});
-    for (const RecordingSurface* dc : {&list, &combo}) {
-        ASSERT_EQ(dc->of(Kind::Text).size(), 1u);
-        EXPECT_EQ(dc->of(Kind::Text)[0].text, "Bóng");
+    const Case cases[] = {
+        {"menu background",
+         [&](Surface& dc) { k.paintMenuBox(dc, MenuBox::Background, MenuBoxLook::Hot, box); },
+         {face}},
+        {"hot menu item",
+         [&](Surface& dc) { k.paintMenuBox(dc, MenuBox::Item, MenuBoxLook::Hot, box); },
+         {pale, edge}},
+        {"menu margin",
+         [&](Surface& dc) { k.paintMenuBox(dc, MenuBox::Margin, MenuBoxLook::Hot, box); },
+         {rgb(255, 255, 255)}},
+        {"highlight",
+         [&](Surface& dc) { k.paintMenuBox(dc, MenuBox::Highlight, MenuBoxLook::Pressed, box); },
+         {cream, creamEdge}},
+        {"pressed menu button",
+         [&](Surface& dc) { k.paintMenuBox(dc, MenuBox::Button, MenuBoxLook::Pressed, box); },
+         {rgb(160, 187, 228), edge}},
+        {"hot menu button",
+         [&](Surface& dc) { k.paintMenuBox(dc, MenuBox::Button, MenuBoxLook::Hot, box); },
+         {rgb(227, 235, 247), edge}},
+        {"colour popup cell",
+         [&](Surface& dc) { (void)k.paintColorPopup(dc, ColorPopupPart::SelectedCell, box); },
+         {pale, edge}},
+        {"colour popup outline",
+         [&](Surface& dc) { (void)k.paintColorPopup(dc, ColorPopupPart::Outline, box); },
+         {shadow}},
+        {"pressed size box",
+         [&](Surface& dc) { k.paintSizeBox(dc, ControlLook::Pressed, box); },
+         {*ShapeHelper::shadeColor(pale, -20), edge}},
+        {"size box",
+         [&](Surface& dc) { k.paintSizeBox(dc, ControlLook::Normal, box); },
+         {face, shadow}},
+        {"combo field",
+         [&](Surface& dc) { k.paintComboBox(dc, ComboPart::Field, box); },
+         {*ShapeHelper::translateColor(kSysWindow), rgb(101, 147, 207)}},
+        {"text box", [&](Surface& dc) { k.paintTextBoxOutline(dc, box); }, {rgb(101, 147, 207)}},
+        {"list outline", [&](Surface& dc) { k.paintListOutline(dc, box); }, {rgb(101, 147, 207)}},
+        {"pressed window tab button",
+         [&](Surface& dc) { (void)k.paintWindowTab(dc, WindowTabPart::PressedButton, box); },
+         {rgb(160, 187, 228), edge}},
+    };
+    for (const Case& c : cases) {
+        RecordingSurface dc;
+        c.paint(dc);
+        EXPECT_EQ(dc.fillColours(), c.fills) << c.what;
     }
 }
 
-// Menu boxes draw by part and state; a bottom that is no pixel draws nothing.
-TEST(PaintersTest, FlatBoxes_DrawByPartAndState_AndSkipBottomsThatAreNoPixels) {
-    const auto fills = [](int part, int state, double bottom) {
-        RecordingSurface dc;
-        theSkin().ThemeMenus(0, dc, part, state, 0, 0, 40, bottom);
-        return dc.fillColours().size();
-    };
-    EXPECT_EQ(fills(0, 1, 20.0), 1u);  // a plain box
-    EXPECT_EQ(fills(1, 1, 20.0), 2u);  // a framed one
-    EXPECT_EQ(fills(0, 2, 20.0), 0u);
-    EXPECT_EQ(fills(0, 1, std::nan("")), 0u);
-    EXPECT_EQ(fills(0, 1, 1e12), 0u);
+TEST(PaintersTest, ListBoxAndComboBox_DrawTheirTextBesideThePicture) {
+    Skin& k = theSkin();
+    RecordingSurface list;
+    k.paintListBoxItem(list, ItemLook::Hot, Rect{10, 20, 200, 44}, "Bóng");
+    ASSERT_EQ(list.of(Kind::Text).size(), 1u);
+    EXPECT_EQ(list.of(Kind::Text)[0].text, "Bóng");
+    EXPECT_EQ(list.of(Kind::Text)[0].area, (Rect{36, 20, 200, 44}));
+    EXPECT_EQ(list.of(Kind::Copy)[0].from.y, 66);  // the button's hot frame
+
+    RecordingSurface combo;
+    k.paintComboText(combo, Rect{10, 20, 200, 44}, "Bóng");
+    ASSERT_EQ(combo.of(Kind::Text).size(), 1u);
+    EXPECT_EQ(combo.of(Kind::Text)[0].area, (Rect{10, 22, 198, 42}));
 }
 
 TEST(PaintersTest, ReportingPainters_ReturnFailuresOfTheirSurface) {
     QImage none;
     ImageSurface nowhere(none);
-    EXPECT_FALSE(theSkin().ThemePopupColor(0, nowhere, 1, Rect{0, 0, 10, 10}).ok());
-    int measure = 0;
-    EXPECT_FALSE(theSkin().ThemeMDITab(0, nowhere, 2, 0, 0, 80, 20, measure).ok());
-    EXPECT_FALSE(theSkin().ThemeCheck(0, nowhere, 1, 0, Rect{}).ok());
+    Skin& k = theSkin();
+    EXPECT_FALSE(k.paintColorPopup(nowhere, ColorPopupPart::SelectedCell, Rect{0, 0, 10, 10}).ok());
+    EXPECT_FALSE(k.paintWindowTab(nowhere, WindowTabPart::ActiveTab, Rect{0, 0, 80, 20}).ok());
+    EXPECT_FALSE(
+        k.paintCheckBox(nowhere, CheckState::Ticked, ControlLook::Normal, Rect{0, 0, 13, 13}).ok());
     // Suppressing painters just draw nothing.
-    theSkin().ThemeButton(0, nowhere, 1, false, false, Rect{0, 0, 10, 10});
+    k.paintButton(nowhere, ButtonLook::Normal, Rect{0, 0, 10, 10});
 }
 
-TEST(PaintersTest, ThemeMDITab_RoundsItsCoordinates_AndRejectsOnesThatAreNoPixels) {
-    RecordingSurface dc;
-    int measure = 0;
-    ASSERT_TRUE(theSkin().ThemeMDITab(0, dc, 10, 1.5f, 2.5f, 20.4f, 18.6f, measure).ok());
-    EXPECT_EQ(dc.of(Kind::Fill)[0].area, (Rect{2, 2, 20, 19}));
-
-    const float inf = std::numeric_limits<float>::infinity();
-    EXPECT_FALSE(theSkin().ThemeMDITab(0, dc, 10, 0, 0, inf, 10, measure).ok());
-    EXPECT_FALSE(theSkin().ThemeMDITab(0, dc, 10, 0, 0, 3e9f, 10, measure).ok());
-}
-
-TEST(PaintersTest, EveryPainter_StaysInsideThePicture_WithRectanglesAtTheCoordinateLimits) {
-    const int lo = std::numeric_limits<int>::min();
-    const int hi = std::numeric_limits<int>::max();
-    Skin& skin = theSkin();
-    skin.setPointerProbe(std::make_shared<FakePointer>(1));
-    for (const Rect& box : {Rect{lo, lo, hi, hi}, Rect{hi, hi, lo, lo}, Rect{hi - 1, 0, hi, 5},
-                            Rect{lo, lo, lo + 1, lo + 1}}) {
-        QImage target = filled(16, 16, Qt::white);
-        ImageSurface dc(target);
-        const auto [l, t, r, b] = box;
-        int measure = 0;
-        for (int part = 0; part <= 15; ++part) {
-            for (int state = -1; state <= 5; ++state) {
-                skin.ThemeCommandBarMenu(1, dc, part, state, box);
-                skin.ThemePropertyGrid(1, dc, state, part, box);
-                skin.ThemeDate(1, dc, state, part, box);
-                skin.ThemeSpinButton(dc, state, part, box);
-                skin.DrawTextbox(1, dc, state, l, t, r, b);
-                skin.ThemeTrackbar(1, dc, state > 0, state > 1, state, part % 2, part / 8, box);
-                skin.ThemeScroll(1, dc, box, part, state, state % 2 == 0);
-                skin.ThemeListbox(1, dc, part, box);
-                skin.ThemeStatusBar(1, dc, part, box);
-                skin.ThemeTab(1, dc, part, state, box, 0);
-                skin.DrawListview(1, dc, part, state, box);
-                skin.ThemeCombobox(1, dc, state, part, box);
-                skin.ThemeButton(1, dc, state, false, false, box);
-                skin.ThemeProgress(1, dc, part, r, b, box);
-                (void)skin.ThemeCheck(1, dc, state, part, box);
-                (void)skin.ThemeOption(1, dc, state, part, box);
-                skin.ThemeUniToolbar(1, dc, part, 0, l, t, r, b, state, r, b);
-                skin.ThemeMenus(1, dc, part, state, l, t, r, b);
-                (void)skin.ThemePopupColor(1, dc, part, box);
-                (void)skin.ThemeMDITab(1, dc, part, static_cast<float>(l), static_cast<float>(t),
-                                       static_cast<float>(r), static_cast<float>(b), measure);
+// Every painter in every look, drawn into a box in the middle of a white image: it draws there
+// and nowhere else. The combo box's pictures start 2 pixels left of their box.
+TEST(PaintersTest, EveryPainter_DrawsInsideItsBoxAndNowhereElse) {
+    Skin& k = theSkin();
+    const Rect box{10, 10, 50, 34};
+    const Rect wider{8, 10, 50, 33};
+    struct Case {
+        std::string what;
+        Paint paint;
+        Rect allowed;
+    };
+    std::vector<Case> cases;
+    const auto add = [&](std::string what, Paint paint, Rect allowed = Rect{10, 10, 50, 34}) {
+        cases.push_back({std::move(what), std::move(paint), allowed});
+    };
+    constexpr ControlLook looks[] = {ControlLook::Normal, ControlLook::Hot, ControlLook::Pressed,
+                                     ControlLook::Disabled};
+    for (int i = 0; i < 5; ++i) {
+        add("button", [&, i](Surface& dc) { k.paintButton(dc, ButtonLook(i), box); });
+    }
+    for (ControlLook look : looks) {
+        for (int state = 0; state < 3; ++state) {
+            add("check box", [&, look, state](Surface& dc) {
+                (void)k.paintCheckBox(dc, CheckState(state), look, box);
+            });
+        }
+        add("option", [&, look](Surface& dc) {
+            (void)k.paintOptionButton(dc, OptionState::Selected, look, box);
+        });
+        add(
+            "combo button", [&, look](Surface& dc) { k.paintComboButton(dc, look, box); }, wider);
+        add("toolbar combo button",
+            [&, look](Surface& dc) { k.paintToolbarComboButton(dc, look, box); });
+        add("size box", [&, look](Surface& dc) { k.paintSizeBox(dc, look, box); });
+        for (Orientation bar : {Orientation::Horizontal, Orientation::Vertical}) {
+            add("scroll thumb",
+                [&, look, bar](Surface& dc) { k.paintScrollThumb(dc, bar, look, box); });
+        }
+        for (int d = 0; d < 4; ++d) {
+            add("spin button",
+                [&, look, d](Surface& dc) { k.paintSpinButton(dc, ArrowDirection(d), look, box); });
+        }
+    }
+    for (int d = 0; d < 4; ++d) {
+        for (int look = 0; look < 5; ++look) {
+            add("scroll button", [&, d, look](Surface& dc) {
+                k.paintScrollButton(dc, ArrowDirection(d), ScrollButtonLook(look), box);
+            });
+        }
+    }
+    for (Orientation o : {Orientation::Horizontal, Orientation::Vertical}) {
+        add("progress trough", [&, o](Surface& dc) { k.paintProgressTrough(dc, o, box); });
+        add("progress bar", [&, o](Surface& dc) { k.paintProgressBar(dc, o, box); });
+        add("scroll track", [&, o](Surface& dc) { k.paintScrollTrack(dc, o, box); });
+        for (int point = 0; point < 3; ++point) {
+            for (int look = 0; look < 3; ++look) {
+                add("track bar thumb", [&, o, point, look](Surface& dc) {
+                    k.paintTrackBarThumb(dc, o, ThumbPoint(point), ThumbLook(look), box);
+                });
             }
         }
-        EXPECT_EQ(target.size(), QSize(16, 16));
+    }
+    add("track bar channel", [&](Surface& dc) { k.paintTrackBarChannel(dc, box); });
+    add("list box item",
+        [&](Surface& dc) { k.paintListBoxItem(dc, ItemLook::Hot, box, "Sân cỏ mùa xuân"); });
+    add("combo field", [&](Surface& dc) { k.paintComboBox(dc, ComboPart::Field, box); });
+    add("combo selection", [&](Surface& dc) { k.paintComboBox(dc, ComboPart::Selection, box); });
+    add(
+        "combo push button", [&](Surface& dc) { k.paintComboBox(dc, ComboPart::PushButton, box); },
+        wider);
+    add("combo text", [&](Surface& dc) { k.paintComboText(dc, box, "Sân cỏ mùa xuân"); });
+    for (int part = 0; part < 6; ++part) {
+        add("status bar",
+            [&, part](Surface& dc) { k.paintStatusBar(dc, StatusBarPart(part), box); });
+    }
+    add("tab panel", [&](Surface& dc) { k.paintTabPanel(dc, box); });
+    for (int look = 0; look < 4; ++look) {
+        add("tab head", [&, look](Surface& dc) { k.paintTabHead(dc, TabLook(look), box); });
+        add("list header",
+            [&, look](Surface& dc) { k.paintListHeader(dc, HeaderLook(look), box); });
+    }
+    add("list outline", [&](Surface& dc) { k.paintListOutline(dc, box); });
+    for (int part = 0; part < 5; ++part) {
+        add("property grid",
+            [&, part](Surface& dc) { k.paintPropertyGrid(dc, PropertyGridPart(part), box); });
+    }
+    add("date field", [&](Surface& dc) { k.paintDate(dc, DatePart::Field, box); });
+    add("date button", [&](Surface& dc) { k.paintDate(dc, DatePart::DropButton, box); });
+    add("toolbar", [&](Surface& dc) { k.paintToolbarBackground(dc, box); });
+    add("toolbar panel", [&](Surface& dc) { k.paintToolbarPanel(dc, box); });
+    for (int part = 0; part < 3; ++part) {
+        for (int look = 1; look < 6; ++look) {
+            add("toolbar button", [&, part, look](Surface& dc) {
+                k.paintToolbarButton(dc, ToolbarButtonPart(part), ToolbarLook(look), box);
+            });
+        }
+    }
+    const Rect lineEnd{10, 10, 51, 35};  // a separator's line includes its end point
+    for (int look = 0; look < 3; ++look) {
+        add(
+            "separator",
+            [&, look](Surface& dc) {
+                k.paintMenuBox(dc, MenuBox::Separator, MenuBoxLook(look), box);
+            },
+            lineEnd);
+    }
+    for (int part = 0; part < 7; ++part) {
+        add("window tab",
+            [&, part](Surface& dc) { (void)k.paintWindowTab(dc, WindowTabPart(part), box); });
+        for (int look = 0; look < 3; ++look) {
+            if (MenuBox(part) == MenuBox::Separator) {
+                continue;
+            }
+            add("menu box", [&, part, look](Surface& dc) {
+                k.paintMenuBox(dc, MenuBox(part), MenuBoxLook(look), box);
+            });
+        }
+    }
+    for (int part = 0; part < 3; ++part) {
+        add("colour popup",
+            [&, part](Surface& dc) { (void)k.paintColorPopup(dc, ColorPopupPart(part), box); });
+    }
+    add("text box", [&](Surface& dc) { k.paintTextBoxOutline(dc, box); });
+    for (int part = 0; part < 12; ++part) {
+        for (int look = 0; look < 6; ++look) {
+            add("menu", [&, part, look](Surface& dc) {
+                k.paintMenu(dc, MenuPart(part), MenuLook(look), box);
+            });
+        }
+    }
+
+    const QColor white(Qt::white);
+    int drewSomething = 0;
+    for (const Case& c : cases) {
+        QImage target = filled(60, 44, white);
+        ImageSurface dc(target);
+        c.paint(dc);
+        bool inside = false;
+        bool outside = false;
+        for (int y = 0; y < target.height(); ++y) {
+            for (int x = 0; x < target.width(); ++x) {
+                if (target.pixelColor(x, y) == white) {
+                    continue;
+                }
+                const bool in = x >= c.allowed.left && x < c.allowed.right && y >= c.allowed.top &&
+                                y < c.allowed.bottom;
+                (in ? inside : outside) = true;
+            }
+        }
+        EXPECT_FALSE(outside) << c.what;
+        drewSomething += inside ? 1 : 0;
+    }
+    // Only the looks that a part does not have leave the image white.
+    EXPECT_GT(drewSomething, static_cast<int>(cases.size()) * 8 / 10);
+}
+
+// Rectangles at the ends of the coordinate range, inverted or far outside the image: nothing
+// wraps around into view.
+TEST(PaintersTest, RectanglesAtTheCoordinateLimits_DrawNothingIntoView) {
+    const int lo = std::numeric_limits<int>::min();
+    const int hi = std::numeric_limits<int>::max();
+    Skin& k = theSkin();
+    using BoxPaint = std::function<void(Surface&, const Rect&)>;
+    std::vector<std::pair<std::string, BoxPaint>> painters;
+    for (int look = 0; look < 4; ++look) {
+        const std::string n = " " + std::to_string(look);
+        painters.push_back({"button" + n, [&k, look](Surface& dc, const Rect& box) {
+                                k.paintButton(dc, ButtonLook(look), box);
+                            }});
+        painters.push_back({"scroll button" + n, [&k, look](Surface& dc, const Rect& box) {
+                                k.paintScrollButton(dc, ArrowDirection(look),
+                                                    ScrollButtonLook(look), box);
+                            }});
+        painters.push_back({"spin button" + n, [&k, look](Surface& dc, const Rect& box) {
+                                k.paintSpinButton(dc, ArrowDirection(look), ControlLook(look), box);
+                            }});
+        painters.push_back({"combo button" + n, [&k, look](Surface& dc, const Rect& box) {
+                                k.paintComboButton(dc, ControlLook(look), box);
+                            }});
+        painters.push_back({"window tab" + n, [&k, look](Surface& dc, const Rect& box) {
+                                (void)k.paintWindowTab(dc, WindowTabPart(look), box);
+                            }});
+        painters.push_back({"menu" + n, [&k, look](Surface& dc, const Rect& box) {
+                                k.paintMenu(dc, MenuPart(6 + look), MenuLook::Normal, box);
+                            }});
+    }
+    for (int part = 0; part < 6; ++part) {
+        painters.push_back(
+            {"status bar " + std::to_string(part), [&k, part](Surface& dc, const Rect& box) {
+                 k.paintStatusBar(dc, StatusBarPart(part), box);
+             }});
+    }
+    painters.push_back({"progress bar", [&k](Surface& dc, const Rect& box) {
+                            k.paintProgressBar(dc, Orientation::Horizontal, box);
+                        }});
+    painters.push_back({"track bar thumb", [&k](Surface& dc, const Rect& box) {
+                            k.paintTrackBarThumb(dc, Orientation::Vertical, ThumbPoint::None,
+                                                 ThumbLook::Hot, box);
+                        }});
+    painters.push_back({"list box item", [&k](Surface& dc, const Rect& box) {
+                            k.paintListBoxItem(dc, ItemLook::Normal, box, "x");
+                        }});
+    painters.push_back(
+        {"combo text", [&k](Surface& dc, const Rect& box) { k.paintComboText(dc, box, "x"); }});
+    for (const Rect& box : {Rect{hi, hi, lo, lo}, Rect{hi - 1, 0, hi, 5},
+                            Rect{lo, lo, lo + 1, lo + 1}, Rect{lo, 0, lo + 40, 16}}) {
+        for (const auto& [name, paint] : painters) {
+            QImage target = filled(16, 16, Qt::white);
+            ImageSurface dc(target);
+            paint(dc, box);
+            EXPECT_EQ(target, filled(16, 16, Qt::white))
+                << name << " in " << box.left << "," << box.top << "," << box.right << ","
+                << box.bottom;
+        }
     }
 }
 
-TEST(PaintersTest, MDMouseOver_IsFalseOverAChildWindow_AndTrueOverTheChild) {
+TEST(PaintersTest, IsUnderCursor_OnlyForTheWindowItself_NotItsParent) {
+    Skin skin(makeSkinPictures());
+    skin.setPointerProbe(std::make_shared<FakePointer>(42, false));
+    EXPECT_FALSE(skin.isUnderCursor(42).has_value());
+
     QWindow parent;
     parent.setGeometry(100, 100, 200, 200);
     QWindow child(&parent);
@@ -251,16 +556,11 @@ TEST(PaintersTest, MDMouseOver_IsFalseOverAChildWindow_AndTrueOverTheChild) {
         QGuiApplication::topLevelAt(QCursor::pos()) == nullptr) {
         GTEST_SKIP() << "this platform does not place the cursor";
     }
-    Skin skin(makeSkinPictures());
-    bool over = true;
-    ASSERT_TRUE(skin.MDMouseOver(static_cast<WindowHandle>(parent.winId()), over).ok());
-    EXPECT_FALSE(over);
-    ASSERT_TRUE(skin.MDMouseOver(static_cast<WindowHandle>(child.winId()), over).ok());
-    EXPECT_TRUE(over);
-
+    skin.setPointerProbe(std::make_shared<QtPointerProbe>());
+    EXPECT_EQ(skin.isUnderCursor(static_cast<WindowHandle>(parent.winId())), false);
+    EXPECT_EQ(skin.isUnderCursor(static_cast<WindowHandle>(child.winId())), true);
     QCursor::setPos(250, 250);
-    ASSERT_TRUE(skin.MDMouseOver(static_cast<WindowHandle>(parent.winId()), over).ok());
-    EXPECT_TRUE(over);
+    EXPECT_EQ(skin.isUnderCursor(static_cast<WindowHandle>(parent.winId())), true);
 }
 
 }  // namespace
