@@ -99,8 +99,8 @@ QString number(int v) {
 // The text the gallery's list and combo boxes show.
 constexpr const char* kItemText = "Sân cỏ mùa xuân";
 
-// Draws every painter; collects the failures the reporting painters return. The captions keep
-// the sheet's first numbering of parts and looks.
+// Draws every painter; collects the failures the reporting painters return. Row labels and
+// captions keep the wording and numbering the sheet was first drawn with, so sheets compare.
 void drawPainters(Skin& skin, ImageSurface& dc, Sheet& sheet, std::vector<std::string>& faults) {
     const auto check = [&](Status s, const char* what) {
         if (!s) {
@@ -121,19 +121,19 @@ void drawPainters(Skin& skin, ImageSurface& dc, Sheet& sheet, std::vector<std::s
         skin.paintButton(dc, ButtonLook::Normal, sheet.cell(140, 40, "normal, large"));
     }
 
-    sheet.row("ThemeCheck");
+    sheet.row("check box");
     for (CheckState state : {CheckState::Unticked, CheckState::Ticked, CheckState::Mixed}) {
         for (ControlLook look : kLooks) {
             const int n = 4 * static_cast<int>(state) + static_cast<int>(look) + 1;
-            check(skin.paintCheckBox(dc, state, look, sheet.cell(13, 13, number(n))), "ThemeCheck");
+            check(skin.paintCheckBox(dc, state, look, sheet.cell(13, 13, number(n))), "check box");
         }
     }
-    sheet.row("ThemeOption");
+    sheet.row("option button");
     for (OptionState state : {OptionState::Clear, OptionState::Selected}) {
         for (ControlLook look : kLooks) {
             const int n = 4 * static_cast<int>(state) + static_cast<int>(look) + 1;
             check(skin.paintOptionButton(dc, state, look, sheet.cell(13, 13, number(n))),
-                  "ThemeOption");
+                  "option button");
         }
     }
 
@@ -375,7 +375,7 @@ void drawPainters(Skin& skin, ImageSurface& dc, Sheet& sheet, std::vector<std::s
               "toolbar");
     }
 
-    sheet.row("ThemeMDITab");
+    sheet.row("window tab");
     {
         const Rect strip = sheet.cell(300, 60, "strip, tabs, frame, buttons");
         const auto [l, t, r, b] = strip;
@@ -390,7 +390,7 @@ void drawPainters(Skin& skin, ImageSurface& dc, Sheet& sheet, std::vector<std::s
             {WindowTabPart::PressedButton, Rect{r - 18, t + 3, r - 2, t + 17}},
         };
         for (const auto& [part, box] : parts) {
-            check(skin.paintWindowTab(dc, part, box), "ThemeMDITab");
+            check(skin.paintWindowTab(dc, part, box), "window tab");
         }
     }
 
@@ -420,13 +420,13 @@ void drawPainters(Skin& skin, ImageSurface& dc, Sheet& sheet, std::vector<std::s
         }
     }
 
-    sheet.row("ThemePopupColor");
+    sheet.row("colour popup");
     {
         const ColorPopupPart parts[] = {ColorPopupPart::Background, ColorPopupPart::SelectedCell,
                                         ColorPopupPart::SelectedCell, ColorPopupPart::Outline};
         for (int i = 0; i < 4; ++i) {
             check(skin.paintColorPopup(dc, parts[i], sheet.cell(30, 20, number(i))),
-                  "ThemePopupColor");
+                  "colour popup");
         }
     }
 

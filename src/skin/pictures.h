@@ -15,8 +15,8 @@ struct SkinPictures {
     QImage optionButton;           // 13 x 104, keyed: unset, set; each as checkBox
     QImage progress;               // 125 x 34: trough 53 x 18, bar 125 x 16 below it
     QImage progressVertical;       // 18 x 104: upright trough 18 x 53, bar 16 x 51 below
-    QImage arrows;                 // 9 x 180, keyed: see ArrowCell
-    QImage scrollButtons;          // 17 x 340: see ScrollButtonFrame
+    QImage arrows;                 // 9 x 180, keyed: see arrowCell
+    QImage scrollButtons;          // 17 x 340: see scrollButtonFrame
     QImage scrollThumbVertical;    // 21 x 68: upright thumb; normal, hot, pressed, disabled
     QImage scrollThumbHorizontal;  // 17 x 88: lying thumb; as above
     QImage spinLeftRight;          // 10 x 136: left then right button, 4 states each
@@ -45,7 +45,7 @@ struct SkinPictures {
     QImage menuMarkBox;            // 20 x 60: box behind a mark: normal, hot, disabled
 };
 
-// Glyph states shared by arrows's groups and several button pictures.
+// Looks shared by the arrow glyphs and several button pictures, in the order of their frames.
 enum GlyphState { kGlyphNormal = 0, kGlyphHot = 1, kGlyphPressed = 2, kGlyphDisabled = 3 };
 enum class ArrowDirection { Up = 0, Down = 1, Left = 2, Right = 3 };
 
@@ -78,7 +78,7 @@ enum ToolbarButtonFrame {
 };
 
 struct NamedPicture {
-    const char* name;
+    const char* name;  // as the gallery sheet labels it
     const QImage* image;
     int width;
     int height;
