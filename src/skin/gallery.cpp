@@ -121,14 +121,14 @@ void drawPainters(Skin& skin, ImageSurface& dc, Sheet& sheet, std::vector<std::s
         skin.paintButton(dc, ButtonLook::Normal, sheet.cell(140, 40, "normal, large"));
     }
 
-    sheet.row("check box");
+    sheet.row("ThemeCheck");
     for (CheckState state : {CheckState::Unticked, CheckState::Ticked, CheckState::Mixed}) {
         for (ControlLook look : kLooks) {
             const int n = 4 * static_cast<int>(state) + static_cast<int>(look) + 1;
             check(skin.paintCheckBox(dc, state, look, sheet.cell(13, 13, number(n))), "check box");
         }
     }
-    sheet.row("option button");
+    sheet.row("ThemeOption");
     for (OptionState state : {OptionState::Clear, OptionState::Selected}) {
         for (ControlLook look : kLooks) {
             const int n = 4 * static_cast<int>(state) + static_cast<int>(look) + 1;
@@ -375,7 +375,7 @@ void drawPainters(Skin& skin, ImageSurface& dc, Sheet& sheet, std::vector<std::s
               "toolbar");
     }
 
-    sheet.row("window tab");
+    sheet.row("ThemeMDITab");
     {
         const Rect strip = sheet.cell(300, 60, "strip, tabs, frame, buttons");
         const auto [l, t, r, b] = strip;
@@ -420,7 +420,7 @@ void drawPainters(Skin& skin, ImageSurface& dc, Sheet& sheet, std::vector<std::s
         }
     }
 
-    sheet.row("colour popup");
+    sheet.row("ThemePopupColor");
     {
         const ColorPopupPart parts[] = {ColorPopupPart::Background, ColorPopupPart::SelectedCell,
                                         ColorPopupPart::SelectedCell, ColorPopupPart::Outline};

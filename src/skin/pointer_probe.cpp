@@ -27,17 +27,14 @@ QWindow* deepestAt(QWindow* window, const QPoint& global) {
 
 }  // namespace
 
-Status QtPointerProbe::windowAtCursor(WindowHandle& window) const {
-    window = 0;
+std::optional<WindowHandle> QtPointerProbe::windowAtCursor() const {
+    // Reading the cursor needs a running application.
     if (qobject_cast<QGuiApplication*>(QCoreApplication::instance()) == nullptr) {
-        return Status::Fail("reading the cursor needs a running application");
+        return std::nullopt;
     }
     const QPoint global = QCursor::pos();
     QWindow* top = QGuiApplication::topLevelAt(global);
-    if (top != nullptr) {
-        window = static_cast<WindowHandle>(deepestAt(top, global)->winId());
-    }
-    return Status::Ok();
+    return top != nullptr ? static_cast<WindowHandle>(deepestAt(top, global)->winId()) : 0;
 }
 
 }  // namespace kickvane::skin

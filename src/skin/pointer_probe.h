@@ -1,6 +1,7 @@
 #pragma once
 
-#include "platform/status.h"
+#include <optional>
+
 #include "skin/surface.h"
 
 namespace kickvane::skin {
@@ -11,16 +12,16 @@ class PointerProbe {
 public:
     virtual ~PointerProbe() = default;
 
-    // Sets `window` to the window under the cursor, 0 when the cursor is over no window of ours.
-    // Fails when the cursor position cannot be read.
-    virtual Status windowAtCursor(WindowHandle& window) const = 0;
+    // The window under the cursor, 0 when the cursor is over no window of ours; nullopt when the
+    // cursor position cannot be read.
+    virtual std::optional<WindowHandle> windowAtCursor() const = 0;
 };
 
 // Asks Qt: the cursor position and the deepest visible QWindow that contains it. A handle is the
-// QWindow's winId(). Fails without a running QGuiApplication.
+// QWindow's winId(). Without a running QGuiApplication the cursor cannot be read.
 class QtPointerProbe final : public PointerProbe {
 public:
-    Status windowAtCursor(WindowHandle& window) const override;
+    std::optional<WindowHandle> windowAtCursor() const override;
 };
 
 }  // namespace kickvane::skin

@@ -159,38 +159,30 @@ Status ShapeHelper::drawText(Surface& dc, const Rect& box, std::string_view utf8
     return dc.text(box, utf8, *plain);
 }
 
-Status ShapeHelper::drawThemePart(Surface& dc, std::string_view className, int part, int state,
-                                  const Rect& box) const {
-    (void)state;
-    if (className == "Status" && part == 3) {
-        // Size grip: three diagonal rows of two-pixel dots in the bottom-right corner.
-        const Colour dot = *translateColor(kSysButtonShadow);
-        const Colour glint = *translateColor(kSysButtonHighlight);
-        const long long right = static_cast<long long>(box.right);
-        const long long bottom = static_cast<long long>(box.bottom);
-        for (int row = 0; row < 3; ++row) {
-            for (int col = 0; col <= row; ++col) {
-                const long long x = right - 4 - 4LL * col;
-                const long long y = bottom - 4 - 4LL * (2 - row);
-                if (x < box.left || y < box.top || x < std::numeric_limits<int>::min()) {
-                    continue;
-                }
-                const int xi = static_cast<int>(x);
-                const int yi = static_cast<int>(y);
-                if (Status s = dc.fill(Rect{xi + 1, yi + 1, xi + 3, yi + 3}, glint); !s) {
-                    return s;
-                }
-                if (Status s = dc.fill(Rect{xi, yi, xi + 2, yi + 2}, dot); !s) {
-                    return s;
-                }
+Status ShapeHelper::drawSizeGrip(Surface& dc, const Rect& box) const {
+    // Three diagonal rows of two-pixel dots in the bottom-right corner.
+    const Colour dot = *translateColor(kSysButtonShadow);
+    const Colour glint = *translateColor(kSysButtonHighlight);
+    const long long right = static_cast<long long>(box.right);
+    const long long bottom = static_cast<long long>(box.bottom);
+    for (int row = 0; row < 3; ++row) {
+        for (int col = 0; col <= row; ++col) {
+            const long long x = right - 4 - 4LL * col;
+            const long long y = bottom - 4 - 4LL * (2 - row);
+            if (x < box.left || y < box.top || x < std::numeric_limits<int>::min()) {
+                continue;
+            }
+            const int xi = static_cast<int>(x);
+            const int yi = static_cast<int>(y);
+            if (Status s = dc.fill(Rect{xi + 1, yi + 1, xi + 3, yi + 3}, glint); !s) {
+                return s;
+            }
+            if (Status s = dc.fill(Rect{xi, yi, xi + 2, yi + 2}, dot); !s) {
+                return s;
             }
         }
-        return Status::Ok();
     }
-    if (Status s = fillBox(dc, box.left, box.top, box.right, box.bottom, kSysButtonFace); !s) {
-        return s;
-    }
-    return frameBox(dc, box.left, box.top, box.right, box.bottom, kSysButtonShadow);
+    return Status::Ok();
 }
 
 }  // namespace kickvane::skin

@@ -45,10 +45,8 @@ public:
     // One line of text, left aligned and vertically centred in `box`.
     Status drawText(Surface& dc, const Rect& box, std::string_view utf8, Colour colour) const;
 
-    // A named part of the system's visual style (class name, part, state). Knows the size grip
-    // of a status bar ("Status", part 3) and draws any other part as a plain raised box.
-    Status drawThemePart(Surface& dc, std::string_view className, int part, int state,
-                         const Rect& box) const;
+    // The size grip of a status bar, in the bottom-right corner of `box`.
+    Status drawSizeGrip(Surface& dc, const Rect& box) const;
 };
 
 }  // namespace kickvane::skin

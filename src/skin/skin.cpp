@@ -61,11 +61,11 @@ std::optional<bool> Skin::isUnderCursor(WindowHandle window) const {
     if (!probe_) {
         return std::nullopt;
     }
-    WindowHandle atCursor = 0;
-    if (!probe_->windowAtCursor(atCursor)) {
+    const std::optional<WindowHandle> atCursor = probe_->windowAtCursor();
+    if (!atCursor) {
         return std::nullopt;
     }
-    return atCursor != 0 && atCursor == window;
+    return *atCursor != 0 && *atCursor == window;
 }
 
 Status Skin::paintCheckBox(Surface& dc, CheckState state, ControlLook look, const Rect& box) {

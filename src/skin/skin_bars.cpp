@@ -168,7 +168,7 @@ void Skin::paintStatusBar(Surface& dc, StatusBarPart part, const Rect& box) {
             divider();
             return;
         case StatusBarPart::SizeGrip:
-            (void)shapes_.drawThemePart(dc, "Status", 3, 1, box);
+            (void)shapes_.drawSizeGrip(dc, box);
             return;
         case StatusBarPart::Panel: {
             // A panel: the three columns of the band at y 22, the middle one stretched.

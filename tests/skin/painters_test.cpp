@@ -23,9 +23,8 @@ using Kind = RecordingSurface::Kind;
 class FakePointer final : public PointerProbe {
 public:
     explicit FakePointer(WindowHandle at, bool readable = true) : at_(at), readable_(readable) {}
-    Status windowAtCursor(WindowHandle& window) const override {
-        window = at_;
-        return readable_ ? Status::Ok() : Status::Fail("cursor unreadable");
+    std::optional<WindowHandle> windowAtCursor() const override {
+        return readable_ ? std::optional<WindowHandle>(at_) : std::nullopt;
     }
 
 private:
