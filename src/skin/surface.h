@@ -9,20 +9,21 @@
 
 namespace kickvane::skin {
 
-// A colour as 0x00BBGGRR, or 0x80000000 + n for the system colour n (see ShapeHelper).
+// A colour as 0x00RRGGBB (QRgb without its alpha), or 0x80000000 + n for the system colour n
+// (see ShapeHelper).
 using Colour = std::uint32_t;
 
 constexpr Colour rgb(int red, int green, int blue) {
-    return static_cast<Colour>((red & 0xFF) | ((green & 0xFF) << 8) | ((blue & 0xFF) << 16));
+    return static_cast<Colour>(((red & 0xFF) << 16) | ((green & 0xFF) << 8) | (blue & 0xFF));
 }
 constexpr int redOf(Colour c) {
-    return static_cast<int>(c & 0xFF);
+    return static_cast<int>((c >> 16) & 0xFF);
 }
 constexpr int greenOf(Colour c) {
     return static_cast<int>((c >> 8) & 0xFF);
 }
 constexpr int blueOf(Colour c) {
-    return static_cast<int>((c >> 16) & 0xFF);
+    return static_cast<int>(c & 0xFF);
 }
 
 // Pixels of this colour in a keyed picture are not copied.

@@ -12,7 +12,7 @@ using testing::RecordingSurface;
 
 // RGB values pass through, system colours are translated first, unknown ones are none.
 TEST(ShapeHelperTest, ColoursTranslateAndShadeEachChannelWithClamping) {
-    EXPECT_EQ(ShapeHelper::translateColor(13603685), rgb(101, 147, 207));
+    EXPECT_EQ(ShapeHelper::translateColor(rgb(101, 147, 207)), 0x6593CFu);
     EXPECT_FALSE(ShapeHelper::translateColor(0x80000063).has_value());  // no such system colour
     EXPECT_FALSE(ShapeHelper::translateColor(0x01000005).has_value());  // no colour value
     EXPECT_EQ(ShapeHelper::shadeColor(rgb(10, 250, 128), -20), rgb(0, 230, 108));
