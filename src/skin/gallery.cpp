@@ -422,10 +422,10 @@ void drawPainters(Skin& skin, ImageSurface& dc, Sheet& sheet, std::vector<std::s
 
     sheet.row("ThemePopupColor");
     {
-        const ColorPopupPart parts[] = {ColorPopupPart::Background, ColorPopupPart::SelectedCell,
-                                        ColorPopupPart::SelectedCell, ColorPopupPart::Outline};
+        const ColourPopupPart parts[] = {ColourPopupPart::Background, ColourPopupPart::SelectedCell,
+                                         ColourPopupPart::SelectedCell, ColourPopupPart::Outline};
         for (int i = 0; i < 4; ++i) {
-            check(skin.paintColorPopup(dc, parts[i], sheet.cell(30, 20, number(i))),
+            check(skin.paintColourPopup(dc, parts[i], sheet.cell(30, 20, number(i))),
                   "colour popup");
         }
     }

@@ -68,30 +68,32 @@ std::optional<bool> Skin::isUnderCursor(WindowHandle window) const {
     return *atCursor != 0 && *atCursor == window;
 }
 
-Status Skin::paintCheckBox(Surface& dc, CheckState state, ControlLook look, const Rect& box) {
+Status Skin::paintCheckBox(Surface& dc, CheckState state, ControlLook look, const Rect& box) const {
     const int cell = 4 * static_cast<int>(state) + lookIndex(look);
     return dc.copy(pictures_.checkBox, Piece{0, cell * kCellSize, kCellSize, kCellSize},
                    Piece{box.left, box.top, kCellSize, kCellSize});
 }
 
-Status Skin::paintOptionButton(Surface& dc, OptionState state, ControlLook look, const Rect& box) {
+Status Skin::paintOptionButton(Surface& dc, OptionState state, ControlLook look,
+                               const Rect& box) const {
     const int cell = 4 * static_cast<int>(state) + lookIndex(look);
     return dc.copyKeyed(pictures_.optionButton, Piece{0, cell * kCellSize, kCellSize, kCellSize},
                         Piece{box.left, box.top, kCellSize, kCellSize}, kMagentaKey);
 }
 
-void Skin::paintButton(Surface& dc, ButtonLook look, const Rect& box) {
+void Skin::paintButton(Surface& dc, ButtonLook look, const Rect& box) const {
     (void)nine(dc, pictures_.button, 5, static_cast<int>(look), kMargins3, box);
 }
 
-void Skin::paintListBoxItem(Surface& dc, ItemLook look, const Rect& box, std::string_view text) {
+void Skin::paintListBoxItem(Surface& dc, ItemLook look, const Rect& box,
+                            std::string_view text) const {
     (void)nine(dc, pictures_.button, 5, look == ItemLook::Hot ? 1 : 0, kMargins3, box);
     if (const auto textBox = moved(box, 26, 0, 0, 0)) {
         (void)shapes_.drawText(dc, *textBox, text, kSysWindowText);
     }
 }
 
-void Skin::paintComboBox(Surface& dc, ComboPart part, const Rect& box) {
+void Skin::paintComboBox(Surface& dc, ComboPart part, const Rect& box) const {
     switch (part) {
         case ComboPart::Field:
             (void)shapes_.fillBox(dc, box.left, box.top, box.right, box.bottom, kSysWindow);
@@ -108,30 +110,30 @@ void Skin::paintComboBox(Surface& dc, ComboPart part, const Rect& box) {
     }
 }
 
-void Skin::paintComboText(Surface& dc, const Rect& box, std::string_view text) {
+void Skin::paintComboText(Surface& dc, const Rect& box, std::string_view text) const {
     if (const auto textBox = moved(box, 0, 2, -2, -2)) {
         (void)shapes_.drawText(dc, *textBox, text, kSysWindowText);
     }
 }
 
-void Skin::paintComboButton(Surface& dc, ControlLook look, const Rect& box) {
+void Skin::paintComboButton(Surface& dc, ControlLook look, const Rect& box) const {
     if (const auto picture = moved(box, -2, 0, 0, -1)) {
         (void)nine(dc, pictures_.comboButton, 4, lookIndex(look), kMargins3, *picture);
         (void)glyph(dc, chevronCell(lookIndex(look)), *picture);
     }
 }
 
-void Skin::paintTabPanel(Surface& dc, const Rect& box) {
+void Skin::paintTabPanel(Surface& dc, const Rect& box) const {
     (void)nine(dc, pictures_.tabPanel, 1, 0, Margins{5, 5, 5, 5}, box);
 }
 
-void Skin::paintTabHead(Surface& dc, TabLook look, const Rect& box) {
+void Skin::paintTabHead(Surface& dc, TabLook look, const Rect& box) const {
     // Frame 3 of the heads is a disabled head, which tabs on top do not show.
     const int frames[] = {0, 1, 2, 4};
     (void)nine(dc, pictures_.tabHeads, 5, frames[static_cast<int>(look)], Margins{6, 6, 6, 6}, box);
 }
 
-void Skin::paintPropertyGrid(Surface& dc, PropertyGridPart part, const Rect& box) {
+void Skin::paintPropertyGrid(Surface& dc, PropertyGridPart part, const Rect& box) const {
     const auto [l, t, r, b] = box;
     switch (part) {
         case PropertyGridPart::Panel:
@@ -153,7 +155,7 @@ void Skin::paintPropertyGrid(Surface& dc, PropertyGridPart part, const Rect& box
     }
 }
 
-void Skin::paintDate(Surface& dc, DatePart part, const Rect& box) {
+void Skin::paintDate(Surface& dc, DatePart part, const Rect& box) const {
     if (part == DatePart::Field) {
         (void)nine(dc, pictures_.tabPanel, 1, 0, kMargins3, box);
     } else {
@@ -161,13 +163,13 @@ void Skin::paintDate(Surface& dc, DatePart part, const Rect& box) {
     }
 }
 
-void Skin::paintListHeader(Surface& dc, HeaderLook look, const Rect& box) {
+void Skin::paintListHeader(Surface& dc, HeaderLook look, const Rect& box) const {
     // The header picture holds normal, pressed, hot, empty.
     const int frames[] = {3, 0, 2, 1};
     (void)nine(dc, pictures_.listHeaders, 5, frames[static_cast<int>(look)], kMargins3, box);
 }
 
-void Skin::paintListOutline(Surface& dc, const Rect& box) {
+void Skin::paintListOutline(Surface& dc, const Rect& box) const {
     (void)shapes_.frameBox(dc, box.left, box.top, box.right, box.bottom, kOutlineBlue);
 }
 

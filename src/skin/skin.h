@@ -49,9 +49,9 @@ enum class PropertyGridPart { Panel, FocusFrame, Cell, SelectedCell, CategoryRow
 enum class DatePart { Field, DropButton };
 
 enum class StatusBarPart {
-    Bar,  // the bar with its divider at the right end
-    SizeGrip,
-    Panel,
+    Bar,             // the bar with its divider at the right end
+    SizeGrip,        // dots in the bottom-right corner
+    Panel,           // a sunken panel on the bar
     ProgressTrough,  // the trough of a progress part, over the whole box
     ProgressBar,     // its bar, inset in the box; the box's right edge is how far it has come
     SimpleBar,       // the bar of a status bar without panels
@@ -59,12 +59,12 @@ enum class StatusBarPart {
 
 // Parts of a command bar's menus. Their looks: see paintMenu.
 enum class MenuPart {
-    BarItem,        // an item of the menu bar
-    ItemHighlight,  // the highlight of a popup item
-    Band,           // the left band of a popup
-    MarkBox,        // the box behind a tick or bullet
-    Tick,
-    Bullet,
+    BarItem,            // an item of the menu bar
+    ItemHighlight,      // the highlight of a popup item
+    Band,               // the left band of a popup
+    MarkBox,            // the box behind a tick or bullet
+    Tick,               // a tick alone
+    Bullet,             // a bullet alone
     BoxedTick,          // a tick in its box
     BoxedBullet,        // a bullet in its box
     Button,             // a button inside a menu, such as its chevron
@@ -75,7 +75,7 @@ enum class MenuPart {
 enum class MenuLook { Normal, Hot, Open, Pressed, Checked, Disabled };
 
 enum class ToolbarButtonPart {
-    Button,
+    Button,              // a plain button
     ButtonWithDropDown,  // a button with its drop-down part at the right
     DropDown,            // the drop-down part alone
 };
@@ -85,17 +85,18 @@ enum class ToolbarLook { Flat, Hot, Pressed, Checked, CheckedHot, Raised };
 enum class MenuBox { Background, Item, Margin, Separator, Highlight, Button, Outline };
 enum class MenuBoxLook { Normal, Hot, Pressed };
 
-enum class ColorPopupPart { Background, SelectedCell, Outline };
+enum class ColourPopupPart { Background, SelectedCell, Outline };
 
 enum class WindowTabPart {
-    Strip,  // the strip the tabs stand on
-    ActiveTab,
-    InactiveTab,
-    PageFrame,  // the frame around the page under the tabs
-    HotButton,  // the box of a strip button under the cursor
-    PressedButton,
-    Divider,  // a line between two inactive tabs, at the box's left edge
+    Strip,          // the strip the tabs stand on
+    ActiveTab,      // the tab in front
+    InactiveTab,    // a tab behind it
+    PageFrame,      // the frame around the page under the tabs
+    HotButton,      // the box of a strip button under the cursor
+    PressedButton,  // the box of a pressed strip button
+    Divider,        // a line between two inactive tabs, at the box's left edge
 };
+// The height of the window tabs' strip, and how far the active tab reaches over its neighbours.
 inline constexpr int kWindowTabStripHeight = 15;
 inline constexpr int kWindowTabOverlap = 5;
 
@@ -119,83 +120,85 @@ public:
     // another window); nullopt when the cursor cannot be read. Callers use it to choose hot looks.
     std::optional<bool> isUnderCursor(WindowHandle window) const;
 
-    void paintButton(Surface& dc, ButtonLook look, const Rect& box);
+    void paintButton(Surface& dc, ButtonLook look, const Rect& box) const;
 
     // A 13 x 13 box at the top left of `box`.
-    Status paintCheckBox(Surface& dc, CheckState state, ControlLook look, const Rect& box);
+    Status paintCheckBox(Surface& dc, CheckState state, ControlLook look, const Rect& box) const;
     // A round 13 x 13 button at the top left of `box`; the target shows around it.
-    Status paintOptionButton(Surface& dc, OptionState state, ControlLook look, const Rect& box);
+    Status paintOptionButton(Surface& dc, OptionState state, ControlLook look,
+                             const Rect& box) const;
 
     // The trough of a progress bar over `box`.
-    void paintProgressTrough(Surface& dc, Orientation orientation, const Rect& box);
+    void paintProgressTrough(Surface& dc, Orientation orientation, const Rect& box) const;
     // The bar of a progress bar, inset by 2 pixels inside `box`.
-    void paintProgressBar(Surface& dc, Orientation orientation, const Rect& box);
+    void paintProgressBar(Surface& dc, Orientation orientation, const Rect& box) const;
 
     // A scroll bar's arrow button, its arrow in the middle.
     void paintScrollButton(Surface& dc, ArrowDirection direction, ScrollButtonLook look,
-                           const Rect& box);
+                           const Rect& box) const;
     // The track, stretched only along its length.
-    void paintScrollTrack(Surface& dc, Orientation bar, const Rect& box);
-    void paintScrollThumb(Surface& dc, Orientation bar, ControlLook look, const Rect& box);
+    void paintScrollTrack(Surface& dc, Orientation bar, const Rect& box) const;
+    void paintScrollThumb(Surface& dc, Orientation bar, ControlLook look, const Rect& box) const;
     // The box where two scroll bars meet; a disabled one draws nothing.
-    void paintSizeBox(Surface& dc, ControlLook look, const Rect& box);
+    void paintSizeBox(Surface& dc, ControlLook look, const Rect& box) const;
 
     // A spin button, its arrow in the middle.
-    void paintSpinButton(Surface& dc, ArrowDirection direction, ControlLook look, const Rect& box);
+    void paintSpinButton(Surface& dc, ArrowDirection direction, ControlLook look,
+                         const Rect& box) const;
 
-    void paintTrackBarChannel(Surface& dc, const Rect& box);
+    void paintTrackBarChannel(Surface& dc, const Rect& box) const;
     // A horizontal bar carries an upright thumb, a vertical bar a lying one.
     void paintTrackBarThumb(Surface& dc, Orientation bar, ThumbPoint point, ThumbLook look,
-                            const Rect& box);
+                            const Rect& box) const;
 
     // A list box item with its text from 26 pixels right of the box's left edge.
-    void paintListBoxItem(Surface& dc, ItemLook look, const Rect& box, std::string_view text);
+    void paintListBoxItem(Surface& dc, ItemLook look, const Rect& box, std::string_view text) const;
 
     // The push button look and the drop button take the box from 2 pixels left of `box` to one
     // pixel above its bottom.
-    void paintComboBox(Surface& dc, ComboPart part, const Rect& box);
-    void paintComboText(Surface& dc, const Rect& box, std::string_view text);
+    void paintComboBox(Surface& dc, ComboPart part, const Rect& box) const;
+    void paintComboText(Surface& dc, const Rect& box, std::string_view text) const;
     // The drop button with its chevron.
-    void paintComboButton(Surface& dc, ControlLook look, const Rect& box);
+    void paintComboButton(Surface& dc, ControlLook look, const Rect& box) const;
 
-    void paintStatusBar(Surface& dc, StatusBarPart part, const Rect& box);
+    void paintStatusBar(Surface& dc, StatusBarPart part, const Rect& box) const;
 
-    void paintTabPanel(Surface& dc, const Rect& box);
-    void paintTabHead(Surface& dc, TabLook look, const Rect& box);
+    void paintTabPanel(Surface& dc, const Rect& box) const;
+    void paintTabHead(Surface& dc, TabLook look, const Rect& box) const;
 
-    void paintListHeader(Surface& dc, HeaderLook look, const Rect& box);
-    void paintListOutline(Surface& dc, const Rect& box);
+    void paintListHeader(Surface& dc, HeaderLook look, const Rect& box) const;
+    void paintListOutline(Surface& dc, const Rect& box) const;
 
-    void paintPropertyGrid(Surface& dc, PropertyGridPart part, const Rect& box);
-    void paintDate(Surface& dc, DatePart part, const Rect& box);
+    void paintPropertyGrid(Surface& dc, PropertyGridPart part, const Rect& box) const;
+    void paintDate(Surface& dc, DatePart part, const Rect& box) const;
 
     // The looks each part shows (others draw nothing):
     //   BarItem: Hot, Open.  ItemHighlight, HighlightOverBand: Hot, Disabled (a disabled item
     //   under the cursor; the band is drawn for every look).  Band, RaisedButton: any.
     //   MarkBox, BoxedTick, BoxedBullet: Normal, Hot, Disabled.  Tick, Bullet: Normal, Hot (the
     //   same), Disabled.  Button: Hot, Pressed, Checked.  CheckedBarItem: Hot, any other.
-    void paintMenu(Surface& dc, MenuPart part, MenuLook look, const Rect& box);
+    void paintMenu(Surface& dc, MenuPart part, MenuLook look, const Rect& box) const;
 
     // The toolbar's background over `bar`.
-    void paintToolbarBackground(Surface& dc, const Rect& bar);
+    void paintToolbarBackground(Surface& dc, const Rect& bar) const;
     // A Flat button draws nothing.
     void paintToolbarButton(Surface& dc, ToolbarButtonPart part, ToolbarLook look,
-                            const Rect& item);
-    void paintToolbarComboButton(Surface& dc, ControlLook look, const Rect& item);
-    void paintToolbarPanel(Surface& dc, const Rect& item);
+                            const Rect& item) const;
+    void paintToolbarComboButton(Surface& dc, ControlLook look, const Rect& item) const;
+    void paintToolbarPanel(Surface& dc, const Rect& item) const;
 
     // Flat boxes over `box`; the separator is a line from its top left to its bottom right.
     //   Background: Normal, Hot.  Item: Normal (outline), Hot (highlighted).  Margin: Normal
     //   (button face), other (white).  Separator, Outline: any.  Highlight: Normal (blue), other
     //   (cream).  Button: Normal, Hot, Pressed.
-    void paintMenuBox(Surface& dc, MenuBox part, MenuBoxLook look, const Rect& box);
+    void paintMenuBox(Surface& dc, MenuBox part, MenuBoxLook look, const Rect& box) const;
 
-    Status paintColorPopup(Surface& dc, ColorPopupPart part, const Rect& box);
+    Status paintColourPopup(Surface& dc, ColourPopupPart part, const Rect& box) const;
 
-    Status paintWindowTab(Surface& dc, WindowTabPart part, const Rect& box);
+    Status paintWindowTab(Surface& dc, WindowTabPart part, const Rect& box) const;
 
     // The outline of a text box.
-    void paintTextBoxOutline(Surface& dc, const Rect& box);
+    void paintTextBoxOutline(Surface& dc, const Rect& box) const;
 
 private:
     // Frame `index` of `picture` cut into `count` frames, stretched into `box`.

@@ -24,12 +24,12 @@ ProgressFrames progressFrames(const SkinPictures& pictures, Orientation orientat
 
 }  // namespace
 
-void Skin::paintProgressTrough(Surface& dc, Orientation orientation, const Rect& box) {
+void Skin::paintProgressTrough(Surface& dc, Orientation orientation, const Rect& box) const {
     const ProgressFrames frames = progressFrames(pictures_, orientation);
     (void)paintNine(dc, frames.picture, Margins{2, 2, 2, 2}, box, frames.trough);
 }
 
-void Skin::paintProgressBar(Surface& dc, Orientation orientation, const Rect& box) {
+void Skin::paintProgressBar(Surface& dc, Orientation orientation, const Rect& box) const {
     const ProgressFrames frames = progressFrames(pictures_, orientation);
     if (const auto inset = moved(box, 2, 2, -2, -2)) {
         (void)paintNine(dc, frames.picture, Margins{2, 6, 2, 5}, *inset, frames.bar);
@@ -37,7 +37,7 @@ void Skin::paintProgressBar(Surface& dc, Orientation orientation, const Rect& bo
 }
 
 void Skin::paintScrollButton(Surface& dc, ArrowDirection direction, ScrollButtonLook look,
-                             const Rect& box) {
+                             const Rect& box) const {
     // The picture holds the buttons left, right, up, down.
     int button = 0;
     switch (direction) {
@@ -75,7 +75,7 @@ void Skin::paintScrollButton(Surface& dc, ArrowDirection direction, ScrollButton
     (void)glyph(dc, arrowCell(direction, glyphLook), box);
 }
 
-void Skin::paintScrollTrack(Surface& dc, Orientation bar, const Rect& box) {
+void Skin::paintScrollTrack(Surface& dc, Orientation bar, const Rect& box) const {
     // The track looks the same in every state; the thumb and buttons show the state.
     if (bar == Orientation::Vertical) {
         (void)nine(dc, pictures_.scrollButtons, 20, 8, Margins{0, 5, 0, 5}, box);
@@ -84,13 +84,13 @@ void Skin::paintScrollTrack(Surface& dc, Orientation bar, const Rect& box) {
     }
 }
 
-void Skin::paintScrollThumb(Surface& dc, Orientation bar, ControlLook look, const Rect& box) {
+void Skin::paintScrollThumb(Surface& dc, Orientation bar, ControlLook look, const Rect& box) const {
     const QImage& thumb = bar == Orientation::Vertical ? pictures_.scrollThumbVertical
                                                        : pictures_.scrollThumbHorizontal;
     (void)nine(dc, thumb, 4, static_cast<int>(look), Margins{5, 5, 5, 5}, box);
 }
 
-void Skin::paintSizeBox(Surface& dc, ControlLook look, const Rect& box) {
+void Skin::paintSizeBox(Surface& dc, ControlLook look, const Rect& box) const {
     const auto [l, t, r, b] = box;
     switch (look) {
         case ControlLook::Normal:
@@ -112,7 +112,7 @@ void Skin::paintSizeBox(Surface& dc, ControlLook look, const Rect& box) {
 }
 
 void Skin::paintSpinButton(Surface& dc, ArrowDirection direction, ControlLook look,
-                           const Rect& box) {
+                           const Rect& box) const {
     // Each picture holds its two buttons (up then down, left then right) in the four looks.
     const bool upDown = direction == ArrowDirection::Up || direction == ArrowDirection::Down;
     const int group = direction == ArrowDirection::Down || direction == ArrowDirection::Right;
@@ -121,13 +121,13 @@ void Skin::paintSpinButton(Surface& dc, ArrowDirection direction, ControlLook lo
     (void)glyph(dc, arrowCell(direction, static_cast<int>(look)), box);
 }
 
-void Skin::paintTrackBarChannel(Surface& dc, const Rect& box) {
+void Skin::paintTrackBarChannel(Surface& dc, const Rect& box) const {
     (void)shapes_.fillBox(dc, box.left, box.top, box.right, box.bottom, kSysButtonFace);
     (void)shapes_.sunkenEdge(dc, box);
 }
 
 void Skin::paintTrackBarThumb(Surface& dc, Orientation bar, ThumbPoint point, ThumbLook look,
-                              const Rect& box) {
+                              const Rect& box) const {
     // A horizontal bar carries an upright thumb, whose point lies at the top or the bottom; a
     // vertical bar a lying thumb, whose margins are the same turned on their side.
     const bool horizontal = bar == Orientation::Horizontal;
@@ -147,7 +147,7 @@ void Skin::paintTrackBarThumb(Surface& dc, Orientation bar, ThumbPoint point, Th
     (void)nineKeyed(dc, *thumb, 3, static_cast<int>(look), margins, box);
 }
 
-void Skin::paintStatusBar(Surface& dc, StatusBarPart part, const Rect& box) {
+void Skin::paintStatusBar(Surface& dc, StatusBarPart part, const Rect& box) const {
     constexpr Margins kBarMargins{0, 3, 0, 3};
     const QImage& picture = pictures_.statusBar;
     const long long height = static_cast<long long>(box.bottom) - box.top;

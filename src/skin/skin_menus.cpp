@@ -51,7 +51,7 @@ std::optional<int> markBoxFrame(MenuLook look) {
 
 }  // namespace
 
-void Skin::paintMenu(Surface& dc, MenuPart part, MenuLook look, const Rect& box) {
+void Skin::paintMenu(Surface& dc, MenuPart part, MenuLook look, const Rect& box) const {
     const auto band = [&] {
         const long long w = static_cast<long long>(box.right) - box.left;
         const long long h = static_cast<long long>(box.bottom) - box.top;
@@ -136,12 +136,12 @@ void Skin::paintMenu(Surface& dc, MenuPart part, MenuLook look, const Rect& box)
     }
 }
 
-void Skin::paintToolbarBackground(Surface& dc, const Rect& bar) {
+void Skin::paintToolbarBackground(Surface& dc, const Rect& bar) const {
     (void)nine(dc, pictures_.toolbar, 1, 0, kMargins3, bar);
 }
 
 void Skin::paintToolbarButton(Surface& dc, ToolbarButtonPart part, ToolbarLook look,
-                              const Rect& item) {
+                              const Rect& item) const {
     const auto frame = toolbarFrame(look);
     if (!frame) {
         return;
@@ -161,15 +161,15 @@ void Skin::paintToolbarButton(Surface& dc, ToolbarButtonPart part, ToolbarLook l
     }
 }
 
-void Skin::paintToolbarComboButton(Surface& dc, ControlLook look, const Rect& item) {
+void Skin::paintToolbarComboButton(Surface& dc, ControlLook look, const Rect& item) const {
     (void)nine(dc, pictures_.comboButton, 4, static_cast<int>(look), kMargins3, item);
 }
 
-void Skin::paintToolbarPanel(Surface& dc, const Rect& item) {
+void Skin::paintToolbarPanel(Surface& dc, const Rect& item) const {
     (void)nine(dc, pictures_.tabPanel, 1, 0, kMargins3, item);
 }
 
-Status Skin::paintWindowTab(Surface& dc, WindowTabPart part, const Rect& box) {
+Status Skin::paintWindowTab(Surface& dc, WindowTabPart part, const Rect& box) const {
     const auto [l, t, r, b] = box;
     switch (part) {
         case WindowTabPart::Strip: {
@@ -234,7 +234,7 @@ Status Skin::paintWindowTab(Surface& dc, WindowTabPart part, const Rect& box) {
     return Status::Ok();
 }
 
-void Skin::paintMenuBox(Surface& dc, MenuBox part, MenuBoxLook look, const Rect& box) {
+void Skin::paintMenuBox(Surface& dc, MenuBox part, MenuBoxLook look, const Rect& box) const {
     const auto [l, t, r, b] = box;
     const auto fill = [&](Colour c) { (void)shapes_.fillBox(dc, l, t, r, b, c); };
     const auto frame = [&](Colour c) { (void)shapes_.frameBox(dc, l, t, r, b, c); };
@@ -278,23 +278,23 @@ void Skin::paintMenuBox(Surface& dc, MenuBox part, MenuBoxLook look, const Rect&
     }
 }
 
-Status Skin::paintColorPopup(Surface& dc, ColorPopupPart part, const Rect& box) {
+Status Skin::paintColourPopup(Surface& dc, ColourPopupPart part, const Rect& box) const {
     const auto [l, t, r, b] = box;
     switch (part) {
-        case ColorPopupPart::Background:
+        case ColourPopupPart::Background:
             return shapes_.fillBox(dc, l, t, r, b, kSysButtonFace);
-        case ColorPopupPart::SelectedCell:
+        case ColourPopupPart::SelectedCell:
             if (Status s = shapes_.fillBox(dc, l, t, r, b, kPaleBlue); !s) {
                 return s;
             }
             return shapes_.frameBox(dc, l, t, r, b, kEdgeBlue);
-        case ColorPopupPart::Outline:
+        case ColourPopupPart::Outline:
             return shapes_.frameBox(dc, l, t, r, b, kSysButtonShadow);
     }
     return Status::Ok();
 }
 
-void Skin::paintTextBoxOutline(Surface& dc, const Rect& box) {
+void Skin::paintTextBoxOutline(Surface& dc, const Rect& box) const {
     (void)shapes_.frameBox(dc, box.left, box.top, box.right, box.bottom, rgb(101, 147, 207));
 }
 

@@ -268,10 +268,10 @@ TEST(PaintersTest, FlatBoxes_FillAndFrameInTheirColours) {
          [&](Surface& dc) { k.paintMenuBox(dc, MenuBox::Button, MenuBoxLook::Hot, box); },
          {rgb(227, 235, 247), edge}},
         {"colour popup cell",
-         [&](Surface& dc) { (void)k.paintColorPopup(dc, ColorPopupPart::SelectedCell, box); },
+         [&](Surface& dc) { (void)k.paintColourPopup(dc, ColourPopupPart::SelectedCell, box); },
          {pale, edge}},
         {"colour popup outline",
-         [&](Surface& dc) { (void)k.paintColorPopup(dc, ColorPopupPart::Outline, box); },
+         [&](Surface& dc) { (void)k.paintColourPopup(dc, ColourPopupPart::Outline, box); },
          {shadow}},
         {"pressed size box",
          [&](Surface& dc) { k.paintSizeBox(dc, ControlLook::Pressed, box); },
@@ -314,7 +314,8 @@ TEST(PaintersTest, ReportingPainters_ReturnFailuresOfTheirSurface) {
     QImage none;
     ImageSurface nowhere(none);
     Skin& k = theSkin();
-    EXPECT_FALSE(k.paintColorPopup(nowhere, ColorPopupPart::SelectedCell, Rect{0, 0, 10, 10}).ok());
+    EXPECT_FALSE(
+        k.paintColourPopup(nowhere, ColourPopupPart::SelectedCell, Rect{0, 0, 10, 10}).ok());
     EXPECT_FALSE(k.paintWindowTab(nowhere, WindowTabPart::ActiveTab, Rect{0, 0, 80, 20}).ok());
     EXPECT_FALSE(
         k.paintCheckBox(nowhere, CheckState::Ticked, ControlLook::Normal, Rect{0, 0, 13, 13}).ok());
@@ -442,7 +443,7 @@ TEST(PaintersTest, EveryPainter_DrawsInsideItsBoxAndNowhereElse) {
     }
     for (int part = 0; part < 3; ++part) {
         add("colour popup",
-            [&, part](Surface& dc) { (void)k.paintColorPopup(dc, ColorPopupPart(part), box); });
+            [&, part](Surface& dc) { (void)k.paintColourPopup(dc, ColourPopupPart(part), box); });
     }
     add("text box", [&](Surface& dc) { k.paintTextBoxOutline(dc, box); });
     for (int part = 0; part < 12; ++part) {
