@@ -6,8 +6,10 @@
 
 #include "catalog/ini.h"
 #include "platform/filesystem.h"
+#include "platform/program.h"
 #include "platform/single_instance.h"
 #include "session/session.h"
+#include "text/failure_text.h"
 #include "text/vni.h"
 
 namespace kickvane::app {
@@ -49,7 +51,7 @@ std::optional<Options> ParseOptions(Args args, bool allowGame) {
         const bool takesValue = arg == "--tool-folder" || (allowGame && arg == "--game");
         if (takesValue) {
             if (i + 1 >= args.size()) {
-                std::cerr << "kickvane: " << arg << " needs a folder\n";
+                std::cerr << "kickvane: " << arg << " cần một thư mục\n";
                 return std::nullopt;
             }
             if (arg == "--game") {
@@ -58,7 +60,7 @@ std::optional<Options> ParseOptions(Args args, bool allowGame) {
                 options.toolFolder = fs::absolute(platform::PathFromUtf8(args[++i]));
             }
         } else if (arg.starts_with("--")) {
-            std::cerr << "kickvane: unknown option " << arg << '\n';
+            std::cerr << "kickvane: không có tuỳ chọn " << arg << '\n';
             return std::nullopt;
         } else {
             options.positional.push_back(arg);
@@ -75,8 +77,8 @@ std::optional<Options> ParseOptions(Args args, bool allowGame) {
 // the user never chose would be wrong.
 std::optional<session::Session> SessionFor(const Options& options) {
     std::optional<session::Session> session(std::in_place, options.toolFolder);
-    if (const Status& read = session->settingsRead(); !read) {
-        std::cerr << "kickvane: " << read.reason() << '\n';
+    if (const std::optional<text::Message> problem = session->SettingsProblem()) {
+        std::cerr << "kickvane: " << problem->text << '\n';
         return std::nullopt;
     }
     if (options.game) {
@@ -85,29 +87,30 @@ std::optional<session::Session> SessionFor(const Options& options) {
     return session;
 }
 
-std::string_view CategoryKey(int switchIndex) {
-    return catalog::Categories()[static_cast<size_t>(switchIndex)].key;
-}
+// A status word padded to one width, so that the step texts line up.
+constexpr std::string_view kDoneWord = "xong    ";
+constexpr std::string_view kSkippedWord = "bỏ qua  ";
+constexpr std::string_view kFailedWord = "LỖI     ";
 
-void PrintStep(const engine::StepOutcome& outcome) {
+// "xong    Bóng: chép thư mục extras\Ball\X vào zdata\data2\ball (3 file đã chép, 1 file không
+// đổi)"; a failed step says why instead of the counts.
+void PrintStep(const engine::StepOutcome& outcome, const text::ShownFolders& folders) {
     switch (outcome.state) {
         case engine::StepState::Done:
-            std::cout << "done     ";
+            std::cout << kDoneWord;
             break;
         case engine::StepState::NotNeeded:
-            std::cout << "skipped  ";
+            std::cout << kSkippedWord;
             break;
         case engine::StepState::Failed:
-            std::cout << "FAILED   ";
-            break;
+            std::cout << kFailedWord << session::FailedStepLine(outcome, folders) << '\n';
+            return;
     }
-    std::cout << CategoryKey(outcome.step.category) << ": " << engine::Describe(outcome.step);
-    if (outcome.state == engine::StepState::Failed) {
-        std::cout << ": " << outcome.reason;
-    } else if (outcome.step.kind != engine::StepKind::MakeFolder &&
-               outcome.state == engine::StepState::Done) {
-        std::cout << " (" << outcome.files.copied << " copied, " << outcome.files.upToDate
-                  << " up to date)";
+    std::cout << session::StepLabel(outcome.step) << ": " << session::StepText(outcome.step);
+    if (outcome.step.kind != engine::StepKind::MakeFolder &&
+        outcome.state == engine::StepState::Done) {
+        std::cout << " (" << outcome.files.copied << " file đã chép, " << outcome.files.upToDate
+                  << " file không đổi)";
     }
     std::cout << '\n';
 }
@@ -115,24 +118,29 @@ void PrintStep(const engine::StepOutcome& outcome) {
 }  // namespace
 
 void PrintUsage(std::ostream& out) {
-    out << "Usage: kickvane [--tool-folder DIR]      open the window\n"
-           "       kickvane COMMAND [ARGS]\n"
+    out << "Cách dùng: kickvane [--tool-folder TM]     mở cửa sổ\n"
+           "           kickvane LỆNH [THAM SỐ]\n"
            "\n"
-           "  apply [--tool-folder DIR] [--game DIR]   copy the chosen sets into the game\n"
-           "  plan [--tool-folder DIR] [--game DIR]    list the copy steps, copy nothing\n"
-           "  quick-load SOURCE [--tool-folder DIR]     add face and ball files to the base set\n"
-           "  vni [TEXT]                                convert VNI-typed text to Unicode\n"
-           "  ini get FILE SECTION KEY [DEFAULT]        read one settings value\n"
-           "  ini set FILE SECTION KEY VALUE            write one settings value\n"
-           "  trigger                                   make the running window apply the sets "
-           "now\n"
-           "  launch [--tool-folder DIR]                start the game where it lives (its game\n"
-           "                                            manager, or Wine in its own prefix)\n"
-           "  find-game                                 list the folders that hold Gameloader.exe\n"
-           "  skin-gallery OUT.png                      draw every themed control into a sheet\n"
+           "  apply [--tool-folder TM] [--game TM]   chép các bộ đã chọn vào trò chơi\n"
+           "  plan [--tool-folder TM] [--game TM]    liệt kê các bước chép, không chép gì\n"
+           "  quick-load NGUỒN [--tool-folder TM]    thêm các file Face và Ball vào bộ gốc\n"
+           "  vni [VĂN BẢN]                          đổi văn bản gõ kiểu VNI sang Unicode\n"
+           "  ini get FILE MỤC KHOÁ [MẶC ĐỊNH]       đọc một giá trị thiết lập\n"
+           "  ini set FILE MỤC KHOÁ GIÁ TRỊ          ghi một giá trị thiết lập\n"
+           "  trigger                                bảo cửa sổ đang chạy chép các bộ ngay\n";
+    if (platform::GameRunsUnderWine()) {
+        out << "  launch [--tool-folder TM]              khởi động trò chơi nơi nó được cài (qua\n"
+               "                                         trình quản lý trò chơi, hoặc Wine trong\n"
+               "                                         prefix của nó)\n";
+    } else {
+        out << "  launch [--tool-folder TM]              khởi động Gameloader.exe trong thư mục\n"
+               "                                         trò chơi\n";
+    }
+    out << "  find-game                              liệt kê các thư mục có Gameloader.exe\n"
+           "  skin-gallery RA.png                    vẽ mọi điều khiển có giao diện vào một hình\n"
            "\n"
-           "The tool folder defaults to the program's folder; the selection and the game folder\n"
-           "come from its ThietLap.ini.\n";
+           "TM là một thư mục. Thư mục công cụ mặc định là thư mục của chương trình; các bộ đã\n"
+           "chọn và thư mục trò chơi lấy từ ThietLap.ini trong đó.\n";
 }
 
 int RunApply(Args args) {
@@ -151,14 +159,14 @@ int RunApply(Args args) {
         Print(run.shown);
         return kExitStopped;
     }
+    const text::ShownFolders folders = session->shownFolders();
     for (const engine::StepOutcome& step : outcome.steps) {
-        PrintStep(step);
+        PrintStep(step, folders);
     }
     const std::vector<engine::StepOutcome> failures = outcome.Failures();
-    std::cout << outcome.steps.size() << " steps, " << failures.size() << " failed\n";
+    std::cout << outcome.steps.size() << " bước, " << failures.size() << " bước lỗi\n";
     for (const engine::StepOutcome& failure : failures) {
-        std::cerr << "failed: " << CategoryKey(failure.step.category) << ": "
-                  << engine::Describe(failure.step) << ": " << failure.reason << '\n';
+        std::cerr << "lỗi: " << session::FailedStepLine(failure, folders) << '\n';
     }
     return failures.empty() ? kExitOk : kExitFailedSteps;
 }
@@ -173,15 +181,13 @@ int RunPlan(Args args) {
     if (!session) {
         return kExitStopped;
     }
-    const engine::Roots roots =
-        engine::ResolveRoots(options->toolFolder, session->settings().gameFolder);
-    for (engine::Root root : {engine::Root::Data, engine::Root::ZData, engine::Root::ToolData,
-                              engine::Root::ToolZData, engine::Root::Extras}) {
-        std::cout << engine::RootName(root) << " = "
-                  << platform::ResolveCaseInsensitive(roots.Of(root)).string() << '\n';
-    }
+    // The two folders first, then the steps with paths relative to them: "data", "extras"
+    // are the tool's, "data2", "zdata" the game's.
+    const text::ShownFolders folders = session->shownFolders();
+    std::cout << "thư mục công cụ = " << platform::PathToUtf8(folders.tool) << '\n'
+              << "thư mục trò chơi = " << platform::PathToUtf8(folders.game) << '\n';
     for (const engine::PlanStep& step : session->Plan()) {
-        std::cout << CategoryKey(step.category) << ": " << engine::Describe(step) << '\n';
+        std::cout << session::StepLabel(step) << ": " << session::StepText(step) << '\n';
     }
     return kExitOk;
 }
@@ -201,8 +207,9 @@ int RunQuickLoad(Args args) {
         return kExitStopped;
     }
     std::cout << run.shown.popup->text << '\n';
-    for (const std::string& failure : outcome.failures) {
-        std::cerr << "failed: " << failure << '\n';
+    for (const engine::QuickLoadFailure& failure : outcome.failures) {
+        std::cerr << "lỗi: " << failure.pattern << ": "
+                  << text::FailureText(failure.failure, session.shownFolders()) << '\n';
     }
     return outcome.failures.empty() ? kExitOk : kExitFailedSteps;
 }
@@ -228,7 +235,7 @@ int RunIni(Args args) {
         const fs::path file = platform::PathFromUtf8(args[1]);
         catalog::IniDocument document;
         if (const Status read = catalog::IniDocument::Read(file, &document); !read) {
-            std::cerr << "kickvane: " << read.reason() << '\n';
+            std::cerr << "kickvane: " << text::FailureText(read.failure(), {}) << '\n';
             return 1;
         }
         std::cout << catalog::ReadIni(file, args[2], args[3], fallback) << '\n';
@@ -238,7 +245,7 @@ int RunIni(Args args) {
         const Status written =
             catalog::WriteIni(platform::PathFromUtf8(args[1]), args[2], args[3], args[4]);
         if (!written) {
-            std::cerr << "kickvane: " << written.reason() << '\n';
+            std::cerr << "kickvane: " << text::FailureText(written.failure(), {}) << '\n';
             return 1;
         }
         return kExitOk;

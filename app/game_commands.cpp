@@ -6,6 +6,7 @@
 #include "platform/filesystem.h"
 #include "session/session.h"
 #include "session/tool_folder.h"
+#include "text/failure_text.h"
 
 namespace kickvane::app {
 
@@ -17,8 +18,9 @@ fs::path DefaultToolFolder() {
     if (!choice.seedFrom.empty()) {
         if (const Status seeded = session::SeedToolFolder(choice.seedFrom, choice.folder);
             !seeded) {
-            std::cerr << "kickvane: cannot set up " << choice.folder.string() << ": "
-                      << seeded.reason() << '\n';
+            std::cerr << "kickvane: không chuẩn bị được thư mục công cụ "
+                      << platform::PathToUtf8(choice.folder) << ": "
+                      << text::FailureText(seeded.failure(), {}) << '\n';
         }
     }
     return choice.folder;
@@ -35,8 +37,8 @@ int RunLaunch(Args args) {
         return 2;
     }
     session::Session session(toolFolder);
-    if (const Status& read = session.settingsRead(); !read) {
-        std::cerr << "kickvane: " << read.reason() << '\n';
+    if (const std::optional<text::Message> problem = session.SettingsProblem()) {
+        std::cerr << "kickvane: " << problem->text << '\n';
         return 2;
     }
     const session::LaunchRun run = session.Launch(session::LaunchFrom::Tray);

@@ -48,7 +48,7 @@ int main(int argc, char** argv) {
         PrintUsage(std::cout);
         return 0;
     }
-    std::cerr << "kickvane: unknown command " << command << "\n\n";
+    std::cerr << "kickvane: không có lệnh " << command << "\n\n";
     PrintUsage(std::cerr);
     return 2;
 }

@@ -190,7 +190,7 @@ Status IniDocument::Read(const fs::path& file, IniDocument* document) {
         case Result::Unreadable:
             break;
     }
-    return Status::Fail("Không đọc được tệp thiết lập " + name + ": " + read.error + ".");
+    return Status::Fail(FailedAction::Read, resolved, read.error);
 }
 
 std::optional<std::string> IniDocument::Get(std::string_view section, std::string_view key) const {

@@ -47,7 +47,7 @@ StepOutcome RunStep(const PlanStep& step, const Roots& roots) {
     }
     if (!status) {
         outcome.state = StepState::Failed;
-        outcome.reason = status.reason();
+        outcome.failure = status.failure();
     }
     return outcome;
 }

@@ -23,7 +23,7 @@ enum class StepState {
 struct StepOutcome {
     PlanStep step;
     StepState state = StepState::Done;
-    std::string reason;  // why it failed
+    Failure failure;  // why it failed, when it did
     CopyCount files;
 };
 

@@ -146,7 +146,7 @@ Status CopyTree(const fs::path& source, const fs::path& target, CopyCount* count
         jobs.push_back({std::move(name), std::move(targetName), exists});
     }
     if (ec) {
-        return Status::Fail("cannot read folder " + source.string() + ": " + ec.message());
+        return Status::Fail(FailedAction::ReadFolder, source, ec);
     }
     std::sort(jobs.begin(), jobs.end(),
               [](const FileJob& a, const FileJob& b) { return a.sourceName < b.sourceName; });
@@ -172,11 +172,12 @@ Status CopyTree(const fs::path& source, const fs::path& target, CopyCount* count
     return Status::Ok();
 }
 
-// "not found", or "too long" when the system refuses the path for its length.
-Status NotFound(std::string_view what, const fs::path& path) {
-    return Status::Fail(std::string(what) +
-                        (platform::IsTooLong(path) ? " path too long: " : " not found: ") +
-                        path.string());
+// `path` is missing, or the system refuses it for its length.
+Status NotFound(FailedAction action, const fs::path& path) {
+    return Status::Fail(
+        action, path,
+        std::make_error_code(platform::IsTooLong(path) ? std::errc::filename_too_long
+                                                       : std::errc::no_such_file_or_directory));
 }
 
 }  // namespace
@@ -184,12 +185,13 @@ Status NotFound(std::string_view what, const fs::path& path) {
 Status MergeCopy(const fs::path& source, const fs::path& target, CopyCount* count) {
     const fs::path from = ResolveCaseInsensitive(source);
     if (!platform::IsDirectory(from)) {
-        return NotFound("source folder", from);
+        return NotFound(FailedAction::CopyFrom, from);
     }
     const fs::path into = ResolveCaseInsensitive(target);
     if (!platform::IsDirectory(into)) {
+        // The target itself is named: it is the folder that the player knows the step by.
         if (!platform::IsDirectory(into.parent_path())) {
-            return NotFound("target's parent folder", into.parent_path());
+            return NotFound(FailedAction::CopyInto, into);
         }
         if (Status made = platform::MakeDirectory(into); !made) {
             return made;
@@ -201,11 +203,11 @@ Status MergeCopy(const fs::path& source, const fs::path& target, CopyCount* coun
 Status CopyFileInto(const fs::path& file, const fs::path& folder, CopyCount* count) {
     const fs::path from = ResolveCaseInsensitive(file);
     if (!platform::IsRegularFile(from)) {
-        return NotFound("file", from);
+        return NotFound(FailedAction::CopyFrom, from);
     }
     const fs::path into = ResolveCaseInsensitive(folder);
     if (!platform::IsDirectory(into)) {
-        return NotFound("folder", into);
+        return NotFound(FailedAction::CopyInto, into);
     }
     const fs::path target = platform::FindEntryIgnoringCase(into, from.filename().string())
                                 .value_or(into / from.filename());
@@ -216,7 +218,8 @@ Status MakeFolder(const fs::path& folder) {
     const fs::path resolved = ResolveCaseInsensitive(folder);
     std::error_code ec;
     if (fs::exists(resolved, ec)) {
-        return Status::Fail("folder exists already: " + resolved.string());
+        return Status::Fail(FailedAction::CreateFolder, resolved,
+                            std::make_error_code(std::errc::file_exists));
     }
     return platform::MakeDirectory(resolved);
 }

@@ -73,14 +73,24 @@ bool MatchesWildcard(std::string_view name, std::string_view pattern) {
 
 QuickLoadOutcome QuickLoad(const fs::path& toolFolder, const fs::path& source) {
     QuickLoadOutcome outcome;
-    const fs::path from = source.empty() ? fs::path() : platform::ResolveCaseInsensitive(source);
-    if (from.empty() || platform::ListPlainFiles(from).empty()) {
+    const auto stop = [&outcome](std::string text) {
         outcome.stopped = true;
-        outcome.message = text::Message{
-            text::Message::Kind::Component, text::VniToUnicodeUtf8(kNoFolderChosenVni), {}};
+        outcome.message = text::Message{text::Message::Kind::Component, std::move(text), {}};
         return outcome;
+    };
+    if (source.empty()) {
+        return stop(text::VniToUnicodeUtf8(kNoFolderChosenVni));
     }
-    const fs::path dataFolder = toolFolder / "data";
+    const fs::path from = platform::ResolveCaseInsensitive(source);
+    // A folder with no plain file at its top is not taken for a player folder, whatever its
+    // subfolders hold.
+    if (platform::ListPlainFiles(from).empty()) {
+        return stop(std::string(kNoMatchingFileText));
+    }
+    // Every pattern's files are found first: a folder where none matches is told apart from a
+    // load whose copies failed.
+    std::vector<std::vector<fs::path>> filesOf;
+    bool anyFile = false;
     for (const Pattern& pattern : kPatterns) {
         std::vector<fs::path> files = MatchingFiles(from, pattern.direct);
         if (files.empty() && !pattern.nestedFolder.empty()) {
@@ -88,13 +98,23 @@ QuickLoadOutcome QuickLoad(const fs::path& toolFolder, const fs::path& source) {
                 platform::ResolveCaseInsensitive(JoinWindowsPath(from, pattern.nestedFolder)),
                 pattern.direct);
         }
+        anyFile = anyFile || !files.empty();
+        filesOf.push_back(std::move(files));
+    }
+    if (!anyFile) {
+        return stop(std::string(kNoMatchingFileText));
+    }
+    const fs::path dataFolder = toolFolder / "data";
+    for (size_t i = 0; i < kPatterns.size(); ++i) {
+        const Pattern& pattern = kPatterns[i];
+        const std::vector<fs::path>& files = filesOf[i];
         const fs::path target = JoinWindowsPath(dataFolder, pattern.target);
         if (!files.empty()) {
             platform::RemoveStaleTemporaries(platform::ResolveCaseInsensitive(target));
         }
         for (const fs::path& file : files) {
             if (Status copied = CopyFileInto(file, target); !copied) {
-                outcome.failures.push_back(std::string(pattern.direct) + ": " + copied.reason());
+                outcome.failures.push_back({std::string(pattern.direct), copied.failure()});
                 break;
             }
             outcome.copied.push_back(fs::relative(file, from).generic_string());

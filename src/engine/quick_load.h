@@ -7,17 +7,27 @@
 #include <optional>
 #include <string_view>
 
+#include "platform/status.h"
 #include "text/message.h"
 
 namespace kickvane::engine {
 
 inline constexpr std::string_view kNoFolderChosenVni = "Ba5n chu7a cho5n thu7 mu5c na2o!";
+// The chosen folder holds no plain file at its top, or none that any pattern takes.
+inline constexpr std::string_view kNoMatchingFileText =
+    "Thư mục này không có file Face hay Ball nào";
+
+// A name pattern whose copy stopped, and why.
+struct QuickLoadFailure {
+    std::string pattern;
+    Failure failure;
+};
 
 struct QuickLoadOutcome {
-    bool stopped = false;                  // no folder, or no plain file in it: nothing copied
+    bool stopped = false;                  // no folder, or no matching file in it: nothing copied
     std::optional<text::Message> message;  // why it stopped
     std::vector<std::string> copied;       // source files copied, relative to the source folder
-    std::vector<std::string> failures;     // one line per pattern whose copy failed
+    std::vector<QuickLoadFailure> failures;
 
     bool ok() const { return !stopped && failures.empty(); }
 };

@@ -1,7 +1,9 @@
 #include "game/launcher.h"
 
 #include "game/launch_plan.h"
+#include "platform/filesystem.h"
 #include "platform/process.h"
+#include "text/failure_text.h"
 #include "text/vni.h"
 
 namespace kickvane::game {
@@ -28,8 +30,11 @@ LaunchOutcome LaunchGame(std::string_view gameFolder) {
     const Status started = platform::StartDetached(plan.program, plan.arguments, plan.workingFolder,
                                                    true, plan.environment);
     if (!started) {
-        return NotStarted(LaunchResult::StartFailed,
-                          std::string(kStartFailedText) + started.reason());
+        return NotStarted(
+            LaunchResult::StartFailed,
+            std::string(kStartFailedText) +
+                text::FailureText(started.failure(),
+                                  {platform::NativePathFromUserText(gameFolder), {}}));
     }
     LaunchOutcome outcome;
     outcome.startedThrough = plan.description;

@@ -6,6 +6,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <system_error>
 #include <unordered_map>
 #include <vector>
 
@@ -101,8 +102,8 @@ std::optional<std::string> ReadFile(const fs::path& path);
 struct FileRead {
     enum class Result { Read, Missing, Folder, NotRegular, TooLarge, Unreadable };
     Result result = Result::Missing;
-    std::string bytes;  // when Read
-    std::string error;  // the system's reason when Unreadable
+    std::string bytes;      // when Read
+    std::error_code error;  // the system's reason when Unreadable
 };
 FileRead ReadRegularFile(const fs::path& path, std::uintmax_t maxBytes);
 

@@ -71,7 +71,7 @@ FileRead ReadRegularFile(const fs::path& path, std::uintmax_t maxBytes) {
         const bool missing =
             !ec || ec == std::errc::no_such_file_or_directory || ec == std::errc::not_a_directory;
         read.result = missing ? FileRead::Result::Missing : FileRead::Result::Unreadable;
-        read.error = ec.message();
+        read.error = ec;
         return read;
     }
     if (fs::is_directory(status)) {
@@ -90,7 +90,7 @@ FileRead ReadRegularFile(const fs::path& path, std::uintmax_t maxBytes) {
     std::ifstream in(path, std::ios::binary);
     if (!in) {
         read.result = FileRead::Result::Unreadable;
-        read.error = std::strerror(errno);
+        read.error = std::error_code(errno, std::generic_category());
         return read;
     }
     // Read in pieces: the file may have grown since its size was looked at.
@@ -106,7 +106,7 @@ FileRead ReadRegularFile(const fs::path& path, std::uintmax_t maxBytes) {
     }
     if (in.bad()) {
         read.result = FileRead::Result::Unreadable;
-        read.error = std::strerror(errno);
+        read.error = std::error_code(errno, std::generic_category());
         read.bytes.clear();
         return read;
     }

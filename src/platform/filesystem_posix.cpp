@@ -20,12 +20,8 @@ namespace kickvane::platform {
 
 namespace {
 
-std::string ErrnoText(int error) {
-    return std::strerror(error);
-}
-
-Status Failure(const std::string& what, const fs::path& path, int error) {
-    return Status::Fail(what + " " + path.string() + ": " + ErrnoText(error));
+Status Failed(FailedAction action, const fs::path& path, int error) {
+    return Status::Fail(action, path, std::error_code(error, std::system_category()));
 }
 
 // A fresh unique part of a temporary name: six letters or digits.
@@ -106,10 +102,10 @@ public:
         int fd = fd_;
         fd_ = -1;
         if (::close(fd) != 0) {
-            return Failure("cannot write", target, errno);
+            return Failed(FailedAction::Write, target, errno);
         }
         if (::renameat(dirFd_, name_.c_str(), dirFd_, targetName.c_str()) != 0) {
-            return Failure("cannot replace", target, errno);
+            return Failed(FailedAction::Replace, target, errno);
         }
         committed_ = true;
         return Status::Ok();
@@ -204,7 +200,7 @@ fs::path ResolveCaseInsensitive(const fs::path& path) {
 
 Status MakeDirectory(const fs::path& path) {
     if (::mkdir(path.c_str(), 0777) != 0) {
-        return Failure("cannot create folder", path, errno);
+        return Failed(FailedAction::CreateFolder, path, errno);
     }
     return Status::Ok();
 }
@@ -279,30 +275,30 @@ NewFile CopyIntoNew(int in, const struct stat& st, int dirFd, const std::string&
 Status CopyInto(int in, const struct stat& st, int dirFd, const std::string& targetName,
                 const fs::path& targetFolder, bool* targetIsNew) {
     // The target's path is made for messages only.
-    const auto fail = [&](const char* what) {
+    const auto fail = [&](FailedAction action) {
         const int error = errno;
-        return Failure(what, targetFolder / targetName, error);
+        return Failed(action, targetFolder / targetName, error);
     };
     if (targetIsNew && *targetIsNew) {
         switch (CopyIntoNew(in, st, dirFd, targetName)) {
             case NewFile::Written:
                 return Status::Ok();
             case NewFile::Failed:
-                return fail("cannot copy to");
+                return fail(FailedAction::Write);
             case NewFile::Unsupported:
                 *targetIsNew = false;
                 if (::lseek(in, 0, SEEK_SET) != 0) {
-                    return fail("cannot read");
+                    return fail(FailedAction::Read);
                 }
                 break;
         }
     }
     TempFile temp(dirFd, targetName, (st.st_mode & 0777) | S_IRUSR | S_IWUSR);
     if (!temp.valid()) {
-        return fail("cannot write");
+        return fail(FailedAction::Write);
     }
     if (!CopyContent(in, temp.fd(), st.st_size)) {
-        return fail("cannot copy to");
+        return fail(FailedAction::Write);
     }
     TakeModeAndTimes(temp.fd(), st);
     return temp.CommitAs(targetName, targetFolder / targetName);
@@ -319,18 +315,18 @@ bool SameSizeAndTime(const struct stat& source, const struct stat& target) {
 Status ReplaceFile(const fs::path& source, const fs::path& target) {
     Fd in(::open(source.c_str(), O_RDONLY | O_CLOEXEC));
     if (in.get() < 0) {
-        return Failure("cannot read", source, errno);
+        return Failed(FailedAction::Read, source, errno);
     }
     struct stat st {};
     if (::fstat(in.get(), &st) != 0) {
-        return Failure("cannot read", source, errno);
+        return Failed(FailedAction::Read, source, errno);
     }
     if (!S_ISREG(st.st_mode)) {
-        return Status::Fail("not a file: " + source.string());
+        return Failed(FailedAction::Read, source, S_ISDIR(st.st_mode) ? EISDIR : EINVAL);
     }
     Fd folder(OpenFolder(target.parent_path()));
     if (folder.get() < 0) {
-        return Failure("cannot write", target, errno);
+        return Failed(FailedAction::Write, target, errno);
     }
     return CopyInto(in.get(), st, folder.get(), target.filename().string(), target.parent_path(),
                     nullptr);
@@ -354,10 +350,10 @@ Status FolderCopy::Copy(const std::string& sourceName, const std::string& target
                         bool targetMayExist, bool* copied) {
     *copied = false;
     if (sourceFd_ < 0) {
-        return Failure("cannot read", source_, errno);
+        return Failed(FailedAction::ReadFolder, source_, errno);
     }
     if (targetFd_ < 0) {
-        return Failure("cannot write", target_, errno);
+        return Failed(FailedAction::Write, target_, errno);
     }
     struct stat st {};
     Fd in;
@@ -365,7 +361,7 @@ Status FolderCopy::Copy(const std::string& sourceName, const std::string& target
         // Compare by name first, so that an up-to-date target costs no open.
         struct stat existing {};
         if (::fstatat(sourceFd_, sourceName.c_str(), &st, 0) != 0) {
-            return Failure("cannot read", source_ / sourceName, errno);
+            return Failed(FailedAction::Read, source_ / sourceName, errno);
         }
         if (S_ISREG(st.st_mode) && ::fstatat(targetFd_, targetName.c_str(), &existing, 0) == 0 &&
             SameSizeAndTime(st, existing)) {
@@ -375,10 +371,11 @@ Status FolderCopy::Copy(const std::string& sourceName, const std::string& target
     // Not blocking, so that a pipe among the sources does not hang the open.
     in.Reset(::openat(sourceFd_, sourceName.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
     if (!in.valid() || ::fstat(in.get(), &st) != 0) {
-        return Failure("cannot read", source_ / sourceName, errno);
+        return Failed(FailedAction::Read, source_ / sourceName, errno);
     }
     if (!S_ISREG(st.st_mode)) {
-        return Status::Fail("not a file: " + (source_ / sourceName).string());
+        return Failed(FailedAction::Read, source_ / sourceName,
+                      S_ISDIR(st.st_mode) ? EISDIR : EINVAL);
     }
     *copied = true;
     bool targetIsNew = !targetMayExist && unnamedFiles_.load(std::memory_order_relaxed);
@@ -392,17 +389,17 @@ Status FolderCopy::Copy(const std::string& sourceName, const std::string& target
 Status WriteFileAtomically(const fs::path& path, std::string_view content) {
     Fd folder(OpenFolder(path.parent_path()));
     if (folder.get() < 0) {
-        return Failure("cannot write", path, errno);
+        return Failed(FailedAction::Write, path, errno);
     }
     // Keep the permissions of the file being replaced; a new file gets the usual ones.
     struct stat old {};
     const mode_t mode = StatFile(path, old) ? (old.st_mode & 0777) : 0644;
     TempFile temp(folder.get(), path.filename().string(), mode | S_IRUSR | S_IWUSR);
     if (!temp.valid()) {
-        return Failure("cannot write", path, errno);
+        return Failed(FailedAction::Write, path, errno);
     }
     if (!WriteAll(temp.fd(), content.data(), content.size()) || ::fsync(temp.fd()) != 0) {
-        return Failure("cannot write", path, errno);
+        return Failed(FailedAction::Write, path, errno);
     }
     ::fchmod(temp.fd(), mode);
     return temp.CommitAs(path.filename().string(), path);

@@ -16,8 +16,8 @@ namespace kickvane::platform {
 
 namespace {
 
-std::string LastErrorText() {
-    return std::error_code(static_cast<int>(::GetLastError()), std::system_category()).message();
+std::error_code LastError() {
+    return {static_cast<int>(::GetLastError()), std::system_category()};
 }
 
 // A fresh name beside `target` for the data of a replacement.
@@ -37,10 +37,10 @@ fs::path TemporaryBeside(const fs::path& target) {
 Status MoveOver(const fs::path& from, const fs::path& to) {
     if (!::MoveFileExW(from.c_str(), to.c_str(),
                        MOVEFILE_REPLACE_EXISTING | MOVEFILE_WRITE_THROUGH)) {
-        const std::string error = LastErrorText();
+        const std::error_code error = LastError();
         std::error_code ignored;
         fs::remove(from, ignored);
-        return Status::Fail("cannot replace " + to.string() + ": " + error);
+        return Status::Fail(FailedAction::Replace, to, error);
     }
     return Status::Ok();
 }
@@ -73,7 +73,7 @@ fs::path ResolveCaseInsensitive(const fs::path& path) {
 
 Status MakeDirectory(const fs::path& path) {
     if (!::CreateDirectoryW(path.c_str(), nullptr)) {
-        return Status::Fail("cannot create folder " + path.string() + ": " + LastErrorText());
+        return Status::Fail(FailedAction::CreateFolder, path, LastError());
     }
     return Status::Ok();
 }
@@ -102,13 +102,17 @@ bool IsUpToDateCopy(const fs::path& source, const fs::path& target) {
 Status ReplaceFile(const fs::path& source, const fs::path& target) {
     std::error_code ec;
     if (!fs::is_regular_file(source, ec)) {
-        return Status::Fail("not a file: " + source.string());
+        return Status::Fail(FailedAction::Read, source,
+                            ec ? ec
+                            : fs::is_directory(source, ec)
+                                ? std::make_error_code(std::errc::is_a_directory)
+                                : std::make_error_code(std::errc::no_such_file_or_directory));
     }
     const fs::path temporary = TemporaryBeside(target);
     if (!::CopyFileW(source.c_str(), temporary.c_str(), TRUE)) {
-        const std::string error = LastErrorText();
+        const std::error_code error = LastError();
         fs::remove(temporary, ec);
-        return Status::Fail("cannot copy to " + target.string() + ": " + error);
+        return Status::Fail(FailedAction::Write, target, error);
     }
     // CopyFileW keeps the source's modification time, which the quick check relies on.
     return MoveOver(temporary, target);
@@ -123,7 +127,8 @@ Status WriteFileAtomically(const fs::path& path, std::string_view content) {
         if (!out) {
             std::error_code ignored;
             fs::remove(temporary, ignored);
-            return Status::Fail("cannot write " + path.string());
+            return Status::Fail(FailedAction::Write, path,
+                                std::make_error_code(std::errc::io_error));
         }
     }
     return MoveOver(temporary, path);

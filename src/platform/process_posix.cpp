@@ -33,15 +33,11 @@ constexpr int kStepInput = 3;
 constexpr int kStepExec = 4;
 
 Status FailureOf(const StartFailure& failure, const fs::path& program, const fs::path& folder) {
-    const std::string reason = std::strerror(failure.error);
-    switch (failure.step) {
-        case kStepFolder:
-            return Status::Fail("cannot enter folder " + folder.string() + ": " + reason);
-        case kStepExec:
-            return Status::Fail("cannot run " + program.string() + ": " + reason);
-        default:
-            return Status::Fail("cannot start " + program.string() + ": " + reason);
+    const std::error_code code(failure.error, std::system_category());
+    if (failure.step == kStepFolder) {
+        return Status::Fail(FailedAction::EnterFolder, folder, code);
     }
+    return Status::Fail(FailedAction::Run, program, code);
 }
 
 // Runs in the forked child: only async-signal-safe calls until exec, since the parent may have
@@ -148,7 +144,7 @@ Status StartDetached(const fs::path& program, const std::vector<std::string>& ar
     std::error_code error;
     const fs::path absoluteProgram = fs::absolute(program, error);
     if (error) {
-        return Status::Fail("cannot run " + program.string() + ": " + error.message());
+        return Status::Fail(FailedAction::Run, program, error);
     }
     const fs::path folder = workingFolder.empty() ? fs::path(".") : workingFolder;
 
@@ -177,7 +173,7 @@ Status StartDetached(const fs::path& program, const std::vector<std::string>& ar
     // the pipe (close-on-exec) and the parent reads end-of-file.
     std::array<int, 2> pipe{};
     if (::pipe2(pipe.data(), O_CLOEXEC) != 0) {
-        return Status::Fail("cannot start " + program.string() + ": " + std::strerror(errno));
+        return Status::Fail(FailedAction::Run, program, LastSystemError());
     }
 
     const pid_t child = ::fork();
@@ -209,7 +205,8 @@ Status StartDetached(const fs::path& program, const std::vector<std::string>& ar
         return FailureOf(failure, program, folder);
     }
     if (!WIFEXITED(childStatus) || WEXITSTATUS(childStatus) != 0) {
-        return Status::Fail("cannot start " + program.string());
+        return Status::Fail(FailedAction::Run, program,
+                            std::make_error_code(std::errc::resource_unavailable_try_again));
     }
     return Status::Ok();
 }

@@ -16,10 +16,6 @@ namespace fs = std::filesystem;
 
 namespace {
 
-std::string SystemMessage(DWORD error) {
-    return std::system_category().message(static_cast<int>(error));
-}
-
 // Appends one argument quoted so that the program's command-line parser (CommandLineToArgvW and
 // the C runtime) gives it back unchanged: backslashes are literal except before a quote.
 void AppendQuoted(std::wstring& line, const std::wstring& argument) {
@@ -90,7 +86,8 @@ Status StartDetached(const fs::path& program, const std::vector<std::string>& ar
     std::error_code error;
     const fs::path absoluteProgram = fs::absolute(program, error);
     if (program.empty() || error) {
-        return Status::Fail("cannot run " + program.string());
+        return Status::Fail(FailedAction::Run, program,
+                            error ? error : std::make_error_code(std::errc::invalid_argument));
     }
     std::wstring commandLine;
     AppendQuoted(commandLine, absoluteProgram.wstring());
@@ -112,8 +109,9 @@ Status StartDetached(const fs::path& program, const std::vector<std::string>& ar
                         CREATE_NEW_PROCESS_GROUP | CREATE_UNICODE_ENVIRONMENT,
                         environmentBlock.empty() ? nullptr : environmentBlock.data(),
                         folder.empty() ? nullptr : folder.c_str(), &startup, &process)) {
-        return Status::Fail("cannot run " + program.string() + ": " +
-                            SystemMessage(GetLastError()));
+        return Status::Fail(
+            FailedAction::Run, program,
+            std::error_code(static_cast<int>(GetLastError()), std::system_category()));
     }
     // The program runs on its own; the handles are not needed to let it.
     CloseHandle(process.hThread);

@@ -17,4 +17,7 @@ std::vector<std::string> ProgramArguments(int argc, char** argv);
 // outside Windows.
 void UseParentConsole();
 
+// True where the game, a Windows program, runs under Wine (in a prefix) rather than natively.
+bool GameRunsUnderWine();
+
 }  // namespace kickvane::platform

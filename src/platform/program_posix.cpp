@@ -8,4 +8,8 @@ std::vector<std::string> ProgramArguments(int argc, char** argv) {
 
 void UseParentConsole() {}
 
+bool GameRunsUnderWine() {
+    return true;
+}
+
 }  // namespace kickvane::platform

@@ -62,4 +62,8 @@ void UseParentConsole() {
     _setmode(_fileno(stdin), _O_BINARY);
 }
 
+bool GameRunsUnderWine() {
+    return false;
+}
+
 }  // namespace kickvane::platform

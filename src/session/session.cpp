@@ -1,6 +1,7 @@
 #include "session/session.h"
 
 #include "catalog/catalog.h"
+#include "platform/filesystem.h"
 #include "platform/text.h"
 
 namespace kickvane::session {
@@ -15,11 +16,56 @@ text::Message Notice(std::string text) {
 
 }  // namespace
 
-std::string FailedStepLine(const engine::StepOutcome& step) {
+std::string StepLabel(const engine::PlanStep& step) {
     const catalog::PatchCategory& category =
-        catalog::Categories()[static_cast<size_t>(step.step.category)];
-    return "• " + std::string(platform::TrimBlanks(category.label)) + ": " +
-           engine::Describe(step.step) + " (" + step.reason + ")";
+        catalog::Categories()[static_cast<size_t>(step.category)];
+    return std::string(platform::TrimBlanks(category.label));
+}
+
+std::string StepText(const engine::PlanStep& step) {
+    const auto where = [](const engine::Location& location) {
+        std::string_view root;
+        switch (location.root) {
+            case engine::Root::Data:
+                root = "data2";
+                break;
+            case engine::Root::ZData:
+                root = "zdata\\data2";
+                break;
+            case engine::Root::ToolData:
+                root = "data\\data2";
+                break;
+            case engine::Root::ToolZData:
+                root = "data\\zdata\\data2";
+                break;
+            case engine::Root::Extras:
+                root = "extras";
+                break;
+        }
+        return std::string(root) + location.relative;
+    };
+    std::string text;
+    switch (step.kind) {
+        case engine::StepKind::MergeCopy:
+            text = "chép thư mục " + where(step.source) + " vào " + where(step.target);
+            break;
+        case engine::StepKind::FileCopy:
+            text = "chép file " + where(step.source) + " vào " + where(step.target);
+            break;
+        case engine::StepKind::MakeFolder:
+            text = "tạo thư mục " + where(step.target);
+            break;
+    }
+    if (step.guard == engine::StepGuard::IfSourceFolderExists) {
+        text += " (nếu công cụ có thư mục này)";
+    } else if (step.guard == engine::StepGuard::IfGuardFolderMissing) {
+        text += " (nếu chưa có " + where(step.guardFolder) + ")";
+    }
+    return text;
+}
+
+std::string FailedStepLine(const engine::StepOutcome& step, const text::ShownFolders& folders) {
+    return StepLabel(step.step) + ": " + text::FailureText(step.failure, folders);
 }
 
 Session::Session(std::filesystem::path toolFolder, std::unique_ptr<platform::KeySampler> keys,
@@ -77,8 +123,12 @@ std::optional<text::Message> Session::SettingsProblem() const {
     if (settingsRead_) {
         return std::nullopt;
     }
+    std::string why = text::Capitalised(text::FailureText(settingsRead_.failure(), shownFolders()));
+    if (!why.ends_with('.')) {
+        why += '.';
+    }
     return text::Message{text::Message::Kind::Warning,
-                         settingsRead_.reason() +
+                         why +
                              "\nĐang dùng thiết lập mặc định; phím tắt sẽ không chép gì cho đến "
                              "khi tệp được sửa hoặc xoá và chương trình được mở lại.",
                          std::string(kNoticeTitle)};
@@ -98,16 +148,22 @@ ApplyRun Session::Apply() {
     run.shown.signalSound = run.apply.signalSound;
     const std::vector<engine::StepOutcome> failures = run.apply.Failures();
     if (!failures.empty()) {
+        const text::ShownFolders folders = shownFolders();
         std::string text = "Đã chép xong, nhưng ";
         text += std::to_string(failures.size());
         text += " bước không thành công:";
         for (const engine::StepOutcome& failure : failures) {
-            text += '\n';
-            text += FailedStepLine(failure);
+            text += "\n• ";
+            text += FailedStepLine(failure, folders);
         }
         run.shown.messages.push_back(Notice(std::move(text)));
     }
     return run;
+}
+
+text::ShownFolders Session::shownFolders() const {
+    const engine::Roots roots = engine::ResolveRoots(toolFolder_, settings_.gameFolder);
+    return {platform::ResolveCaseInsensitive(roots.data).parent_path(), toolFolder_};
 }
 
 std::vector<engine::PlanStep> Session::Plan() const {
@@ -117,9 +173,11 @@ std::vector<engine::PlanStep> Session::Plan() const {
 Outcome Session::Save() {
     Outcome shown;
     if (const Status saved = catalog::SaveSettings(toolFolder_, settings_); !saved) {
-        shown.messages.push_back({text::Message::Kind::Warning,
-                                  "Không lưu được thiết lập!\n" + saved.reason(),
-                                  std::string(kNoticeTitle)});
+        shown.messages.push_back(
+            {text::Message::Kind::Warning,
+             "Không lưu được thiết lập!\n" +
+                 text::Capitalised(text::FailureText(saved.failure(), shownFolders())) + ".",
+             std::string(kNoticeTitle)});
     } else {
         shown.popup = Popup{std::string(kSavedPopupText), 2};
     }
@@ -151,8 +209,9 @@ QuickLoadRun Session::QuickLoad(std::optional<std::filesystem::path> chosen) {
     }
     if (!run.load.failures.empty()) {
         std::string text = "Một số file không chép được:";
-        for (const std::string& failure : run.load.failures) {
-            text += "\n• " + failure;
+        for (const engine::QuickLoadFailure& failure : run.load.failures) {
+            text += "\n• " + failure.pattern + ": " +
+                    text::FailureText(failure.failure, shownFolders());
         }
         run.shown.messages.push_back(Notice(std::move(text)));
     }

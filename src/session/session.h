@@ -14,6 +14,7 @@
 #include "engine/plan.h"
 #include "engine/quick_load.h"
 #include "game/launcher.h"
+#include "text/failure_text.h"
 #include "text/message.h"
 
 // The tool's state and commands, free of any user interface. The window, the tray, the trigger
@@ -23,6 +24,8 @@ namespace kickvane::session {
 // Texts of the corner popups that confirm an action.
 inline constexpr std::string_view kSavedPopupText = "Đã lưu thiết lập!";
 inline constexpr std::string_view kHiddenPopupText = "Ẩn xuống khay hệ thống!";
+// Said instead where no tray is up: the window minimises, since hidden it could not come back.
+inline constexpr std::string_view kNoTrayPopupText = "Không có khay hệ thống: đã thu nhỏ cửa sổ!";
 inline constexpr std::string_view kSkinChangedPopupText = "Đã thay đổi giao diện!";
 inline constexpr std::string_view kQuickLoadDonePopupText = "Hoàn tất!";
 
@@ -119,6 +122,9 @@ public:
     UpdateState& updates() { return updates_; }
     const UpdateState& updates() const { return updates_; }
 
+    // The game folder of the settings and the tool folder, which failures name paths from.
+    text::ShownFolders shownFolders() const;
+
 private:
     std::filesystem::path toolFolder_;
     catalog::Settings settings_;
@@ -131,7 +137,15 @@ private:
     UpdateState updates_;
 };
 
-// One line per failed step for people: "• Thay đổi bóng: merge ... (reason)".
-std::string FailedStepLine(const engine::StepOutcome& step);
+// What a step does, for people: "chép thư mục extras\Ball\UCL 2011 vào zdata\data2\ball". Tool
+// folders start with "data" or "extras", the game's with "data2" or "zdata".
+std::string StepText(const engine::PlanStep& step);
+
+// The category's label of a step, as the window shows it: "Cổ động viên".
+std::string StepLabel(const engine::PlanStep& step);
+
+// One line per failed step for people: "Cổ động viên: không chép được vào
+// zdata\data2\crowd\textures: trò chơi không có thư mục này".
+std::string FailedStepLine(const engine::StepOutcome& step, const text::ShownFolders& folders);
 
 }  // namespace kickvane::session

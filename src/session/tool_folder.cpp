@@ -21,7 +21,7 @@ Status CopyMissing(const fs::path& from, const fs::path& to) {
     }
     fs::create_directories(to, error);
     if (error) {
-        return Status::Fail("cannot create " + to.string() + ": " + error.message());
+        return Status::Fail(FailedAction::CreateFolder, to, error);
     }
     fs::directory_iterator entries(from, error);
     for (; !error && entries != fs::directory_iterator(); entries.increment(error)) {
@@ -31,7 +31,7 @@ Status CopyMissing(const fs::path& from, const fs::path& to) {
         }
     }
     if (error) {
-        return Status::Fail("cannot read " + from.string() + ": " + error.message());
+        return Status::Fail(FailedAction::ReadFolder, from, error);
     }
     return Status::Ok();
 }
@@ -76,7 +76,7 @@ Status SeedToolFolder(const fs::path& from, const fs::path& to) {
     }
     fs::create_directories(to, error);
     if (error) {
-        return Status::Fail("cannot create " + to.string() + ": " + error.message());
+        return Status::Fail(FailedAction::CreateFolder, to, error);
     }
     for (const char* item : kSeededItems) {
         if (!fs::exists(from / item, error)) {

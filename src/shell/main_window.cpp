@@ -196,11 +196,15 @@ void MainWindow::saveSettings() {
 }
 
 void MainWindow::launchGame(session::LaunchFrom from) {
-    const session::LaunchRun run = session_.Launch(from);
-    if (run.hideToTray) {
-        hideToTray();
-    }
+    session::LaunchRun run = session_.Launch(from);
+    std::optional<session::Popup> popup = std::move(run.shown.popup);
+    run.shown.popup.reset();
     outcomes_.Show(run.shown);
+    if (run.hideToTray && popup) {
+        hideAndSay(*popup);
+    } else if (popup) {
+        outcomes_.ShowPopup(*popup);
+    }
 }
 
 void MainWindow::browseGameFolder() {
@@ -257,19 +261,27 @@ TranslucentResult MainWindow::makeTranslucent(int alpha) {
     return TranslucentResult::Applied;
 }
 
-void MainWindow::hideToTray() {
+bool MainWindow::hideToTray() {
     // Without a tray host the window could not come back from hiding; it minimises instead.
     if (tray_->icon().Shown()) {
         hide();
+        return true;
+    }
+    showMinimized();
+    return false;
+}
+
+void MainWindow::hideAndSay(const session::Popup& popup) {
+    if (hideToTray()) {
+        outcomes_.ShowPopup(popup);
     } else {
-        showMinimized();
+        outcomes_.ShowPopup({std::string(session::kNoTrayPopupText), popup.seconds});
     }
 }
 
 void MainWindow::runHidden() {
     startFade(150, -15);
-    hideToTray();
-    outcomes_.ShowPopup({std::string(session::kHiddenPopupText), 2});
+    hideAndSay({std::string(session::kHiddenPopupText), 2});
 }
 
 void MainWindow::showFromTray() {

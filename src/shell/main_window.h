@@ -91,7 +91,10 @@ private:
     void connectTray();
     void showSession();
     void showHotkey();
-    void hideToTray();
+    // Hides the window to the tray; without a tray host it minimises instead. True when hidden.
+    bool hideToTray();
+    // hideToTray, then says what happened: `popup` when hidden, the lack of a tray otherwise.
+    void hideAndSay(const session::Popup& popup);
 
     session::Session& session_;
     ShellServices services_;

@@ -36,15 +36,18 @@ TEST_F(CliTest, PlanListsTheStepsAndApplyExitsZeroOneOrTwo) {
     MakeGameFolder(game());
     const Result plan = Kickvane("plan " + Folders());
     EXPECT_EQ(plan.exitCode, 0);
-    EXPECT_NE(plan.out.find("Mark: merge ToolDataRoot\\gui\\hud\\Indicator -> "
-                            "DataRoot\\gui\\hud\\Indicator"),
-              std::string::npos);
+    EXPECT_NE(plan.out.find("Thay đổi Mark: chép thư mục data\\data2\\gui\\hud\\Indicator vào "
+                            "data2\\gui\\hud\\Indicator\n"),
+              std::string::npos)
+        << plan.out;
     EXPECT_FALSE(fs::exists(game() / "data2/cmn"));
 
     const Result done = Kickvane("apply " + Folders());
     EXPECT_EQ(done.exitCode, 0) << done.err;
-    EXPECT_NE(done.out.find("done     Bong: merge ExtrasFolder\\Ball\\Europa League 2011"),
-              std::string::npos);
+    EXPECT_NE(done.out.find("xong    Thay đổi bóng: chép thư mục extras\\Ball\\Europa League 2011 "
+                            "vào zdata\\data2\\ball ("),
+              std::string::npos)
+        << done.out;
 
     // The game folder comes from the settings when not given.
     fs::remove_all(game() / "zdata");
@@ -53,8 +56,13 @@ TEST_F(CliTest, PlanListsTheStepsAndApplyExitsZeroOneOrTwo) {
     const std::string apply = "apply --tool-folder " + Quote(tool());
     const Result failed = Kickvane(apply);
     EXPECT_EQ(failed.exitCode, 1);
-    EXPECT_NE(failed.err.find("failed: CDV: merge ToolZDataRoot\\crowd\\textures"),
-              std::string::npos);
+    EXPECT_NE(failed.err.find("lỗi: Thay đổi Cổ động viên: không chép được vào "
+                              "zdata\\data2\\crowd\\textures: trò chơi không có thư mục này\n"),
+              std::string::npos)
+        << failed.err;
+    EXPECT_NE(failed.out.find("LỖI     Thay đổi Cổ động viên: không chép được vào"),
+              std::string::npos)
+        << failed.out;
 
     fs::remove_all(game() / "data2");
     const Result noData = Kickvane(apply);
@@ -96,7 +104,7 @@ TEST_F(CliTest, QuickLoadExitCodes) {
     EXPECT_EQ(quickLoad("faces").exitCode, 0);
     const Result empty = quickLoad("nothing");
     EXPECT_EQ(empty.exitCode, 2);
-    EXPECT_EQ(empty.err, "Bạn chưa chọn thư mục nào!\n");
+    EXPECT_EQ(empty.err, "Thư mục này không có file Face hay Ball nào\n");
 }
 
 TEST_F(CliTest, VniConvertsArgumentOrStandardInput) {
@@ -120,7 +128,13 @@ TEST_F(CliTest, UnknownCommandOrMissingArgumentsShowUsage) {
     EXPECT_EQ(Kickvane("frobnicate").exitCode, 2);
     const Result usage = Kickvane("apply --game");
     EXPECT_EQ(usage.exitCode, 2);
-    EXPECT_NE(usage.err.find("Usage: kickvane"), std::string::npos);
+    EXPECT_NE(usage.err.find("Cách dùng: kickvane"), std::string::npos);
+    // The help speaks the player's language, with no English left in its descriptions.
+    const Result help = Kickvane("--help");
+    EXPECT_EQ(help.exitCode, 0);
+    for (const char* english : {"Usage", "copy the", "folder", "settings value"}) {
+        EXPECT_EQ(help.out.find(english), std::string::npos) << english;
+    }
 }
 
 }  // namespace

@@ -51,7 +51,9 @@ TEST_F(QuickLoadTest, DirectFilesGoFirstAndNestedFormsOnlyWhereNoDirectFileMatch
     EXPECT_EQ(ReadText(tool() / "data/zdata/data2/ball/textures/Ball10.dds"), "nested ball");
 }
 
-TEST_F(QuickLoadTest, NoFolderOrNoPlainFileStopsWithTheMessage) {
+// No folder chosen is told apart from a folder with nothing to take: only subfolders (their
+// files count only beside a plain file at the top), or files that no pattern matches.
+TEST_F(QuickLoadTest, NoFolderOrNoMatchingFileStopsWithItsMessage) {
     const QuickLoadOutcome none = QuickLoad(tool(), fs::path());
     EXPECT_TRUE(none.stopped);
     WriteFile(source() / "heads/textures/face1.dds", "nested only");
@@ -59,11 +61,19 @@ TEST_F(QuickLoadTest, NoFolderOrNoPlainFileStopsWithTheMessage) {
     const QuickLoadOutcome outcome = Load();
 
     EXPECT_TRUE(outcome.stopped);
-    for (const QuickLoadOutcome& stopped : {none, outcome}) {
-        ASSERT_TRUE(stopped.message);
-        EXPECT_EQ(stopped.message->text, "Bạn chưa chọn thư mục nào!");
-    }
+    ASSERT_TRUE(none.message);
+    EXPECT_EQ(none.message->text, "Bạn chưa chọn thư mục nào!");
+    ASSERT_TRUE(outcome.message);
+    EXPECT_EQ(outcome.message->text, "Thư mục này không có file Face hay Ball nào");
     EXPECT_FALSE(fs::exists(heads() / "textures/face1.dds"));
+
+    fs::remove_all(source() / "heads");
+    WriteFile(source() / "readme.txt", "no face here");
+    WriteFile(source() / "ball11.dds", "not ours");
+    const QuickLoadOutcome unmatched = Load();
+    EXPECT_TRUE(unmatched.stopped);
+    ASSERT_TRUE(unmatched.message);
+    EXPECT_EQ(unmatched.message->text, "Thư mục này không có file Face hay Ball nào");
 }
 
 TEST_F(QuickLoadTest, FailedPatternIsNamedAndTheOthersGoOn) {
@@ -74,7 +84,8 @@ TEST_F(QuickLoadTest, FailedPatternIsNamedAndTheOthersGoOn) {
     const QuickLoadOutcome outcome = Load();
 
     ASSERT_EQ(outcome.failures.size(), 1u);
-    EXPECT_NE(outcome.failures[0].find("skin*.dds"), std::string::npos);
+    EXPECT_EQ(outcome.failures[0].pattern, "skin*.dds");
+    EXPECT_EQ(outcome.failures[0].failure.action, FailedAction::CopyInto);
     EXPECT_TRUE(fs::exists(heads() / "textures/face1.dds"));
     EXPECT_TRUE(fs::exists(heads() / "hhead1.pc.ea3.em"));
     EXPECT_FALSE(outcome.stopped);

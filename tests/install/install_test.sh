@@ -34,7 +34,7 @@ unset XDG_DATA_HOME WINEPREFIX
 mkdir -p "$HOME"
 "$stage/usr/bin/kickvane" plan > "$work/plan1.log" || fail "plan failed: $(cat "$work/plan1.log")"
 user=$HOME/.local/share/kickvane
-grep -q "ToolDataRoot = $user/data/data2" "$work/plan1.log" || fail "tool folder is not $user: $(head -5 "$work/plan1.log")"
+grep -q "thư mục công cụ = $user\$" "$work/plan1.log" || fail "tool folder is not $user: $(head -5 "$work/plan1.log")"
 for f in data/data2 extras skin img icons sound.wav .kickvane-seeded; do
   [ -e "$user/$f" ] || fail "not seeded: $f"
 done

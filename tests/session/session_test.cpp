@@ -81,10 +81,15 @@ TEST_F(SessionTest, FailedStepsFollowTheSoundInOneNotice_AStoppedRunHasItsMessag
     const text::Message& notice = run.shown.messages[0];
     EXPECT_EQ(notice.kind, Kind::Notice);
     EXPECT_EQ(notice.title, "Thông báo");
-    EXPECT_TRUE(notice.text.starts_with("Đã chép xong, nhưng " +
-                                        std::to_string(run.apply.Failures().size()) +
-                                        " bước không thành công:\n• Thay đổi bóng: merge "))
+    EXPECT_TRUE(notice.text.starts_with(
+        "Đã chép xong, nhưng " + std::to_string(run.apply.Failures().size()) +
+        " bước không thành công:\n• Thay đổi bóng: không chép được vào zdata\\data2\\ball: "
+        "trò chơi không có thư mục này\n"))
         << notice.text;
+    // The player reads paths from the game folder, and none of the tool's inner names.
+    for (const char* inner : {"DataRoot", "merge", "->", "ExtrasFolder", "/"}) {
+        EXPECT_EQ(notice.text.find(inner), std::string::npos) << inner << " in " << notice.text;
+    }
 
     fs::remove_all(game() / "data2");
     const ApplyRun stopped = session->Apply();
@@ -110,7 +115,9 @@ TEST_F(SessionTest, SaveConfirmsWithThePopupOrWarnsWithTheReason) {
     EXPECT_FALSE(failed.popup);
     ASSERT_EQ(failed.messages.size(), 1u);
     EXPECT_EQ(failed.messages[0].kind, Kind::Warning);
-    EXPECT_TRUE(failed.messages[0].text.starts_with("Không lưu được thiết lập!\n"));
+    EXPECT_EQ(failed.messages[0].text,
+              "Không lưu được thiết lập!\nKhông thay được ThietLap.ini: ở đó là một thư mục, "
+              "không phải file.");
 }
 
 TEST_F(SessionTest, LaunchFromTheWindowHidesItAndFromTheTrayLeavesItAlone) {
