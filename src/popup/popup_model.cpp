@@ -133,6 +133,7 @@ void AlertPopupModel::DisplayMessage(std::string_view message, int displaySecond
     }
 
     fadeMode_ = style.fade;
+    fill_ = style.fill;
     if (fadeMode_) {
         stepValue_ = kFadeStartPercent;
         topTwips_ = std::max(RestingTop(), 0);

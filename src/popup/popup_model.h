@@ -24,6 +24,9 @@ using Colour = std::uint32_t;
 inline constexpr Colour kButtonFaceColour = 0x8000000F;
 inline constexpr Colour kPopupBackgroundColour = 0x0000C000;  // RGB(0, 192, 0)
 inline constexpr Colour kPopupTextColour = 0x00FFFFFF;
+// The fill of a popup that reports failures: a dark red that white text reads well on (6.8:1),
+// and that is not taken for a confirmation.
+inline constexpr Colour kFailurePopupColour = 0x000000B0;  // RGB(176, 0, 0)
 inline constexpr std::string_view kPopupCaption = "Alert";
 inline constexpr std::string_view kPopupFontFamily = "Tahoma";
 inline constexpr double kPopupFontPointSize = 9.75;
@@ -127,7 +130,15 @@ struct PopupStyle {
     bool autoFit = true;             // fits the height to the text (in slot 1)
     bool square = true;              // a two-line rectangular frame instead of rounded corners
     Colour backColour = 0x00C0FFFF;  // the inner line or shape: RGB(255, 255, 192)
+    Colour fill = kPopupBackgroundColour;  // the background under the text
 };
+
+// The style of a popup that reports failures: the tool's own, on red.
+inline PopupStyle FailureStyle() {
+    PopupStyle style;
+    style.fill = kFailurePopupColour;
+    return style;
+}
 
 class AlertPopupModel {
 public:
@@ -161,6 +172,7 @@ public:
     // The label, in the window's client pixels.
     PixelRect LabelPixels() const { return label_; }
     const std::string& Text() const { return text_; }
+    Colour Fill() const { return fill_; }
     const PopupFrame& Frame() const { return frame_; }
     bool Topmost() const { return topmost_; }
     // The window's opacity, 0 to 255; nullopt while it has never been made translucent.
@@ -201,6 +213,7 @@ private:
     std::optional<std::uint8_t> alpha_;
 
     std::string text_;
+    Colour fill_ = kPopupBackgroundColour;
     PixelRect label_;
     PopupFrame frame_;
 };

@@ -9,12 +9,18 @@ namespace kickvane::session {
 namespace {
 
 constexpr std::string_view kNoticeTitle = "Thông báo";
+// Long enough to be read over the game, which goes on meanwhile.
+constexpr int kFailureAlertSeconds = 10;
 
 text::Message Notice(std::string text) {
     return {text::Message::Kind::Notice, std::move(text), std::string(kNoticeTitle)};
 }
 
 }  // namespace
+
+std::string FailureAlertText(size_t failures) {
+    return "Đã chép, " + std::to_string(failures) + " bước lỗi: bấm để xem";
+}
 
 std::string StepLabel(const engine::PlanStep& step) {
     const catalog::PatchCategory& category =
@@ -157,6 +163,7 @@ ApplyRun Session::Apply() {
             text += FailedStepLine(failure, folders);
         }
         run.shown.messages.push_back(Notice(std::move(text)));
+        run.failureAlert = Popup{FailureAlertText(failures.size()), kFailureAlertSeconds};
     }
     return run;
 }

@@ -21,6 +21,9 @@
 // command and the command line drive one Session and show what its commands return.
 namespace kickvane::session {
 
+// The failure alert's text for `failures` failed steps.
+std::string FailureAlertText(size_t failures);
+
 // Texts of the corner popups that confirm an action.
 inline constexpr std::string_view kSavedPopupText = "Đã lưu thiết lập!";
 inline constexpr std::string_view kHiddenPopupText = "Ẩn xuống khay hệ thống!";
@@ -63,6 +66,10 @@ struct LaunchRun {
 struct ApplyRun {
     engine::ApplyOutcome apply;
     Outcome shown;
+    // When steps failed: the corner alert that stands for the list of failures where a box would
+    // take the focus from the game ("Đã chép, 2 bước lỗi: bấm để xem"). The list is then the
+    // last of the messages.
+    std::optional<Popup> failureAlert;
     // The settings file could not be read, so no copy was tried: the defaults in its place are
     // not the user's choice.
     bool refused = false;

@@ -125,8 +125,7 @@ void AlertPopup::Follow() {
 
 void AlertPopup::paintEvent(QPaintEvent*) {
     QPainter painter(this);
-    const QColor green = ToQColor(popup::kPopupBackgroundColour, palette());
-    painter.fillRect(rect(), green);
+    painter.fillRect(rect(), ToQColor(model_.Fill(), palette()));
     const popup::PopupFrame& frame = model_.Frame();
     for (const popup::RoundedRect& shape : frame.shapes) {
         painter.setPen(ToQColor(shape.colour, palette()));
@@ -147,6 +146,7 @@ void AlertPopup::paintEvent(QPaintEvent*) {
 }
 
 void AlertPopup::mousePressEvent(QMouseEvent*) {
+    emit clicked();
     model_.Click();
 }
 

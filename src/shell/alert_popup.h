@@ -28,6 +28,10 @@ public:
     // The screen and text measures the model needs, from the primary screen and the popup font.
     static popup::PopupEnvironment ScreenEnvironment();
 
+signals:
+    // The player clicked the popup (it leaves then, unless it ignores clicks).
+    void clicked();
+
 protected:
     void paintEvent(QPaintEvent* event) override;
     void mousePressEvent(QMouseEvent* event) override;

@@ -198,12 +198,19 @@ void CatalogPanels::selectTab(int index) {
 }
 
 void CatalogPanels::recolour(const SkinLook& look) {
+    const auto paintIndicator = [&look](QWidget* entry) {
+        Paint(entry, look.entryBackground);
+        QPalette palette = entry->palette();
+        palette.setColor(QPalette::Base, look.indicatorBase);
+        palette.setColor(QPalette::Text, look.indicatorMark);
+        entry->setPalette(palette);
+    };
     for (size_t i = 0; i < checks_.size(); ++i) {
-        Paint(checks_[i], look.entryBackground);
+        paintIndicator(checks_[i]);
         Paint(categoryLabels_[i], look.labelBackground, look.labelText);
     }
     for (const OptionWidgets& option : options_) {
-        Paint(option.button, look.entryBackground);
+        paintIndicator(option.button);
         Paint(option.label, look.labelBackground, look.labelText);
     }
     for (PictureBox* frame : groupFrames_) {

@@ -34,9 +34,8 @@ CommandButtons::CommandButtons(QWidget* window) : QObject(window) {
     hotkeyProblem_ = new QLabel(window);
     hotkeyProblem_->setGeometry(9, 408, 410, 30);
     hotkeyProblem_->setWordWrap(true);
-    QPalette red = hotkeyProblem_->palette();
-    red.setColor(QPalette::WindowText, QColor(0xC0, 0x00, 0x00));
-    hotkeyProblem_->setPalette(red);
+    hotkeyProblem_->setMargin(2);
+    paintNote(LightSkin());
     hotkeyProblem_->hide();
 
     save_ = MakeButton(QStringLiteral("&Lưu thiết lập"), window, {130, 442, 92, 30});
@@ -64,7 +63,13 @@ void CommandButtons::showHotkey(const QString& text, const QString& problem) {
     hotkeyProblem_->setVisible(!problem.isEmpty());
 }
 
+void CommandButtons::paintNote(const SkinLook& look) {
+    // On a ground of its own: over the skins' pictures red text could not be read.
+    Paint(hotkeyProblem_, look.noteBackground, look.noteText);
+}
+
 void CommandButtons::recolour(const SkinLook& look) {
+    paintNote(look);
     // The hotkey's caption follows the labels' text colour, readable on both backgrounds.
     QPalette palette = hotkeyLabel_->palette();
     palette.setColor(QPalette::WindowText, look.labelText);

@@ -38,6 +38,7 @@ signals:
     void hotkeyEdited(const QString& text);
 
 private:
+    void paintNote(const SkinLook& look);
     QLabel* hotkeyLabel_;
     QComboBox* hotkey_;
     QLabel* hotkeyProblem_;

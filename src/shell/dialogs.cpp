@@ -144,4 +144,11 @@ void QtDialogs::ShowPopup(const QString& text, int displaySeconds) {
     AlertPopup::Show(text, displaySeconds);
 }
 
+void QtDialogs::ShowFailureAlert(const QString& text, int displaySeconds,
+                                 std::function<void()> onClick) {
+    auto* popup = new AlertPopup(AlertPopup::ScreenEnvironment());
+    QObject::connect(popup, &AlertPopup::clicked, popup, std::move(onClick));
+    popup->DisplayMessage(text, displaySeconds, popup::FailureStyle());
+}
+
 }  // namespace kickvane::shell

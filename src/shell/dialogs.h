@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QString>
+#include <functional>
 #include <optional>
 
 class QFileDialog;
@@ -29,6 +30,11 @@ public:
 
     // The corner popup that confirms an action.
     virtual void ShowPopup(const QString& text, int displaySeconds) = 0;
+
+    // A red corner popup that reports failures without taking the focus; a click on it calls
+    // `onClick`.
+    virtual void ShowFailureAlert(const QString& text, int displaySeconds,
+                                  std::function<void()> onClick) = 0;
 };
 
 // Where a folder picker opens: the folder named by `wanted` (a native path or a Windows path in
@@ -47,6 +53,8 @@ public:
     void ShowMessage(QWidget* owner, const QString& title, const QString& text, Icon icon) override;
     void ShowNotice(QWidget* owner, const QString& title, const QString& text) override;
     void ShowPopup(const QString& text, int displaySeconds) override;
+    void ShowFailureAlert(const QString& text, int displaySeconds,
+                          std::function<void()> onClick) override;
 };
 
 }  // namespace kickvane::shell

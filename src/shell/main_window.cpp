@@ -139,6 +139,7 @@ void MainWindow::connectTray() {
     connect(tray_.get(), &TrayMenu::showRequested, this, &MainWindow::showFromTray);
     connect(tray_.get(), &TrayMenu::quickLoadRequested, this, &MainWindow::quickLoad);
     connect(tray_.get(), &TrayMenu::aboutRequested, this, [this] { sideWindows_.showAbout(); });
+    connect(tray_.get(), &TrayMenu::failuresRequested, this, &MainWindow::showLastFailures);
     connect(tray_.get(), &TrayMenu::exitRequested, this, &MainWindow::exitFromTray);
 }
 
@@ -188,7 +189,28 @@ void MainWindow::showRun(const session::ApplyRun& run) {
         tray_->icon().SetStatusLine(
             ToQString(engine::RunSummary(run.apply, {now.hour(), now.minute()})));
     }
-    outcomes_.Show(run.shown);
+    if (!run.failureAlert || isActiveWindow()) {
+        if (!run.refused) {
+            // The tray's list belongs to the last run only.
+            lastFailures_.reset();
+            tray_->showFailuresEntry(false);
+        }
+        outcomes_.Show(run.shown);
+        return;
+    }
+    session::Outcome shown = run.shown;
+    lastFailures_ = std::move(shown.messages.back());
+    shown.messages.pop_back();
+    outcomes_.Show(shown);
+    tray_->showFailuresEntry(true);
+    services_.dialogs->ShowFailureAlert(ToQString(run.failureAlert->text),
+                                        run.failureAlert->seconds, [this] { showLastFailures(); });
+}
+
+void MainWindow::showLastFailures() {
+    if (lastFailures_) {
+        outcomes_.ShowMessage(*lastFailures_);
+    }
 }
 
 void MainWindow::saveSettings() {

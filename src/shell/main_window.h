@@ -72,7 +72,12 @@ protected:
 
 private:
     // Shows a patch run's outcome and keeps its result in the tray icon's tooltip.
+    // Shows a run of the hotkey or the trigger command. Its failures show in a box while the
+    // window is in front; over another program (the game) they show as the corner alert, which
+    // takes no focus and whose click, like the tray entry, opens the list.
     void showRun(const session::ApplyRun& run);
+    // The failures of the last run that reported them by the corner alert.
+    void showLastFailures();
     void saveSettings();
     void launchGame(session::LaunchFrom from);
     void quickLoad();
@@ -110,6 +115,7 @@ private:
     QTimer fadeTimer_;
     QTimer hotkeyTimer_;
     bool applying_ = false;
+    std::optional<text::Message> lastFailures_;
 };
 
 }  // namespace kickvane::shell

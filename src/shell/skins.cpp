@@ -1,5 +1,8 @@
 #include "shell/skins.h"
 
+#include <algorithm>
+#include <cmath>
+
 #include <QApplication>
 #include <QPalette>
 #include <QWidget>
@@ -20,13 +23,41 @@ void Paint(QWidget* widget, const QColor& background, const QColor& text) {
 }
 
 SkinLook LightSkin() {
-    return {QStringLiteral("skin1"), kEntryBackground, Qt::black, kLabelBackground};
+    return {QStringLiteral("skin1"),
+            kEntryBackground,
+            Qt::black,
+            kLabelBackground,
+            Qt::white,
+            Qt::black,
+            QColor(0xC0, 0x00, 0x00),
+            QColor(0xF0, 0xF0, 0xF0)};
 }
 
 SkinLook DarkSkin() {
-    // The labels take the system's menu text colour as their background.
-    return {QStringLiteral("skin2"), QColor(0x40, 0x40, 0x40), Qt::white,
-            QApplication::palette().color(QPalette::Active, QPalette::WindowText)};
+    // The labels take the system's menu text colour as their background. The tick boxes and
+    // option buttons are drawn on the entries' own dark colour, not on light squares.
+    const QColor entry(0x40, 0x40, 0x40);
+    return {QStringLiteral("skin2"),
+            entry,
+            Qt::white,
+            QApplication::palette().color(QPalette::Active, QPalette::WindowText),
+            entry,
+            Qt::white,
+            QColor(0xFF, 0x80, 0x80),
+            QColor(0x30, 0x30, 0x30)};
+}
+
+double ContrastRatio(const QColor& a, const QColor& b) {
+    const auto luminance = [](const QColor& colour) {
+        const auto linear = [](double channel) {
+            return channel <= 0.04045 ? channel / 12.92 : std::pow((channel + 0.055) / 1.055, 2.4);
+        };
+        return 0.2126 * linear(colour.redF()) + 0.7152 * linear(colour.greenF()) +
+               0.0722 * linear(colour.blueF());
+    };
+    const double first = luminance(a);
+    const double second = luminance(b);
+    return (std::max(first, second) + 0.05) / (std::min(first, second) + 0.05);
 }
 
 WindowSkins::WindowSkins(std::filesystem::path toolFolder, CatalogPanels& panels)

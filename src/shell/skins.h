@@ -24,9 +24,17 @@ struct SkinLook {
     QColor entryBackground;  // tick boxes, option buttons, the framed groups
     QColor labelText;
     QColor labelBackground;
+    QColor indicatorBase;  // inside the tick boxes and option buttons
+    QColor indicatorMark;  // their tick and dot
+    QColor noteText;       // the red note under a hotkey that names no key
+    QColor noteBackground;
 };
 SkinLook LightSkin();
 SkinLook DarkSkin();
+
+// The contrast ratio of two colours as WCAG 2 defines it, from 1 (the same) to 21 (black on
+// white); text reads well from 4.5 on.
+double ContrastRatio(const QColor& a, const QColor& b);
 
 // The window's two skins: the active one's background picture, tab and panel pictures and the
 // colours of the entries. The window starts in the light skin.

@@ -15,10 +15,17 @@ TrayMenu::TrayMenu(const QIcon& icon, const TrayFactory& makeTray, QObject* pare
     add("[utf8]Hiện chương trình", &TrayMenu::showRequested);
     add("[utf8]Nạp nhanh", &TrayMenu::quickLoadRequested);
     add("[utf8]Thông tin", &TrayMenu::aboutRequested);
+    failures_ = menu_.addAction(QString::fromUtf8(kFailuresEntryText));
+    failures_->setVisible(false);
+    connect(failures_, &QAction::triggered, this, &TrayMenu::failuresRequested);
     add("[utf8]Thoát", &TrayMenu::exitRequested);
 
     icon_ = makeTray ? makeTray(icon, &menu_) : std::make_unique<SystemTrayIcon>(icon, &menu_);
     connect(icon_.get(), &TrayIcon::menuRequested, this, [this] { menu_.popup(QCursor::pos()); });
+}
+
+void TrayMenu::showFailuresEntry(bool shown) {
+    failures_->setVisible(shown);
 }
 
 QAction* TrayMenu::entry(const QString& text) const {

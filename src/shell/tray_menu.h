@@ -10,6 +10,9 @@
 
 namespace kickvane::shell {
 
+// The tray entry that lists the failures of the last run.
+inline constexpr const char* kFailuresEntryText = "Xem lỗi lần chép trước";
+
 using TrayFactory = std::function<std::unique_ptr<TrayIcon>(const QIcon&, QMenu*)>;
 
 // The tray icon and its menu: start the game, show the window, quick load, information, exit.
@@ -24,16 +27,20 @@ public:
     TrayIcon& icon() { return *icon_; }
     // The entry whose caption is `text`; null when there is none.
     QAction* entry(const QString& text) const;
+    // Shows the entry that lists the last run's failures while there are some.
+    void showFailuresEntry(bool shown);
 
 signals:
     void launchRequested();
     void showRequested();
     void quickLoadRequested();
     void aboutRequested();
+    void failuresRequested();
     void exitRequested();
 
 private:
     QMenu menu_;
+    QAction* failures_ = nullptr;
     std::unique_ptr<TrayIcon> icon_;
 };
 

@@ -28,12 +28,19 @@ public:
     void ShowPopup(const QString& text, int seconds) override {
         popups << text + QLatin1Char('|') + QString::number(seconds);
     }
+    void ShowFailureAlert(const QString& text, int seconds,
+                          std::function<void()> onClick) override {
+        alerts << text + QLatin1Char('|') + QString::number(seconds);
+        alertClick = std::move(onClick);
+    }
 
     std::deque<std::optional<QString>> folders;  // nullopt: the user cancels
     QStringList starts;                          // where each folder picker was asked to open
     QStringList messages;
     QStringList notices;
     QStringList popups;
+    QStringList alerts;
+    std::function<void()> alertClick;  // the last failure alert's click
 };
 
 // A tray that records whether its icon is there; `hostRunning` says whether a tray host shows it.

@@ -146,5 +146,47 @@ TEST_F(MainWindowTest, EveryButtonHasAMnemonicAndEveryEntryAnAccessibleName) {
               "K+ Nhịp sống");
 }
 
+// A run over another program reports its failures in the red corner alert, which takes no focus;
+// its click and the tray entry open the list. A run with the window in front shows the list at
+// once, and a run without failures takes the tray entry away.
+TEST_F(MainWindowTest, FailuresOfARunOverTheGameShowAsAnAlertThatOpensTheList) {
+    testing::MakeToolFolder(tool());
+    testing::MakeGameFolder(game(), false);  // no zdata: the ball's copy fails
+    WriteFile(tool() / "ThietLap.ini", "[Thiet lap]\r\nDuongDan=" + game().string() + "\r\n");
+    auto window = Open();
+    QAction* entry = window->tray().entry(QString::fromUtf8(shell::kFailuresEntryText));
+    ASSERT_NE(entry, nullptr);
+    EXPECT_FALSE(entry->isVisible());
+
+    window->applyPatchesNow();  // the window is not in front
+    ASSERT_EQ(dialogs_.alerts.size(), 1);
+    EXPECT_TRUE(dialogs_.alerts[0].startsWith(QStringLiteral("Đã chép, ")));
+    EXPECT_TRUE(dialogs_.alerts[0].contains(QStringLiteral(" bước lỗi: bấm để xem|")));
+    EXPECT_TRUE(dialogs_.notices.isEmpty());
+    EXPECT_TRUE(dialogs_.messages.isEmpty());
+    EXPECT_EQ(sounds_.size(), 1u);
+    EXPECT_TRUE(entry->isVisible());
+
+    dialogs_.alertClick();
+    ASSERT_EQ(dialogs_.notices.size(), 1);
+    EXPECT_TRUE(dialogs_.notices[0].contains(
+        QStringLiteral("không chép được vào zdata\\data2\\ball: trò chơi không có thư mục này")))
+        << dialogs_.notices[0].toStdString();
+    entry->trigger();
+    EXPECT_EQ(dialogs_.notices.size(), 2);
+
+    window->show();
+    window->activateWindow();
+    ASSERT_TRUE(QTest::qWaitForWindowActive(window.get()));
+    window->applyPatchesNow();
+    EXPECT_EQ(dialogs_.alerts.size(), 1);
+    EXPECT_EQ(dialogs_.notices.size(), 3);
+
+    testing::MakeGameFolder(game());
+    window->applyPatchesNow();
+    EXPECT_EQ(dialogs_.notices.size(), 3);
+    EXPECT_FALSE(entry->isVisible());
+}
+
 }  // namespace
 }  // namespace kickvane::shell

@@ -2,6 +2,7 @@
 #include <gtest/gtest.h>
 
 #include <QDir>
+#include <QLabel>
 #include <QScreen>
 #include <QSignalSpy>
 #include <QTest>
@@ -88,6 +89,8 @@ TEST_F(ShellPartsTest, WithoutATrayHostHidingMinimisesAndClosingRemovesTheIcon) 
     Click(window->buttons().runHidden());
     EXPECT_TRUE(window->isVisible());
     EXPECT_TRUE(window->isMinimized());
+    // It says so, rather than claim a hiding that would leave no way back.
+    EXPECT_EQ(dialogs_.popups, QStringList{"Không có khay hệ thống: đã thu nhỏ cửa sổ!|2"});
 
     QSignalSpy closed(window.get(), &MainWindow::closed);
     window->close();
@@ -121,6 +124,34 @@ TEST_F(ShellPartsTest, SkinsRecolourTheEntriesAndUseTheirPicturesKeepingTheTab) 
     EXPECT_TRUE(panels.tabHead(1)->pictureFile().endsWith("skin2_selected.jpg"));
     Click(window->buttons().skin(1));
     EXPECT_EQ(labelColour(), QColor(Qt::black));
+}
+
+// In each skin the note under a bad hotkey reads well on its ground, and skin 2 draws its tick
+// boxes and option buttons on the entries' dark colour.
+TEST_F(ShellPartsTest, TheHotkeyNoteReadsInBothSkinsAndSkinTwoTicksOnItsOwnColour) {
+    EXPECT_NEAR(ContrastRatio(Qt::black, Qt::white), 21.0, 0.01);
+    EXPECT_NEAR(ContrastRatio(Qt::gray, Qt::gray), 1.0, 0.01);
+    auto window = Show();
+    QLabel* note = window->buttons().hotkeyProblem();
+    for (int skin : {2, 1}) {
+        Click(window->buttons().skin(skin));
+        const QPalette palette = note->palette();
+        EXPECT_TRUE(note->autoFillBackground());
+        EXPECT_GE(
+            ContrastRatio(palette.color(QPalette::WindowText), palette.color(QPalette::Window)),
+            4.5)
+            << "skin " << skin;
+    }
+    Click(window->buttons().skin(2));
+    CatalogPanels& panels = window->panels();
+    for (QWidget* entry :
+         {static_cast<QWidget*>(panels.categoryCheck(0)),
+          static_cast<QWidget*>(panels.optionButton(catalog::OptionArray::Ball, 1))}) {
+        EXPECT_EQ(entry->palette().color(QPalette::Base), DarkSkin().entryBackground);
+        EXPECT_GE(ContrastRatio(entry->palette().color(QPalette::Text),
+                                entry->palette().color(QPalette::Base)),
+                  4.5);
+    }
 }
 
 TEST_F(ShellPartsTest, LabelClicksShowTheirPreviewInOneSharedCentredWindow) {
