@@ -147,7 +147,8 @@ ApplyRun Session::Apply() {
         refused.shown.messages.push_back(*SettingsProblem());
         return refused;
     }
-    ApplyRun run{engine::ApplyPatches(toolFolder_, settings_.gameFolder, settings_.selection), {}};
+    ApplyRun run{
+        engine::ApplyPatches(toolFolder_, settings_.gameFolder, settings_.selection), {}, {}};
     if (run.apply.message) {
         run.shown.messages.push_back(*run.apply.message);
     }

@@ -90,6 +90,30 @@ TEST_F(WindowTest, HotkeyPressedInAnotherWindowAppliesThePatches) {
     EXPECT_TRUE(kickvane->Running());
 }
 
+// A run over the game whose steps fail reports them in the corner alert, which leaves the focus
+// with the game; a click on the alert opens the list.
+TEST_F(WindowTest, FailedStepsOverTheGameShowTheAlertAndItsClickTheList) {
+    fs::remove_all(game() / "zdata");  // the ball's copy has nowhere to go
+    WriteSettings("F7");
+    auto kickvane = StartKickvane();
+    ASSERT_TRUE(WindowShown(kWindowTitle)) << ReadText(dir_ / "kickvane.log");
+    auto focused = FocusOtherWindow();
+    const std::string gameWindow = FindWindow("the game");
+    Capture("xdotool key F7");
+    ASSERT_TRUE(WindowShown("Alert")) << ReadText(dir_ / "kickvane.log");
+    EXPECT_TRUE(fs::exists(applied()));  // the other steps went through
+    EXPECT_EQ(Capture("xdotool getwindowfocus"), gameWindow + "\n");
+    EXPECT_TRUE(FindWindow("Thông báo").empty());
+    // Once it has risen into its place.
+    std::this_thread::sleep_for(std::chrono::milliseconds(1500));
+    SaveScreenshot(FindWindow("Alert"), "failure-alert.png");
+
+    Capture("xdotool mousemove --window " + FindWindow("Alert") + " 20 20 click 1");
+    ASSERT_TRUE(WindowShown("Thông báo")) << ReadText(dir_ / "kickvane.log");
+    SaveScreenshot(FindWindow("Thông báo"), "failure-list.png");
+    EXPECT_TRUE(kickvane->Running());
+}
+
 TEST_F(WindowTest, HotkeyTextThatNamesNoKeyTriggersNothing) {
     WriteSettings("f7");  // names are compared exactly: "f7" is no key
     auto kickvane = StartKickvane();
