@@ -132,7 +132,7 @@ TEST_F(CliTest, UnknownCommandOrMissingArgumentsShowUsage) {
     // The help speaks the player's language, with no English left in its descriptions.
     const Result help = Kickvane("--help");
     EXPECT_EQ(help.exitCode, 0);
-    for (const char* english : {"Usage", "copy the", "folder", "settings value"}) {
+    for (const char* english : {"Usage", "copy the", "the game", "settings value"}) {
         EXPECT_EQ(help.out.find(english), std::string::npos) << english;
     }
 }

@@ -57,7 +57,7 @@ QT_QPA_PLATFORM=offscreen "$stage/usr/bin/kickvane" skin-gallery "$work/gallery.
 export HOME=$work/home2
 mkdir -p "$HOME" "$work/mine"
 "$stage/usr/bin/kickvane" plan --tool-folder "$work/mine" > "$work/plan3.log"
-grep -q "ToolDataRoot = $work/mine/data/data2" "$work/plan3.log" || fail "--tool-folder not used"
+grep -q "thư mục công cụ = $work/mine$" "$work/plan3.log" || fail "--tool-folder not used"
 [ ! -e "$HOME/.local/share/kickvane" ] || fail "seeded although --tool-folder was given"
 
 # The packages.

@@ -194,13 +194,17 @@ TEST_F(WindowUsabilityTest, ARunIsSummedUpInTheTrayTooltipAndItsFailedStepsInANo
     testing::MakeToolFolder(tool());
     testing::MakeGameFolder(game(), /*withZData=*/false);
     auto window = Open();
+    window->show();  // in front: the failures show in the notice at once
+    window->activateWindow();
+    ASSERT_TRUE(QTest::qWaitForWindowActive(window.get()));
     EXPECT_EQ(tray_->toolTip(), "Kickvane v2.0");
     window->panels().gameFolderBox()->setText(QString::fromStdString(game().string()));
     window->applyPatchesNow();
     EXPECT_EQ(sounds_.size(), 1u);
     ASSERT_EQ(dialogs_.notices.size(), 1);
     EXPECT_TRUE(dialogs_.notices[0].contains(
-        "Thay đổi bóng: merge ExtrasFolder\\Ball\\Europa League 2011"));
+        "• Thay đổi bóng: không chép được vào zdata\\data2\\ball: trò chơi không có thư mục này"))
+        << dialogs_.notices[0].toStdString();
     const QStringList lines = tray_->toolTip().split(QLatin1Char('\n'));
     ASSERT_EQ(lines.size(), 2);
     EXPECT_EQ(lines[0], "Kickvane v2.0");
