@@ -34,10 +34,28 @@ fs::path TemporaryBeside(const fs::path& target) {
     return target.parent_path() / fs::path(std::u8string(full.begin(), full.end()));
 }
 
+// Windows refuses to replace a file that another program holds open with "access denied", as it
+// does a file that may not be written. Opening the file for deletion tells the two apart: a held
+// file answers with a sharing violation.
+std::error_code ReplaceError(const fs::path& target) {
+    const std::error_code denied = LastError();
+    if (denied.value() != ERROR_ACCESS_DENIED) {
+        return denied;
+    }
+    HANDLE probe = ::CreateFileW(target.c_str(), DELETE, FILE_SHARE_READ | FILE_SHARE_WRITE,
+                                 nullptr, OPEN_EXISTING, FILE_ATTRIBUTE_NORMAL, nullptr);
+    if (probe != INVALID_HANDLE_VALUE) {
+        ::CloseHandle(probe);
+        return denied;
+    }
+    const std::error_code why = LastError();
+    return why.value() == ERROR_SHARING_VIOLATION ? why : denied;
+}
+
 Status MoveOver(const fs::path& from, const fs::path& to) {
     if (!::MoveFileExW(from.c_str(), to.c_str(),
                        MOVEFILE_REPLACE_EXISTING | MOVEFILE_WRITE_THROUGH)) {
-        const std::error_code error = LastError();
+        const std::error_code error = ReplaceError(to);
         std::error_code ignored;
         fs::remove(from, ignored);
         return Status::Fail(FailedAction::Replace, to, error);

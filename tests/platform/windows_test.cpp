@@ -77,5 +77,32 @@ TEST(WindowsCodePages, OlderTextIsDecodedAndComposed) {
     EXPECT_EQ(AnsiTextToUtf8("plain"), std::optional<std::string>("plain"));
 }
 
+// The system's own codes read as their causes: a file the game holds open without sharing is
+// "in use", not a failure of unknown kind.
+TEST(WindowsFailureCauses, SystemCodesAndAHeldFileReadAsTheirCauses) {
+    const auto cause = [](DWORD code) {
+        return ClassifyError(std::error_code(static_cast<int>(code), std::system_category()));
+    };
+    EXPECT_EQ(cause(ERROR_ACCESS_DENIED), FailureCause::NoPermission);
+    EXPECT_EQ(cause(ERROR_WRITE_PROTECT), FailureCause::ReadOnlyDisk);
+    EXPECT_EQ(cause(ERROR_HANDLE_DISK_FULL), FailureCause::DiskFull);
+    EXPECT_EQ(cause(ERROR_LOCK_VIOLATION), FailureCause::InUse);
+    EXPECT_EQ(cause(ERROR_PATH_NOT_FOUND), FailureCause::NotFound);
+    EXPECT_EQ(cause(ERROR_CRC), FailureCause::DiskError);
+    EXPECT_EQ(cause(ERROR_INVALID_FUNCTION), FailureCause::Other);
+
+    TempDir dir;
+    WriteFile(dir / "source.dds", "new");
+    WriteFile(dir / "held.dds", "old");
+    HANDLE held = CreateFileW((dir / "held.dds").c_str(), GENERIC_READ, 0, nullptr, OPEN_EXISTING,
+                              FILE_ATTRIBUTE_NORMAL, nullptr);
+    ASSERT_NE(held, INVALID_HANDLE_VALUE);
+    const Status replaced = ReplaceFile(dir / "source.dds", dir / "held.dds");
+    CloseHandle(held);
+    ASSERT_FALSE(replaced.ok());
+    EXPECT_EQ(replaced.failure().cause(), FailureCause::InUse) << replaced.reason();
+    EXPECT_EQ(ReadText(dir / "held.dds"), "old");
+}
+
 }  // namespace
 }  // namespace kickvane::platform
