@@ -212,6 +212,35 @@ TEST_F(ShellPartsTest, PopupWindowFollowsItsModelAndClosesWhenItFinishes) {
     EXPECT_TRUE(popup.isNull());
 }
 
+// The failure alert is the popup on red, takes no focus, and its click opens what it stands for.
+TEST_F(ShellPartsTest, FailureAlertIsARedPopupWhoseClickOpensTheList) {
+    QtDialogs dialogs;
+    int clicks = 0;
+    dialogs.ShowFailureAlert(QStringLiteral("Đã chép, 2 bước lỗi: bấm để xem"), 10,
+                             [&clicks] { ++clicks; });
+    AlertPopup* alert = nullptr;
+    for (QWidget* widget : QApplication::topLevelWidgets()) {
+        if (auto* popup = qobject_cast<AlertPopup*>(widget); popup && popup->isVisible()) {
+            alert = popup;
+        }
+    }
+    ASSERT_NE(alert, nullptr);
+    EXPECT_EQ(alert->model().Text(), "Đã chép, 2 bước lỗi: bấm để xem");
+    EXPECT_EQ(alert->model().Fill(), popup::kFailurePopupColour);
+    EXPECT_TRUE(alert->testAttribute(Qt::WA_ShowWithoutActivating));
+    const QImage drawn = alert->grab().toImage();
+    int red = 0;
+    for (int y = 0; y < drawn.height(); ++y) {
+        for (int x = 0; x < drawn.width(); ++x) {
+            red += drawn.pixelColor(x, y) == QColor(0xB0, 0x00, 0x00) ? 1 : 0;
+        }
+    }
+    EXPECT_GT(red, drawn.width() * drawn.height() / 2);  // the ground, under text and frame
+    QTest::mouseClick(alert, Qt::LeftButton, {}, QPoint(10, 10));
+    EXPECT_EQ(clicks, 1);
+    alert->close();
+}
+
 // The built artwork: the header buttons stand on the plain part of each skin's banner, clear of
 // the tool's name and version; pictures of the finished window are kept for people to look at.
 TEST_F(ShellPartsTest, HeaderButtonsLeaveTheBannerTitleVisibleInBothSkins) {
