@@ -170,6 +170,9 @@ ApplyRun Session::Apply() {
 }
 
 text::ShownFolders Session::shownFolders() const {
+    if (platform::TrimBlanks(settings_.gameFolder).empty()) {
+        return {{}, toolFolder_};  // no game folder: nothing is shown from it
+    }
     const engine::Roots roots = engine::ResolveRoots(toolFolder_, settings_.gameFolder);
     return {platform::ResolveCaseInsensitive(roots.data).parent_path(), toolFolder_};
 }
