@@ -15,7 +15,25 @@ namespace kickvane::game {
 
 enum class Manager { Wine, Lutris, Bottles, Heroic, PlayOnLinux, Steam, WineMenu };
 
-std::string_view ManagerName(Manager manager);
+constexpr std::string_view ManagerName(Manager manager) {
+    switch (manager) {
+        case Manager::Wine:
+            return "Wine";
+        case Manager::Lutris:
+            return "Lutris";
+        case Manager::Bottles:
+            return "Bottles";
+        case Manager::Heroic:
+            return "Heroic";
+        case Manager::PlayOnLinux:
+            return "PlayOnLinux";
+        case Manager::Steam:
+            return "Steam";
+        case Manager::WineMenu:
+            break;
+    }
+    return "Wine menu";
+}
 
 // One prefix or game that a manager's configuration names.
 struct ManagedPrefix {
@@ -41,7 +59,8 @@ struct ManagerScan {
 inline constexpr size_t kMaxConfigBytes = 4u << 20;
 
 // Reads every manager's configuration, in this order: $WINEPREFIX, ~/.wine, Lutris, Bottles,
-// Heroic, PlayOnLinux, Steam, Wine's menu entries.
+// Heroic, PlayOnLinux, Steam, Wine's menu entries. On Windows, where games run natively, there is
+// nothing to read and the scan is empty.
 ManagerScan ScanGameManagers(const UserFolders& folders);
 
 // Lutris keeps each game's number in its database; nullopt when the database or the row is

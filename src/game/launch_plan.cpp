@@ -42,10 +42,12 @@ std::optional<LaunchPlan> ThroughLutris(const ManagedPrefix& game, const fs::pat
     return std::nullopt;
 }
 
-// Bottles runs any program of a bottle with the bottle's Wine and settings.
+// Bottles runs any program of a bottle with the bottle's Wine and settings: a program inside the
+// bottle, or one added to it from elsewhere.
 std::optional<LaunchPlan> ThroughBottles(const ManagedPrefix& bottle, const fs::path& launcher,
                                          const ProgramLookup& findProgram) {
-    if (!IsWithinFolder(launcher, CanonicalOrNormal(bottle.prefix))) {
+    const bool added = SameFile(platform::ResolveCaseInsensitive(bottle.executable), launcher);
+    if (!added && !IsWithinFolder(launcher, CanonicalOrNormal(bottle.prefix))) {
         return std::nullopt;
     }
     const std::vector<std::string> run{"run", "-b", bottle.id, "-e", launcher.string()};
@@ -59,6 +61,19 @@ std::optional<LaunchPlan> ThroughBottles(const ManagedPrefix& bottle, const fs::
         }
     } else if (fs::path cli = findProgram("bottles-cli"); !cli.empty()) {
         return LaunchPlan{cli, run, {}, {}, what};
+    }
+    return std::nullopt;
+}
+
+// The prefix that a manager's configuration names for this very launcher (Lutris's "prefix",
+// Heroic's "winePrefix", the bottle of a program added to Bottles): the prefix the manager itself
+// would run it in, wherever the launcher lies.
+std::optional<fs::path> PrefixNamedFor(const ManagerScan& scan, const fs::path& launcher) {
+    for (const ManagedPrefix& entry : scan.entries) {
+        if (!entry.prefix.empty() && IsWinePrefix(entry.prefix) &&
+            SameFile(platform::ResolveCaseInsensitive(entry.executable), launcher)) {
+            return entry.prefix;
+        }
     }
     return std::nullopt;
 }
@@ -89,7 +104,7 @@ LaunchDecision PlanLaunch(std::string_view gameFolder, const UserFolders& folder
         std::optional<LaunchPlan> managed;
         if (entry.manager == Manager::Lutris) {
             managed = ThroughLutris(entry, canonicalLauncher, findProgram);
-        } else if (entry.manager == Manager::Bottles && entry.executable.empty()) {
+        } else if (entry.manager == Manager::Bottles) {
             managed = ThroughBottles(entry, canonicalLauncher, findProgram);
         }
         if (managed) {
@@ -99,15 +114,19 @@ LaunchDecision PlanLaunch(std::string_view gameFolder, const UserFolders& folder
         }
     }
 
-    // Wine in the game's own prefix: the one that holds the folder, else the one whose drive
-    // maps it, else (a Windows path or a folder outside every prefix) the one of the environment.
+    // Wine in the game's own prefix: the one a manager names for this launcher, else the one
+    // that holds the folder, else the one whose drive maps it, else (a folder outside every
+    // prefix that no manager knows) the one of the environment.
     std::vector<fs::path> known;
     for (const ManagedPrefix& entry : scan.entries) {
         if (!entry.prefix.empty()) {
             known.push_back(entry.prefix);
         }
     }
-    std::optional<fs::path> prefix = FindPrefixHolding(workingFolder);
+    std::optional<fs::path> prefix = PrefixNamedFor(scan, canonicalLauncher);
+    if (!prefix) {
+        prefix = FindPrefixHolding(workingFolder);
+    }
     if (!prefix) {
         prefix = FindPrefixMapping(workingFolder, known);
     }

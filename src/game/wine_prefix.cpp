@@ -4,7 +4,8 @@
 #include <fstream>
 #include <system_error>
 
-#include "game/formats/config_formats.h"
+#include "game/formats/wine_registry.h"
+#include "game/read_config.h"
 #include "platform/filesystem.h"
 
 namespace kickvane::game {
@@ -107,53 +108,19 @@ std::optional<fs::path> FindPrefixMapping(const fs::path& folder,
 
 std::string ReadPrefixArch(const fs::path& prefix) {
     for (const char* name : {"system.reg", "user.reg", "userdef.reg"}) {
-        // The arch line sits in the header; a few kilobytes are enough.
-        std::error_code error;
-        if (!fs::is_regular_file(prefix / name, error)) {
+        // The arch line sits in the header; the first few kilobytes are enough.
+        if (!platform::IsRegularFile(prefix / name)) {
             continue;
         }
         std::ifstream in(prefix / name, std::ios::binary);
-        std::string line;
-        for (int i = 0; i < 16 && std::getline(in, line); ++i) {
-            if (line.starts_with("#arch=")) {
-                line = line.substr(6);
-                while (!line.empty() && (line.back() == '\r' || line.back() == ' ')) {
-                    line.pop_back();
-                }
-                return line;
-            }
+        std::string head(4096, '\0');
+        in.read(head.data(), static_cast<std::streamsize>(head.size()));
+        head.resize(static_cast<size_t>(in.gcount()));
+        if (std::string arch = RegistryArch(head); !arch.empty()) {
+            return arch;
         }
     }
     return {};
-}
-
-fs::path WindowsPathInPrefix(const fs::path& prefix, std::string_view windowsPath) {
-    std::string path(windowsPath);
-    for (char& c : path) {
-        c = c == '\\' ? '/' : c;
-    }
-    if (path.size() < 2 || path[1] != ':') {
-        return {};
-    }
-    const char drive = static_cast<char>(path[0] | 0x20);
-    if (drive < 'a' || drive > 'z') {
-        return {};
-    }
-    fs::path mapped = prefix / "dosdevices" / (std::string(1, drive) + ":");
-    if (!platform::IsDirectory(mapped)) {
-        if (drive != 'c') {
-            return {};
-        }
-        mapped = prefix / "drive_c";
-    }
-    std::string rest = path.substr(2);
-    while (!rest.empty() && rest.front() == '/') {
-        rest.erase(rest.begin());
-    }
-    while (!rest.empty() && rest.back() == '/') {
-        rest.pop_back();
-    }
-    return platform::ResolveCaseInsensitive(rest.empty() ? mapped : mapped / rest);
 }
 
 std::vector<RecordedInstall> ReadRecordedInstalls(const fs::path& prefix,
@@ -166,7 +133,7 @@ std::vector<RecordedInstall> ReadRecordedInstalls(const fs::path& prefix,
             continue;
         }
         std::string problem;
-        const std::optional<std::string> text = ReadBoundedFile(file, kMaxRegistryBytes, &problem);
+        const std::optional<std::string> text = ReadConfigText(file, kMaxRegistryBytes, problem);
         RegistryFile registry;
         if (text) {
             registry = ParseWineRegistry(*text, keys);

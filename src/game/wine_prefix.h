@@ -48,10 +48,6 @@ std::optional<fs::path> FindPrefixMapping(const fs::path& folder,
 // "win32" or "win64" as the prefix's registry records it; empty when it records none.
 std::string ReadPrefixArch(const fs::path& prefix);
 
-// The native path of a Windows path ("C:\Games\FIFA") inside `prefix`, through its drive links
-// ("dosdevices/c:"), else "drive_c" for C:. Empty when the drive is not mapped.
-fs::path WindowsPathInPrefix(const fs::path& prefix, std::string_view windowsPath);
-
 // A place the registry of a prefix names as a program's install folder.
 struct RecordedInstall {
     std::string windowsFolder;  // as recorded, a folder (for DisplayIcon: the icon file's folder)

@@ -5,6 +5,7 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <array>
 #include <atomic>
 #include <cerrno>
@@ -15,6 +16,7 @@
 
 #include "platform/filesystem.h"
 #include "platform/posix_fd.h"
+#include "platform/windows_path.h"
 
 namespace kickvane::platform {
 
@@ -425,32 +427,21 @@ fs::path ProgramFolder() {
 }
 
 fs::path NativePathFromUserText(std::string_view text) {
-    std::string path(text);
-    for (char& c : path) {
-        if (c == '\\') {
-            c = '/';
-        }
-    }
-    const bool hasDrive =
-        path.size() >= 2 && path[1] == ':' &&
-        ((path[0] >= 'A' && path[0] <= 'Z') || (path[0] >= 'a' && path[0] <= 'z'));
-    if (!hasDrive) {
+    const std::optional<DrivePath> drivePath = ParseDrivePath(text);
+    if (!drivePath) {
+        std::string path(text);
+        std::replace(path.begin(), path.end(), '\\', '/');
         return fs::path(path);
     }
     std::string prefix = GetEnv("WINEPREFIX");
     if (prefix.empty()) {
         prefix = GetEnv("HOME") + "/.wine";
     }
-    const char drive = static_cast<char>(path[0] | 0x20);
-    fs::path mapped = fs::path(prefix) / "dosdevices" / (std::string(1, drive) + ":");
-    if (!IsDirectory(mapped) && drive == 'c') {
-        mapped = fs::path(prefix) / "drive_c";  // A prefix without its dosdevices links.
-    }
-    std::string rest = path.substr(2);
-    while (!rest.empty() && rest.front() == '/') {
-        rest.erase(rest.begin());
-    }
-    return rest.empty() ? mapped : mapped / rest;
+    // An unmapped drive still gets a path in the prefix: the folder checks then say it is missing.
+    const fs::path drive =
+        PrefixDriveFolder(prefix, drivePath->drive)
+            .value_or(fs::path(prefix) / "dosdevices" / (std::string(1, drivePath->drive) + ":"));
+    return JoinDrivePath(drive, *drivePath);
 }
 
 }  // namespace kickvane::platform

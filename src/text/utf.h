@@ -12,6 +12,9 @@ std::u16string Utf8ToUtf16(std::string_view utf8);
 // UTF-16 to UTF-8. An unpaired surrogate becomes U+FFFD.
 std::string Utf16ToUtf8(std::u16string_view utf16);
 
+// Appends one character as UTF-8; a surrogate or a value above U+10FFFF becomes U+FFFD.
+void AppendUtf8(std::string& out, char32_t cp);
+
 // Strict UTF-8: no overlong forms, no surrogates, nothing above U+10FFFF.
 bool IsValidUtf8(std::string_view text);
 

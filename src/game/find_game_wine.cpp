@@ -5,6 +5,7 @@
 
 #include "game/game_managers.h"
 #include "platform/filesystem.h"
+#include "platform/windows_path.h"
 
 namespace kickvane::game {
 
@@ -88,10 +89,12 @@ private:
             return;
         }
         for (const RecordedInstall& install : ReadRecordedInstalls(prefix, outcome_.skipped)) {
-            const fs::path folder = WindowsPathInPrefix(prefix, install.windowsFolder);
-            if (folder.empty()) {
+            const std::optional<fs::path> mapped =
+                platform::WindowsPathInPrefix(prefix, install.windowsFolder);
+            if (!mapped) {
                 continue;
             }
+            const fs::path folder = platform::ResolveCaseInsensitive(*mapped);
             if (const auto launcher = platform::FindEntryIgnoringCase(folder, kLauncherName);
                 launcher && platform::IsRegularFile(*launcher)) {
                 Add(folder, prefix, source + ", " + install.source);

@@ -1,0 +1,44 @@
+#pragma once
+
+#include <optional>
+#include <string>
+#include <string_view>
+#include <utility>
+#include <vector>
+
+// What the readers of the game managers' structured files (YAML, JSON, Valve's KeyValues) give:
+// the scalar values by their path of keys, so that a manager's code asks for "game.exe" without
+// walking a tree of its own.
+namespace kickvane::game {
+
+// Scalar values by their path of keys joined with '.' ("game.exe", "libraryfolders.0.path";
+// list items count from 0). Values keep the order of the file.
+class FlatValues {
+public:
+    void Add(std::string key, std::string value) {
+        entries_.emplace_back(std::move(key), std::move(value));
+    }
+    // The first value of `key`, or nullopt.
+    std::optional<std::string> Find(std::string_view key) const;
+    const std::vector<std::pair<std::string, std::string>>& entries() const { return entries_; }
+    size_t size() const { return entries_.size(); }
+
+private:
+    std::vector<std::pair<std::string, std::string>> entries_;
+};
+
+// A parsed file or the reason it could not be read.
+struct Parsed {
+    FlatValues values;
+    std::string problem;  // empty when the file was read
+    bool ok() const { return problem.empty(); }
+};
+
+// Structured files nest no deeper than this and hold no more values; deeper or larger text is
+// refused (a YAML file's aliases could otherwise repeat a tree without end).
+inline constexpr int kMaxNesting = 64;
+inline constexpr size_t kMaxValues = 100000;
+
+std::string JoinKey(const std::string& parent, std::string_view key);
+
+}  // namespace kickvane::game
