@@ -37,7 +37,7 @@ std::optional<fs::path> PrefixDriveFolder(const fs::path& prefix, char drive) {
     if (IsDirectory(link)) {
         return link;
     }
-    if (drive == 'c' && IsDirectory(prefix / "drive_c")) {
+    if (drive == 'c') {
         return prefix / "drive_c";
     }
     return std::nullopt;

@@ -21,7 +21,8 @@ struct DrivePath {
 std::optional<DrivePath> ParseDrivePath(std::string_view text);
 
 // The folder that stands for `drive` in a Wine prefix: its link "dosdevices/<drive>:", else
-// "drive_c" for C: (a prefix without its links). nullopt for another drive without a link.
+// "drive_c" for C: (a prefix without its links, or not made yet). nullopt for another drive
+// without a link.
 std::optional<fs::path> PrefixDriveFolder(const fs::path& prefix, char drive);
 
 // `folder` with the names of `path` below it.

@@ -90,6 +90,22 @@ TEST_F(CliTest, SettingsThatCannotBeReadStopApplyWithTheReasonAndCopyNothing) {
         1);
 }
 
+// A Windows path climbs no higher than its drive's root, as on Windows: the game folder stays
+// in the Wine prefix, and nothing is written beside the prefix.
+TEST_F(CliTest, ApplyToAWindowsPathWithDotsStaysInThePrefix) {
+    MakeToolFolder(tool());
+    const fs::path prefix = dir_ / "prefix";
+    MakeGameFolder(prefix / "drive_c/elsewhere-game");
+    MakeGameFolder(dir_ / "elsewhere-game");
+    const Result done = RunCommand("WINEPREFIX=" + Quote(prefix) + " '" + KICKVANE_BINARY +
+                                       "' apply --tool-folder " + Quote(tool()) +
+                                       " --game 'C:\\..\\..\\elsewhere-game'",
+                                   dir_.path(), "");
+    EXPECT_EQ(done.exitCode, 0) << done.err;
+    EXPECT_TRUE(fs::exists(prefix / "drive_c/elsewhere-game/data2/cmn"));
+    EXPECT_FALSE(fs::exists(dir_ / "elsewhere-game/data2/cmn"));
+}
+
 TEST_F(CliTest, QuickLoadExitCodes) {
     fs::create_directories(tool() / "data/data2/players/heads/textures");
     WriteFile(dir_ / "faces/face1.dds", "face");

@@ -1,13 +1,18 @@
-#include "game/formats/config_formats.h"
-
 #include <gtest/gtest.h>
+
+#include <algorithm>
+
+#include "game/formats/desktop_entry.h"
+#include "game/formats/json.h"
+#include "game/formats/vdf.h"
+#include "game/formats/wine_registry.h"
+#include "game/formats/yaml.h"
 
 namespace kickvane::game {
 namespace {
 
-TEST(ParseYamlSubset,
-     ReadsLutrisAndBottlesShapes_WithQuotesListsCommentsAndBlockText_RefusesBinary) {
-    const Parsed parsed = ParseYamlSubset(
+TEST(ParseYaml, ReadsLutrisAndBottlesShapes_WithQuotesListsCommentsAndBlockText_RefusesBinary) {
+    const Parsed parsed = ParseYaml(
         "game:\n"
         "  exe: /home/u/Games/fifa/drive_c/FIFA Online 2/Gameloader.exe  # the launcher\n"
         "  prefix: '/home/u/Games/it''s here'\n"
@@ -31,13 +36,47 @@ TEST(ParseYamlSubset,
     EXPECT_EQ(v.Find("items.0"), "one");
     EXPECT_EQ(v.Find("items.1.name"), "two");
     EXPECT_EQ(v.Find("url"), "http://x/#no-comment");
+    EXPECT_EQ(v.Find("script"), "not: a key\n- nor an item\n");
     EXPECT_FALSE(v.Find("script.not"));
     EXPECT_FALSE(v.Find("not"));
 
-    // Binary or keyless text is malformed.
-    EXPECT_FALSE(ParseYamlSubset(std::string("game:\n  exe: a\0b\n", 16)).ok());
-    EXPECT_FALSE(ParseYamlSubset("just some words\nand more\n").ok());
-    EXPECT_TRUE(ParseYamlSubset("").ok());
+    // Binary or keyless text is malformed, and so is a tree that aliases repeat without end.
+    EXPECT_FALSE(ParseYaml(std::string("game:\n  exe: a\0b\n", 16)).ok());
+    EXPECT_FALSE(ParseYaml("just some words\nand more\n").ok());
+    EXPECT_FALSE(ParseYaml("game: [unclosed\n").ok());
+    std::string bomb = "a: &a [x, x, x, x, x, x, x, x, x, x]\n";
+    for (char name = 'b'; name <= 'h'; ++name) {
+        const char previous = static_cast<char>(name - 1);
+        bomb += std::string(1, name) + ": &" + name + " [*" + previous + ", *" + previous + ", *" +
+                previous + ", *" + previous + ", *" + previous + ", *" + previous + ", *" +
+                previous + ", *" + previous + ", *" + previous + ", *" + previous + "]\n";
+    }
+    const Parsed aliases = ParseYaml(bomb);
+    EXPECT_FALSE(aliases.ok());
+    EXPECT_EQ(aliases.values.size(), 0u);
+    EXPECT_TRUE(ParseYaml("").ok());
+}
+
+// PyYAML, which Lutris and Bottles write with, folds a long plain scalar onto an indented second
+// line, and a double-quoted one with a backslash at the break, writing letters outside ASCII as
+// escapes.
+TEST(ParseYaml, ReadsValuesFoldedOverLines_AndEscapedVietnameseLetters) {
+    const Parsed parsed = ParseYaml(
+        "game:\n"
+        "  exe: /home/u/Games/fifa-online-2/drive_c/Program Files (x86)/Nexon/FIFA Online\n"
+        "    2/Gameloader.exe\n"
+        "  prefix: /home/u/Games/fifa-online-2\n"
+        "External_Programs:\n"
+        "  0c3b5e7a-91f2-4bd0-a0a5-6f2f3c1d2e4b:\n"
+        "    path: \"/home/u/Tr\\xF2 ch\\u01A1i/B\\xF3ng \\u0111\\xE1/FIFA Online 2/Gameloader.exe\\\n"
+        "      \\ b\\u1EA3n m\\u1EDBi\"\n");
+    ASSERT_TRUE(parsed.ok()) << parsed.problem;
+    EXPECT_EQ(parsed.values.Find("game.exe"),
+              "/home/u/Games/fifa-online-2/drive_c/Program Files (x86)/Nexon/FIFA Online "
+              "2/Gameloader.exe");
+    EXPECT_EQ(parsed.values.Find("External_Programs.0c3b5e7a-91f2-4bd0-a0a5-6f2f3c1d2e4b.path"),
+              "/home/u/Tr\xC3\xB2 ch\xC6\xA1i/B\xC3\xB3ng \xC4\x91\xC3\xA1/FIFA Online "
+              "2/Gameloader.exe b\xE1\xBA\xA3n m\xE1\xBB\x9Bi");
 }
 
 TEST(ParseJson, FlattensNestedValues_DecodesEscapes_AndRejectsBrokenOrTooDeepText) {
@@ -48,14 +87,14 @@ TEST(ParseJson, FlattensNestedValues_DecodesEscapes_AndRejectsBrokenOrTooDeepTex
     ASSERT_TRUE(parsed.ok()) << parsed.problem;
     EXPECT_EQ(parsed.values.Find("fifa.winePrefix"), "/p/x");
     EXPECT_EQ(parsed.values.Find("fifa.wineVersion.bin"), "/w/bin/wine");
-    EXPECT_EQ(parsed.values.Find("fifa.n"), "12.5e1");
+    EXPECT_EQ(parsed.values.Find("fifa.on"), "true");
     EXPECT_FALSE(parsed.values.Find("fifa.none"));
     EXPECT_EQ(parsed.values.Find("games.0.app_name"), "a\xC3\xA9\xF0\x9F\x98\x80");
     EXPECT_EQ(parsed.values.Find("games.0.t"), "q\"\\/");
 
     for (const std::string& broken :
          {std::string("{\"a\": \"unterminated}"), std::string("[1, 2"), std::string("{} trailing"),
-          std::string("{\"a\": \"\\u12\"}"), std::string(100, '[')}) {
+          std::string("{\"a\": \"\\u12\"}"), std::string(100, '[') + std::string(100, ']')}) {
         EXPECT_FALSE(ParseJson(broken).ok()) << broken;
     }
 }
@@ -123,23 +162,57 @@ TEST(DesktopEntryValue, ReadsTheMainGroupOnly) {
     EXPECT_EQ(DesktopEntryValue(text, "Icon"), "");
 }
 
-// Files cut off anywhere (a manager writing them, a full disk) are read or refused, never read
-// past their end; the sanitizer build checks that.
-TEST(ConfigReaders, EveryTruncationOfAFileIsHandled) {
+// Files cut off anywhere (a manager writing them, a full disk): a cut file is refused with a
+// reason and gives no values, or gives only what the whole file holds; nothing is read past the
+// end (the sanitizer build checks that) and no exception escapes.
+TEST(ConfigReaders, EveryTruncationOfAFileIsRefusedOrReadAsFarAsItGoes) {
     const std::string yaml = "game:\n  exe: \"a\\u00e9\"\n  prefix: 'b''c'\nlist:\n- x\n- k: v\n";
     const std::string json = R"({"a": {"b": ["\ud83d\ude00", 1.5e3, true, null]}})";
-    const std::string vdf = "\"a\" { \"path\" \"x\\\\y\" } // c\n";
+    const std::string vdf = "// c\n\"a\" { \"path\" \"x\\\\y\" }\n";
     const std::string reg =
-        "WINE REGISTRY Version 2\n#arch=win64\n[Software\\\\X] 1\n\"A\"=\"\\x00e9\\u1ea0\\\n b\"\n";
-    for (size_t n = 0; n <= reg.size(); ++n) {
-        (void)ParseYamlSubset(yaml.substr(0, std::min(n, yaml.size())));
-        (void)ParseJson(json.substr(0, std::min(n, json.size())));
-        (void)ParseVdf(vdf.substr(0, std::min(n, vdf.size())));
-        (void)ParseWineRegistry(reg.substr(0, n), {"Software"});
-        (void)DesktopEntryValue(reg.substr(0, n), "A");
+        "WINE REGISTRY Version 2\n#arch=win64\n[Software\\\\X] 1\n\"A\"=\"\\x00e9\\u1ea0\\\n b\"\n"
+        "\"B\"=\"c\"\n";
+    const std::string desktop = "[Desktop Entry]\nExec=env WINEPREFIX=/p wine x\n";
+    const RegistryFile whole = ParseWineRegistry(reg, {"Software"});
+    ASSERT_EQ(whole.values.size(), 2u);
+    const std::string vdfEnd = vdf.substr(0, vdf.find('}') + 1);
+
+    auto refusedOrRead = [](const Parsed& parsed, const std::string& cut) {
+        EXPECT_TRUE(parsed.ok() || parsed.values.entries().empty()) << cut;
+    };
+    for (size_t n = 0; n < reg.size(); ++n) {
+        const std::string yamlCut = yaml.substr(0, std::min(n, yaml.size()));
+        const Parsed yamlParsed = ParseYaml(yamlCut);
+        refusedOrRead(yamlParsed, yamlCut);
+        // A quoted value is read whole or the file is refused; never half a value (a lone
+        // opening quote at the very end reads as empty, which names nothing).
+        if (const auto exe = yamlParsed.values.Find("game.exe"); exe && !exe->empty()) {
+            EXPECT_EQ(*exe, "a\xC3\xA9") << yamlCut;
+        }
+
+        const std::string jsonCut = json.substr(0, std::min(n, json.size()));
+        const Parsed jsonParsed = ParseJson(jsonCut);
+        refusedOrRead(jsonParsed, jsonCut);
+        EXPECT_EQ(jsonParsed.ok(), jsonCut == json) << jsonCut;
+
+        const std::string vdfCut = vdf.substr(0, std::min(n, vdf.size()));
+        const Parsed vdfParsed = ParseVdf(vdfCut);
+        refusedOrRead(vdfParsed, vdfCut);
+        EXPECT_EQ(vdfParsed.ok() && !vdfParsed.values.entries().empty(), vdfCut.size() >= vdfEnd.size())
+            << vdfCut;
+
+        // Registry values of a cut file are values of the whole file: a value cut inside its
+        // quotes is dropped, not read on into the next line or past the end.
+        for (const RegistryValue& value : ParseWineRegistry(reg.substr(0, n), {"Software"}).values) {
+            EXPECT_TRUE(std::any_of(whole.values.begin(), whole.values.end(),
+                                    [&](const RegistryValue& full) {
+                                        return full.name == value.name && full.value == value.value;
+                                    }))
+                << reg.substr(0, n);
+        }
+        const std::string exec = DesktopEntryValue(desktop.substr(0, std::min(n, desktop.size())), "Exec");
+        EXPECT_TRUE(std::string_view("env WINEPREFIX=/p wine x").starts_with(exec)) << exec;
     }
-    EXPECT_TRUE(ParseJson(json).ok());
-    EXPECT_FALSE(ParseJson(json.substr(0, json.size() - 1)).ok());
 }
 
 }  // namespace

@@ -1,4 +1,5 @@
 #include "platform/filesystem.h"
+#include "platform/windows_path.h"
 
 #include <fcntl.h>
 #include <gtest/gtest.h>
@@ -217,6 +218,28 @@ TEST_F(WinePrefixTest, WindowsPathGoesThroughTheDriveMapping) {
     EXPECT_TRUE(IsDirectory(NativePathFromUserText("c:\\GAMES").parent_path()));
     EXPECT_EQ(NativePathFromUserText("D:\\\\data2"), prefix_ / "dosdevices/d:/data2");
     EXPECT_EQ(NativePathFromUserText("/home/u/game\\data2"), fs::path("/home/u/game/data2"));
+}
+
+// "." and ".." are resolved as Windows resolves them, before the path enters the prefix: a
+// path never climbs above its drive's root and so never out of the prefix.
+TEST_F(WinePrefixTest, DotsResolveAsOnWindows_NeverAboveTheDrivesRoot) {
+    fs::create_directories(prefix_ / "drive_c/Games");
+    fs::create_directories(prefix_ / "dosdevices");
+    fs::create_directory_symlink("../drive_c", prefix_ / "dosdevices/c:");
+    fs::create_directories(prefix_ / "other");
+    fs::create_directory_symlink(prefix_ / "other", prefix_ / "dosdevices/d:");
+
+    EXPECT_EQ(NativePathFromUserText("C:\\..\\..\\elsewhere-game"),
+              prefix_ / "dosdevices/c:/elsewhere-game");
+    EXPECT_EQ(NativePathFromUserText("c:/Games/./FIFA/../../x/"), prefix_ / "dosdevices/c:/x");
+    EXPECT_EQ(NativePathFromUserText("C:.."), prefix_ / "dosdevices/c:");
+    EXPECT_EQ(NativePathFromUserText("/home/u/../v"), fs::path("/home/u/../v"));  // native: as is
+
+    EXPECT_EQ(WindowsPathInPrefix(prefix_.path(), "d:\\a\\..\\..\\b\\"), prefix_ / "dosdevices/d:/b");
+    EXPECT_EQ(WindowsPathInPrefix(prefix_.path(), "C:\\"), prefix_ / "dosdevices/c:");
+    EXPECT_FALSE(WindowsPathInPrefix(prefix_.path(), "Q:\\x"));  // no such drive in the prefix
+    EXPECT_FALSE(WindowsPathInPrefix(prefix_.path(), "relative\\x"));
+    EXPECT_FALSE(WindowsPathInPrefix(prefix_.path(), "\\\\server\\share"));
 }
 
 TEST_F(WinePrefixTest, DriveCFallsBackToDriveFolderWithoutDosdevices) {

@@ -59,7 +59,10 @@ Parsed ParseJson(std::string_view text) {
             parsed.problem = "too many values";
         }
     } catch (const Json::exception& error) {
-        parsed.problem = error.what();
+        // "[json.exception.parse_error.101] parse error at line 1, ...": the reason without its tag.
+        const std::string_view what = error.what();
+        const size_t tagEnd = what.find("] ");
+        parsed.problem = what.substr(tagEnd == std::string_view::npos ? 0 : tagEnd + 2);
     } catch (const std::exception& error) {
         parsed.problem = error.what();
     }
