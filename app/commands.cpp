@@ -37,41 +37,6 @@ void Print(const session::Outcome& shown) {
     }
 }
 
-struct Options {
-    fs::path toolFolder;
-    std::optional<std::string> game;
-    std::vector<std::string_view> positional;
-};
-
-// Reads "--tool-folder DIR" and, where allowed, "--game DIR"; the rest is positional.
-std::optional<Options> ParseOptions(Args args, bool allowGame) {
-    Options options;
-    for (size_t i = 0; i < args.size(); ++i) {
-        const std::string_view arg = args[i];
-        const bool takesValue = arg == "--tool-folder" || (allowGame && arg == "--game");
-        if (takesValue) {
-            if (i + 1 >= args.size()) {
-                std::cerr << "kickvane: " << arg << " cần một thư mục\n";
-                return std::nullopt;
-            }
-            if (arg == "--game") {
-                options.game = std::string(args[++i]);
-            } else {
-                options.toolFolder = fs::absolute(platform::PathFromUtf8(args[++i]));
-            }
-        } else if (arg.starts_with("--")) {
-            std::cerr << "kickvane: không có tuỳ chọn " << arg << '\n';
-            return std::nullopt;
-        } else {
-            options.positional.push_back(arg);
-        }
-    }
-    if (options.toolFolder.empty()) {
-        options.toolFolder = DefaultToolFolder();
-    }
-    return options;
-}
-
 // The session of the tool folder, with the game folder of the command line. nullopt, with the
 // reason on standard error, when the settings file exists but cannot be read: acting on defaults
 // the user never chose would be wrong.
@@ -117,6 +82,37 @@ void PrintStep(const engine::StepOutcome& outcome, const text::ShownFolders& fol
 
 }  // namespace
 
+std::optional<Options> ParseOptions(Args args, bool allowGame, size_t positional) {
+    Options options;
+    for (size_t i = 0; i < args.size(); ++i) {
+        const std::string_view arg = args[i];
+        const bool takesValue = arg == "--tool-folder" || (allowGame && arg == "--game");
+        if (takesValue) {
+            if (i + 1 >= args.size()) {
+                std::cerr << "kickvane: " << arg << " cần một thư mục\n";
+                return std::nullopt;
+            }
+            if (arg == "--game") {
+                options.game = std::string(args[++i]);
+            } else {
+                options.toolFolder = fs::absolute(platform::PathFromUtf8(args[++i]));
+            }
+        } else if (arg.starts_with("--")) {
+            std::cerr << "kickvane: không có tuỳ chọn " << arg << '\n';
+            return std::nullopt;
+        } else {
+            options.positional.push_back(arg);
+        }
+    }
+    if (options.positional.size() != positional) {
+        return std::nullopt;
+    }
+    if (options.toolFolder.empty()) {
+        options.toolFolder = DefaultToolFolder();
+    }
+    return options;
+}
+
 void PrintUsage(std::ostream& out) {
     out << "Cách dùng: kickvane [--tool-folder TM]     mở cửa sổ\n"
            "           kickvane LỆNH [THAM SỐ]\n"
@@ -144,8 +140,8 @@ void PrintUsage(std::ostream& out) {
 }
 
 int RunApply(Args args) {
-    const std::optional<Options> options = ParseOptions(args, true);
-    if (!options || !options->positional.empty()) {
+    const std::optional<Options> options = ParseOptions(args, true, 0);
+    if (!options) {
         PrintUsage(std::cerr);
         return kExitStopped;
     }
@@ -172,8 +168,8 @@ int RunApply(Args args) {
 }
 
 int RunPlan(Args args) {
-    const std::optional<Options> options = ParseOptions(args, true);
-    if (!options || !options->positional.empty()) {
+    const std::optional<Options> options = ParseOptions(args, true, 0);
+    if (!options) {
         PrintUsage(std::cerr);
         return kExitStopped;
     }
@@ -193,8 +189,8 @@ int RunPlan(Args args) {
 }
 
 int RunQuickLoad(Args args) {
-    const std::optional<Options> options = ParseOptions(args, false);
-    if (!options || options->positional.size() != 1) {
+    const std::optional<Options> options = ParseOptions(args, false, 1);
+    if (!options) {
         PrintUsage(std::cerr);
         return kExitStopped;
     }

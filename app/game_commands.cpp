@@ -27,16 +27,12 @@ fs::path DefaultToolFolder() {
 }
 
 int RunLaunch(Args args) {
-    fs::path toolFolder;
-    if (args.size() == 2 && args[0] == "--tool-folder") {
-        toolFolder = fs::absolute(platform::PathFromUtf8(args[1]));
-    } else if (args.empty()) {
-        toolFolder = DefaultToolFolder();
-    } else {
+    const std::optional<Options> options = ParseOptions(args, false, 0);
+    if (!options) {
         PrintUsage(std::cerr);
         return 2;
     }
-    session::Session session(toolFolder);
+    session::Session session(options->toolFolder);
     if (const std::optional<text::Message> problem = session.SettingsProblem()) {
         std::cerr << "kickvane: " << problem->text << '\n';
         return 2;

@@ -21,17 +21,15 @@ std::optional<WindowEntry> WindowOrSayWhy() {
 }  // namespace
 
 int RunWindowCommand(int& argc, char** argv, Args args) {
-    std::filesystem::path toolFolder;
-    if (args.size() == 2 && args[0] == "--tool-folder") {
-        toolFolder = std::filesystem::absolute(platform::PathFromUtf8(args[1]));
-    } else if (!args.empty()) {
+    const std::optional<Options> options = ParseOptions(args, false, 0);
+    if (!options) {
         PrintUsage(std::cerr);
         return 2;
-    } else {
-        toolFolder = DefaultToolFolder();
     }
     const std::optional<WindowEntry> window = WindowOrSayWhy();
-    return window ? window->openWindow(&argc, argv, platform::PathToUtf8(toolFolder).c_str()) : 2;
+    return window
+               ? window->openWindow(&argc, argv, platform::PathToUtf8(options->toolFolder).c_str())
+               : 2;
 }
 
 int RunSkinGallery(Args args) {

@@ -14,7 +14,7 @@ limit=(-max_total_time="${1:-60}")
 if [ "${1:-}" = "--runs" ]; then
   limit=(-runs="${2:?--runs needs a number}")
 fi
-targets=(${FUZZ_TARGETS:-settings text update_answer quick_load_match})
+targets=(${FUZZ_TARGETS:-settings text update_answer quick_load_match vdf wine_registry desktop_entry})
 
 cmake --preset fuzz >/dev/null
 cmake --build --preset fuzz -j "$(nproc)"

@@ -14,8 +14,9 @@ packages=(
   xvfb xauth xdotool x11-utils trayer imagemagick
   # fonts with Vietnamese glyphs for the window and the artwork
   fonts-dejavu-core
-  # Lutris's game database (read-only); desktop entry check and packages of the install test
-  libsqlite3-dev desktop-file-utils dpkg-dev
+  # the game managers' files: Lutris's database (read-only), their YAML and JSON; desktop entry
+  # check and packages of the install test
+  libsqlite3-dev libyaml-cpp-dev nlohmann-json3-dev desktop-file-utils dpkg-dev
   # fuzzing (clang brings libFuzzer and the sanitizers) and the apply benchmark's baselines
   clang rsync
   # the Windows program: its tests run under Wine; the release is a zip

@@ -68,7 +68,8 @@ TEST(ParseYaml, ReadsValuesFoldedOverLines_AndEscapedVietnameseLetters) {
         "  prefix: /home/u/Games/fifa-online-2\n"
         "External_Programs:\n"
         "  0c3b5e7a-91f2-4bd0-a0a5-6f2f3c1d2e4b:\n"
-        "    path: \"/home/u/Tr\\xF2 ch\\u01A1i/B\\xF3ng \\u0111\\xE1/FIFA Online 2/Gameloader.exe\\\n"
+        "    path: \"/home/u/Tr\\xF2 ch\\u01A1i/B\\xF3ng \\u0111\\xE1/FIFA Online "
+        "2/Gameloader.exe\\\n"
         "      \\ b\\u1EA3n m\\u1EDBi\"\n");
     ASSERT_TRUE(parsed.ok()) << parsed.problem;
     EXPECT_EQ(parsed.values.Find("game.exe"),
@@ -198,19 +199,22 @@ TEST(ConfigReaders, EveryTruncationOfAFileIsRefusedOrReadAsFarAsItGoes) {
         const std::string vdfCut = vdf.substr(0, std::min(n, vdf.size()));
         const Parsed vdfParsed = ParseVdf(vdfCut);
         refusedOrRead(vdfParsed, vdfCut);
-        EXPECT_EQ(vdfParsed.ok() && !vdfParsed.values.entries().empty(), vdfCut.size() >= vdfEnd.size())
+        EXPECT_EQ(vdfParsed.ok() && !vdfParsed.values.entries().empty(),
+                  vdfCut.size() >= vdfEnd.size())
             << vdfCut;
 
         // Registry values of a cut file are values of the whole file: a value cut inside its
         // quotes is dropped, not read on into the next line or past the end.
-        for (const RegistryValue& value : ParseWineRegistry(reg.substr(0, n), {"Software"}).values) {
+        for (const RegistryValue& value :
+             ParseWineRegistry(reg.substr(0, n), {"Software"}).values) {
             EXPECT_TRUE(std::any_of(whole.values.begin(), whole.values.end(),
                                     [&](const RegistryValue& full) {
                                         return full.name == value.name && full.value == value.value;
                                     }))
                 << reg.substr(0, n);
         }
-        const std::string exec = DesktopEntryValue(desktop.substr(0, std::min(n, desktop.size())), "Exec");
+        const std::string exec =
+            DesktopEntryValue(desktop.substr(0, std::min(n, desktop.size())), "Exec");
         EXPECT_TRUE(std::string_view("env WINEPREFIX=/p wine x").starts_with(exec)) << exec;
     }
 }

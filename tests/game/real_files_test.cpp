@@ -49,17 +49,22 @@ TEST(RealFiles, LutrisExeFoldedOverTwoLines_OutsideItsPrefix_RunsInTheNamedPrefi
     WriteFile(home / ".config/lutris/games/fifa-online-2-1701234567.yml",
               "game:\n"
               "  args: ''\n"
-              "  exe: \"" + exe.substr(0, fold) + "\\\n    \\ " + exe.substr(fold + 1) + "\"\n"
-              "  prefix: " + prefix.string() + "\n"
-              "game_slug: fifa-online-2\n"
-              "name: FIFA Online 2\n"
-              "requires: null\n"
-              "slug: fifa-online-2\n"
-              "system: {}\n"
-              "wine:\n"
-              "  version: lutris-7.2-2-x86_64\n");
+              "  exe: \"" +
+                  exe.substr(0, fold) + "\\\n    \\ " + exe.substr(fold + 1) +
+                  "\"\n"
+                  "  prefix: " +
+                  prefix.string() +
+                  "\n"
+                  "game_slug: fifa-online-2\n"
+                  "name: FIFA Online 2\n"
+                  "requires: null\n"
+                  "slug: fifa-online-2\n"
+                  "system: {}\n"
+                  "wine:\n"
+                  "  version: lutris-7.2-2-x86_64\n");
     // The same value folded as a plain scalar, as PyYAML writes it where no escape is needed.
-    const fs::path other = FakeHome::MakeGame(home / "Games/Some Other Place With A Long Name/FIFA");
+    const fs::path other =
+        FakeHome::MakeGame(home / "Games/Some Other Place With A Long Name/FIFA");
     const std::string otherExe = (other / "Gameloader.exe").string();
     const size_t otherFold = otherExe.rfind(" Long");
     WriteFile(home / ".config/lutris/games/fifa-2-1701234568.yml",
@@ -78,7 +83,8 @@ TEST(RealFiles, LutrisExeFoldedOverTwoLines_OutsideItsPrefix_RunsInTheNamedPrefi
     ASSERT_EQ(decision.problem, LaunchProblem::None);
     EXPECT_EQ(decision.plan.program,
               home / ".local/share/lutris/runners/wine/lutris-7.2-2-x86_64/bin/wine");
-    EXPECT_EQ(decision.plan.environment, (Env{{"WINEPREFIX", prefix.string()}, {"WINEARCH", "win32"}}));
+    EXPECT_EQ(decision.plan.environment,
+              (Env{{"WINEPREFIX", prefix.string()}, {"WINEARCH", "win32"}}));
 }
 
 // A program added to a bottle from outside it, its path with Vietnamese letters that PyYAML
@@ -86,7 +92,8 @@ TEST(RealFiles, LutrisExeFoldedOverTwoLines_OutsideItsPrefix_RunsInTheNamedPrefi
 TEST(RealFiles, BottlesProgramOutsideItsBottle_IsFound_AndRunsThroughBottlesOrItsBottle) {
     FakeHome home;
     const fs::path bottle = home.MakePrefix(".local/share/bottles/bottles/FIFA", "win64");
-    const fs::path game = FakeHome::MakeGame(home / "Tr\xC3\xB2 ch\xC6\xA1i/B\xC3\xB3ng \xC4\x91\xC3\xA1/FIFA Online 2");
+    const fs::path game = FakeHome::MakeGame(
+        home / "Tr\xC3\xB2 ch\xC6\xA1i/B\xC3\xB3ng \xC4\x91\xC3\xA1/FIFA Online 2");
     testing::WriteProgram(home / ".local/share/bottles/runners/soda-7.0-9/bin/wine", "#!/bin/sh\n");
     const std::string folded = home.home().string() +
                                "/Tr\\xF2 ch\\u01A1i/B\\xF3ng \\u0111\\xE1/FIFA\\\n      \\ Online "
@@ -98,14 +105,18 @@ TEST(RealFiles, BottlesProgramOutsideItsBottle_IsFound_AndRunsThroughBottlesOrIt
               "  5a1e2b7c-0d5f-4f7e-9c52-3f0d2c8e6b11:\n"
               "    arguments: ''\n"
               "    executable: Gameloader.exe\n"
-              "    folder: \"" + home.home().string() + "/Tr\\xF2 ch\\u01A1i/B\\xF3ng \\u0111\\xE1/FIFA Online 2\"\n"
-              "    id: 5a1e2b7c-0d5f-4f7e-9c52-3f0d2c8e6b11\n"
-              "    name: Gameloader\n"
-              "    path: \"" + folded + "\"\n"
-              "Name: FIFA\n"
-              "Path: FIFA\n"
-              "Runner: soda-7.0-9\n"
-              "Versioning: false\n");
+              "    folder: \"" +
+                  home.home().string() +
+                  "/Tr\\xF2 ch\\u01A1i/B\\xF3ng \\u0111\\xE1/FIFA Online 2\"\n"
+                  "    id: 5a1e2b7c-0d5f-4f7e-9c52-3f0d2c8e6b11\n"
+                  "    name: Gameloader\n"
+                  "    path: \"" +
+                  folded +
+                  "\"\n"
+                  "Name: FIFA\n"
+                  "Path: FIFA\n"
+                  "Runner: soda-7.0-9\n"
+                  "Versioning: false\n");
 
     const FindOutcome found = FindGame(home.folders(), SearchLimits{});
     ASSERT_NE(FoundIn(found, game), nullptr) << ::testing::PrintToString(found.skipped);
@@ -118,7 +129,8 @@ TEST(RealFiles, BottlesProgramOutsideItsBottle_IsFound_AndRunsThroughBottlesOrIt
 
     decision = PlanLaunch(game.string(), home.folders(), Installed({"wine"}));
     EXPECT_EQ(decision.plan.program, home / ".local/share/bottles/runners/soda-7.0-9/bin/wine");
-    EXPECT_EQ(decision.plan.environment, (Env{{"WINEPREFIX", bottle.string()}, {"WINEARCH", "win64"}}));
+    EXPECT_EQ(decision.plan.environment,
+              (Env{{"WINEPREFIX", bottle.string()}, {"WINEARCH", "win64"}}));
 }
 
 // Steams before 2021 list their libraries as "1" "<path>", without a "path" key.
@@ -151,7 +163,8 @@ TEST(RealFiles, HeroicProtonPrefixIsItsPfx_AndASideloadedGameRunsInItsNamedPrefi
     const fs::path outside = FakeHome::MakeGame(home / "Games/FIFA Online 2 (sideload)");
     WriteFile(home / ".config/heroic/GamesConfig/Xk2Lr9vQ.json",
               "{\n  \"Xk2Lr9vQ\": {\n    \"autoInstallDxvk\": true,\n    \"enableEsync\": true,\n"
-              "    \"winePrefix\": \"" + (home / "Games/Heroic/Prefixes/default/FIFA").string() +
+              "    \"winePrefix\": \"" +
+                  (home / "Games/Heroic/Prefixes/default/FIFA").string() +
                   "\",\n    \"wineVersion\": {\n      \"bin\": \"" + (proton / "proton").string() +
                   "\",\n      \"name\": \"Proton - Proton - Experimental\",\n"
                   "      \"type\": \"proton\"\n    }\n  },\n  \"version\": \"v0\",\n"
@@ -176,7 +189,8 @@ TEST(RealFiles, HeroicProtonPrefixIsItsPfx_AndASideloadedGameRunsInItsNamedPrefi
 
     // Proton's own script wants Steam's environment: the Wine inside Proton runs the game.
     for (const fs::path& game : {inside, outside}) {
-        const LaunchDecision decision = PlanLaunch(game.string(), home.folders(), Installed({"wine"}));
+        const LaunchDecision decision =
+            PlanLaunch(game.string(), home.folders(), Installed({"wine"}));
         ASSERT_EQ(decision.problem, LaunchProblem::None) << game;
         EXPECT_EQ(decision.plan.program, proton / "files/bin/wine") << game;
         EXPECT_EQ(decision.plan.environment,

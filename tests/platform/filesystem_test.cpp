@@ -235,7 +235,8 @@ TEST_F(WinePrefixTest, DotsResolveAsOnWindows_NeverAboveTheDrivesRoot) {
     EXPECT_EQ(NativePathFromUserText("C:.."), prefix_ / "dosdevices/c:");
     EXPECT_EQ(NativePathFromUserText("/home/u/../v"), fs::path("/home/u/../v"));  // native: as is
 
-    EXPECT_EQ(WindowsPathInPrefix(prefix_.path(), "d:\\a\\..\\..\\b\\"), prefix_ / "dosdevices/d:/b");
+    EXPECT_EQ(WindowsPathInPrefix(prefix_.path(), "d:\\a\\..\\..\\b\\"),
+              prefix_ / "dosdevices/d:/b");
     EXPECT_EQ(WindowsPathInPrefix(prefix_.path(), "C:\\"), prefix_ / "dosdevices/c:");
     EXPECT_FALSE(WindowsPathInPrefix(prefix_.path(), "Q:\\x"));  // no such drive in the prefix
     EXPECT_FALSE(WindowsPathInPrefix(prefix_.path(), "relative\\x"));

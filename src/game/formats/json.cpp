@@ -59,7 +59,8 @@ Parsed ParseJson(std::string_view text) {
             parsed.problem = "too many values";
         }
     } catch (const Json::exception& error) {
-        // "[json.exception.parse_error.101] parse error at line 1, ...": the reason without its tag.
+        // "[json.exception.parse_error.101] parse error at line 1, ...": the reason without its
+        // tag.
         const std::string_view what = error.what();
         const size_t tagEnd = what.find("] ");
         parsed.problem = what.substr(tagEnd == std::string_view::npos ? 0 : tagEnd + 2);

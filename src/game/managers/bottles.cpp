@@ -50,8 +50,7 @@ void ScanInstall(ScanContext& context, const fs::path& bottles, bool flatpak) {
         context.Add(entry);
         // Programs added to the bottle: one entry each, run in the same bottle.
         for (const auto& [key, value] : values->entries()) {
-            if (key.starts_with("External_Programs.") && key.ends_with(".path") &&
-                !value.empty()) {
+            if (key.starts_with("External_Programs.") && key.ends_with(".path") && !value.empty()) {
                 ManagedPrefix program = entry;
                 program.executable = value;
                 context.Add(std::move(program));

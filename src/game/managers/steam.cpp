@@ -26,7 +26,8 @@ std::vector<fs::path> LibrariesIn(const FlatValues& values) {
         const size_t dot = key.find('.');
         const std::string_view below =
             dot == std::string::npos ? std::string_view() : std::string_view(key).substr(dot + 1);
-        const bool current = below.ends_with(".path") && IsNumber(below.substr(0, below.size() - 5));
+        const bool current =
+            below.ends_with(".path") && IsNumber(below.substr(0, below.size() - 5));
         if ((current || IsNumber(below)) && !value.empty()) {
             libraries.emplace_back(value);
         }
@@ -61,7 +62,8 @@ void ScanSteam(ScanContext& context) {
             if (!platform::IsRegularFile(root / file)) {
                 continue;
             }
-            if (const std::optional<FlatValues> values = context.ReadConfig(root / file, ParseVdf)) {
+            if (const std::optional<FlatValues> values =
+                    context.ReadConfig(root / file, ParseVdf)) {
                 for (const fs::path& library : LibrariesIn(*values)) {
                     addLibrary(library);
                 }
