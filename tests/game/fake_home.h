@@ -3,7 +3,9 @@
 #include <filesystem>
 #include <string>
 #include <string_view>
+#include <vector>
 
+#include "game/launch_plan.h"
 #include "game/wine_prefix.h"
 #include "support/temp_dir.h"
 
@@ -48,6 +50,21 @@ public:
 
 private:
     TempDir dir_;
+};
+
+// Programs are "found" in a fake bin folder when the test says they are installed.
+struct Installed {
+    std::vector<std::string> names;
+    game::ProgramLookup lookup() const {
+        return [names = names](const std::string& name) {
+            for (const std::string& installed : names) {
+                if (installed == name) {
+                    return fs::path("/fake/bin") / name;
+                }
+            }
+            return fs::path();
+        };
+    }
 };
 
 // Writes an executable script.

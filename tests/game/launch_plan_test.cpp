@@ -10,23 +10,9 @@ namespace {
 
 namespace fs = std::filesystem;
 using testing::FakeHome;
+using testing::Installed;
 using testing::WriteFile;
 using Args = std::vector<std::string>;
-
-// Programs are "found" in a fake bin folder when the test says they are installed.
-struct Installed {
-    std::vector<std::string> names;
-    ProgramLookup lookup() const {
-        return [names = names](const std::string& name) {
-            for (const std::string& installed : names) {
-                if (installed == name) {
-                    return fs::path("/fake/bin") / name;
-                }
-            }
-            return fs::path();
-        };
-    }
-};
 
 void MakeLutrisDatabase(const fs::path& file, const std::string& configName) {
     fs::create_directories(file.parent_path());

@@ -17,14 +17,7 @@ using Args = std::vector<std::string>;
 using Env = platform::EnvironmentAdditions;
 
 ProgramLookup Installed(std::vector<std::string> names) {
-    return [names = std::move(names)](const std::string& name) {
-        for (const std::string& installed : names) {
-            if (installed == name) {
-                return fs::path("/fake/bin") / name;
-            }
-        }
-        return fs::path();
-    };
+    return testing::Installed{std::move(names)}.lookup();
 }
 
 const FoundGame* FoundIn(const FindOutcome& outcome, const fs::path& folder) {
