@@ -64,7 +64,9 @@ Parsed ParseYaml(std::string_view text) {
         }
     } catch (const YAML::Exception& error) {
         parsed.values = {};
-        parsed.problem = "line " + std::to_string(error.mark.line + 1) + ": " + error.msg;
+        parsed.problem = error.mark.is_null()
+                             ? error.msg
+                             : "line " + std::to_string(error.mark.line + 1) + ": " + error.msg;
     } catch (const std::exception& error) {
         parsed.values = {};
         parsed.problem = error.what();
