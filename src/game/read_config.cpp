@@ -22,7 +22,7 @@ std::optional<std::string> ReadConfigText(const std::filesystem::path& path,
             problem = "too large (over " + std::to_string(maxBytes) + " bytes)";
             break;
         case Result::Unreadable:
-            problem = "cannot read: " + read.error;
+            problem = "cannot read: " + read.error.message();
             break;
     }
     return std::nullopt;
