@@ -13,6 +13,7 @@ using Args = std::span<const std::string_view>;
 
 int RunApply(Args args);
 int RunPlan(Args args);
+int RunList(Args args);
 int RunQuickLoad(Args args);
 int RunVni(Args args);
 int RunIni(Args args);
