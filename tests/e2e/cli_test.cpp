@@ -85,22 +85,22 @@ TEST_F(CliTest, ListMarksChosenAndAddedVariantsAndNamesSkippedFolders) {
                                            "\r\n[Bang Ti So]\r\nMacDinh=False\r\nĐài 1=True\r\n");
     const Result list = Kickvane("list --tool-folder " + Quote(tool()));
     EXPECT_EQ(list.exitCode, 0) << list.err;
-    EXPECT_NE(list.out.find("Bong [on] Thay đổi bóng\n  ( ) MacDinh: Mặc định\n"
+    EXPECT_NE(list.out.find("Bong [bật] Thay đổi bóng\n  ( ) MacDinh: Mặc định\n"
                             "  (*) Europa League 2011: Europa League 2011\n"),
               std::string::npos)
         << list.out;
-    EXPECT_NE(list.out.find("  ( ) SSUCLRed: Supa Strikas UCL Red\n  (*) Đài 1 [added]\n"
-                            "  skipped extras\\scoreboard\\a=b: name cannot be a settings key\n"
-                            "Mark [on]"),
+    EXPECT_NE(list.out.find("  ( ) SSUCLRed: Supa Strikas UCL Red\n  (*) Đài 1 [đã thêm]\n"
+                            "  bỏ qua extras\\scoreboard\\a=b: tên có ký tự không dùng được\n"
+                            "Mark [bật]"),
               std::string::npos)
         << list.out;
-    EXPECT_NE(list.out.find("SVD [off] Thay đổi Sân vận động\n"), std::string::npos);
+    EXPECT_NE(list.out.find("SVD [tắt] Thay đổi Sân vận động\n"), std::string::npos);
 
     const Result plan = Kickvane("plan " + Folders());
-    EXPECT_NE(plan.out.find("TiSo: merge ExtrasFolder\\scoreboard\\Đài 1\\scoreboard -> "
-                            "DataRoot\\gui\\hud\\scoreboard\n"
-                            "TiSo: merge ExtrasFolder\\scoreboard\\Đài 1\\namebar -> "
-                            "DataRoot\\gui\\hud\\namebar\n"),
+    EXPECT_NE(plan.out.find("Thay đổi bảng tỉ số: chép thư mục extras\\scoreboard\\Đài "
+                            "1\\scoreboard vào data2\\gui\\hud\\scoreboard\n"
+                            "Thay đổi bảng tỉ số: chép thư mục extras\\scoreboard\\Đài "
+                            "1\\namebar vào data2\\gui\\hud\\namebar\n"),
               std::string::npos)
         << plan.out;
 }
