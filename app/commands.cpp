@@ -8,6 +8,7 @@
 #include "platform/filesystem.h"
 #include "platform/program.h"
 #include "platform/single_instance.h"
+#include "platform/text.h"
 #include "session/session.h"
 #include "text/failure_text.h"
 #include "text/vni.h"
@@ -80,6 +81,34 @@ void PrintStep(const engine::StepOutcome& outcome, const text::ShownFolders& fol
     std::cout << '\n';
 }
 
+void PrintGroup(const session::Session& session, const catalog::VariantGroup& group) {
+    const catalog::PatchSelection& selection = session.selection();
+    for (const catalog::PatchOption& option : group.options) {
+        std::cout << "  " << (selection.optionValue(group.array, option.index) ? "(*) " : "( ) ")
+                  << option.key << ": " << option.label << '\n';
+    }
+    const catalog::AddedVariants& added = session.addedVariants();
+    for (const catalog::AddedVariant& variant : added.Of(group.id)) {
+        std::cout << "  " << (selection.addedValue(group.id, variant.name) ? "(*) " : "( ) ")
+                  << variant.name << " [đã thêm]\n";
+    }
+    const std::string folder = "extras\\" + std::string(catalog::GroupFolder(group.id));
+    switch (added.folderState(group.id)) {
+        case catalog::GroupFolderState::Listed:
+            break;
+        case catalog::GroupFolderState::Missing:
+            std::cout << "  không có thư mục " << folder << '\n';
+            break;
+        case catalog::GroupFolderState::Unreadable:
+            std::cout << "  không đọc được hết thư mục " << folder << '\n';
+            break;
+    }
+    for (const catalog::SkippedFolder& skipped : added.Skipped(group.id)) {
+        std::cout << "  bỏ qua " << folder << '\\' << skipped.name << ": "
+                  << session::SkipReasonText(skipped.reason) << '\n';
+    }
+}
+
 }  // namespace
 
 std::optional<Options> ParseOptions(Args args, bool allowGame, size_t positional) {
@@ -119,6 +148,8 @@ void PrintUsage(std::ostream& out) {
            "\n"
            "  apply [--tool-folder TM] [--game TM]   chép các bộ đã chọn vào trò chơi\n"
            "  plan [--tool-folder TM] [--game TM]    liệt kê các bước chép, không chép gì\n"
+           "  list [--tool-folder TM]                liệt kê các mục và các bộ: bộ đã chọn (*),\n"
+           "                                         bộ đã thêm, thư mục bỏ qua\n"
            "  quick-load NGUỒN [--tool-folder TM]    thêm các file Face và Ball vào bộ gốc\n"
            "  vni [VĂN BẢN]                          đổi văn bản gõ kiểu VNI sang Unicode\n"
            "  ini get FILE MỤC KHOÁ [MẶC ĐỊNH]       đọc một giá trị thiết lập\n"
@@ -184,6 +215,30 @@ int RunPlan(Args args) {
               << "thư mục trò chơi = " << platform::PathToUtf8(folders.game) << '\n';
     for (const engine::PlanStep& step : session->Plan()) {
         std::cout << session::StepLabel(step) << ": " << session::StepText(step) << '\n';
+    }
+    return kExitOk;
+}
+
+int RunList(Args args) {
+    const std::optional<Options> options = ParseOptions(args, false);
+    if (!options || !options->positional.empty()) {
+        PrintUsage(std::cerr);
+        return kExitStopped;
+    }
+    std::optional<session::Session> session = SessionFor(*options);
+    if (!session) {
+        return kExitStopped;
+    }
+    if (std::optional<text::Message> gone = session->TakeGoneNotice()) {
+        std::cerr << gone->title << ": " << gone->text << '\n';
+    }
+    for (const catalog::PatchCategory& category : catalog::Categories()) {
+        std::cout << category.key
+                  << (session->selection().isOn(category.switchIndex) ? " [bật] " : " [tắt] ")
+                  << platform::TrimBlanks(category.label) << '\n';
+        if (category.group) {
+            PrintGroup(*session, catalog::Group(*category.group));
+        }
     }
     return kExitOk;
 }

@@ -27,6 +27,7 @@ std::optional<Options> ParseOptions(Args args, bool allowGame, size_t positional
 
 int RunApply(Args args);
 int RunPlan(Args args);
+int RunList(Args args);
 int RunQuickLoad(Args args);
 int RunVni(Args args);
 int RunIni(Args args);

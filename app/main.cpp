@@ -23,6 +23,9 @@ int main(int argc, char** argv) {
     if (command == "plan") {
         return RunPlan(rest);
     }
+    if (command == "list") {
+        return RunList(rest);
+    }
     if (command == "quick-load") {
         return RunQuickLoad(rest);
     }

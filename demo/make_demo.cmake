@@ -63,6 +63,15 @@ foreach(set "Mat cuoi" "PES vang")
   stand_in("${extras}/Indicator/${set}" indicator.dds)
 endforeach()
 
+# One set per group that a player would add: not in the catalog, found by listing the folders.
+stand_in("${extras}/Ball/Bóng Tết 2026" ball10_01.ea3.em)
+stand_in("${extras}/Ball/Bóng Tết 2026/textures" ball10.dds)
+stand_in("${extras}/scoreboard/Đài Truyền hình/scoreboard" scoreboard.dds)
+stand_in("${extras}/scoreboard/Đài Truyền hình/namebar" namebar.dds)
+stand_in("${extras}/adboard/V-League 2026" adboard_main.dds)
+stand_in("${extras}/pitch/Sọc ngang" grass.dds)
+stand_in("${extras}/Indicator/Mũi tên đỏ" indicator.dds)
+
 # The demo game: both data trees, some folders spelled in another letter case as Windows games
 # often have them, and a launcher that only says it ran.
 if(NOT EXISTS "${GAME_DIR}/data2")

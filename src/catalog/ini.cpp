@@ -214,6 +214,32 @@ std::optional<std::string> IniDocument::Get(std::string_view section, std::strin
     return std::nullopt;
 }
 
+std::vector<std::pair<std::string, std::string>> IniDocument::Entries(
+    std::string_view section) const {
+    const std::string wanted_section = NormalizeName(section);
+    std::vector<std::pair<std::string, std::string>> entries;
+    bool in_section = wanted_section.empty();
+    for (const std::string& line : lines_) {
+        const ParsedLine parsed = ParseLine(line);
+        if (parsed.kind == LineKind::kSection) {
+            if (in_section) {
+                break;
+            }
+            in_section = !wanted_section.empty() &&
+                         platform::NamesEqualIgnoringCase(parsed.name, wanted_section);
+        } else if (in_section && parsed.kind == LineKind::kEntry) {
+            bool seen = false;
+            for (const auto& entry : entries) {
+                seen = seen || platform::NamesEqualIgnoringCase(entry.first, parsed.name);
+            }
+            if (!seen) {
+                entries.emplace_back(std::string(parsed.name), Unquote(parsed.value));
+            }
+        }
+    }
+    return entries;
+}
+
 Status IniDocument::Set(std::string_view section, std::string_view key, std::string_view value) {
     const std::string section_name = NormalizeName(section);
     const std::string key_name = NormalizeName(key);

@@ -5,6 +5,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 #include "platform/status.h"
@@ -46,6 +47,10 @@ public:
     // The value of the first key `key` in the first section `section`; nullopt when there is
     // none. A key present with an empty value gives the empty text.
     std::optional<std::string> Get(std::string_view section, std::string_view key) const;
+
+    // The keys of the first section `section` in file order, each with its value as Get gives
+    // it; a key that occurs twice is listed once, with its first value.
+    std::vector<std::pair<std::string, std::string>> Entries(std::string_view section) const;
 
     // Replaces the value of the first key `key` of the first section `section` in place, or adds
     // the key at the end of that section, or adds the section at the end. Line breaks and NUL

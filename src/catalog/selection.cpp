@@ -50,6 +50,7 @@ void PatchSelection::setOptionValue(OptionArray array, int index, bool value) {
     std::optional<int>& chosen = chosen_[Slot(group->id)];
     if (value) {
         chosen = index;
+        chosenAdded_[Slot(group->id)].clear();
     } else if (chosen == index) {
         chosen.reset();
     }
@@ -70,6 +71,24 @@ const PatchOption* PatchSelection::chosenOption(GroupId group) const {
         }
     }
     return nullptr;
+}
+
+void PatchSelection::setAddedValue(GroupId group, std::string_view name, bool value) {
+    std::string& chosen = chosenAdded_[Slot(group)];
+    if (value && !name.empty()) {
+        chosen = name;
+        chosen_[Slot(group)].reset();
+    } else if (chosen == name) {
+        chosen.clear();
+    }
+}
+
+bool PatchSelection::addedValue(GroupId group, std::string_view name) const {
+    return !name.empty() && chosenAdded_[Slot(group)] == name;
+}
+
+std::string_view PatchSelection::chosenAdded(GroupId group) const {
+    return chosenAdded_[Slot(group)];
 }
 
 }  // namespace kickvane::catalog

@@ -2,6 +2,8 @@
 
 #include <array>
 #include <optional>
+#include <string>
+#include <string_view>
 
 #include "catalog/catalog.h"
 
@@ -32,11 +34,20 @@ public:
     std::optional<int> chosen(GroupId group) const;
     const PatchOption* chosenOption(GroupId group) const;
 
+    // A variant the player added to the group, by its folder name. It takes part in the same
+    // rule: choosing it clears the group's catalog option and the other way round.
+    void setAddedValue(GroupId group, std::string_view name, bool value);
+    bool addedValue(GroupId group, std::string_view name) const;
+    // The chosen added variant's name; empty when the group's choice is none or a catalog option.
+    std::string_view chosenAdded(GroupId group) const;
+    bool hasChoice(GroupId group) const { return chosen(group) || !chosenAdded(group).empty(); }
+
     friend bool operator==(const PatchSelection&, const PatchSelection&) = default;
 
 private:
     std::array<int, kCategoryCount> switches_{};
     std::array<std::optional<int>, kGroupCount> chosen_{};
+    std::array<std::string, kGroupCount> chosenAdded_{};
 };
 
 }  // namespace kickvane::catalog

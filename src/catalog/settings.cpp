@@ -1,5 +1,6 @@
 #include "catalog/settings.h"
 
+#include <algorithm>
 #include <charconv>
 #include <cmath>
 #include <cstdlib>
@@ -71,7 +72,79 @@ std::optional<bool> ParseTruthValue(std::string_view text) {
     return std::nullopt;
 }
 
-Status LoadSettings(const std::filesystem::path& toolFolder, Settings& settings) {
+void ChooseGroupDefault(PatchSelection& selection, GroupId id) {
+    const VariantGroup& group = Group(id);
+    for (const PatchOption& option : group.options) {
+        if (option.isDefault) {
+            selection.setOptionValue(group.array, option.index, true);
+        }
+    }
+}
+
+namespace {
+
+bool IsCatalogKey(std::string_view section, std::string_view key) {
+    for (const VariantGroup& group : Groups()) {
+        for (const PatchOption& option : group.options) {
+            if (group.section == section && EqualsIgnoringCase(option.key, key)) {
+                return true;
+            }
+        }
+    }
+    return false;
+}
+
+bool IsAddedKey(const AddedVariants& added, std::string_view section, std::string_view key) {
+    for (const VariantGroup& group : Groups()) {
+        if (group.section != section) {
+            continue;
+        }
+        for (const AddedVariant& variant : added.Of(group.id)) {
+            if (EqualsIgnoringCase(variant.name, key)) {
+                return true;
+            }
+        }
+    }
+    return false;
+}
+
+// The groups that the load left without a choice while their section says "True" for a variant
+// that is neither the catalog's nor among `added`: that variant's folder is gone. Such a group
+// falls back to its default. A section shared by several groups cannot tell whose the key was;
+// each group without a choice takes the next such key.
+void FallBackFromGoneVariants(const IniDocument& file, const AddedVariants& added,
+                              PatchSelection& selection, std::vector<GoneChoice>* gone) {
+    std::vector<std::string_view> sections;
+    for (const VariantGroup& group : Groups()) {
+        if (std::find(sections.begin(), sections.end(), group.section) == sections.end()) {
+            sections.push_back(group.section);
+        }
+    }
+    for (std::string_view section : sections) {
+        std::vector<std::string> goneTrue;
+        for (const auto& [key, value] : file.Entries(section)) {
+            if (!IsCatalogKey(section, key) && !IsAddedKey(added, section, key) &&
+                ParseTruthValue(value).value_or(false)) {
+                goneTrue.push_back(key);
+            }
+        }
+        size_t next = 0;
+        for (const VariantGroup& group : Groups()) {
+            if (group.section != section || goneTrue.empty() || selection.hasChoice(group.id)) {
+                continue;
+            }
+            ChooseGroupDefault(selection, group.id);
+            if (gone) {
+                gone->push_back({group.id, goneTrue[std::min(next++, goneTrue.size() - 1)]});
+            }
+        }
+    }
+}
+
+}  // namespace
+
+Status LoadSettings(const std::filesystem::path& toolFolder, Settings& settings,
+                    const AddedVariants& added, std::vector<GoneChoice>* gone) {
     IniDocument file;
     Status status = IniDocument::Read(SettingsFile(toolFolder), &file);
     settings.gameFolder = ValueOr(file, kMainSection, kFolderKey, kDefaultGameFolder);
@@ -93,16 +166,26 @@ Status LoadSettings(const std::filesystem::path& toolFolder, Settings& settings)
             }
         }
     }
+    // The player's own variants come after the catalog's, so a "True" of theirs wins.
+    for (const VariantGroup& group : Groups()) {
+        for (const AddedVariant& variant : added.Of(group.id)) {
+            if (auto value = ParseTruthValue(ValueOr(file, group.section, variant.name, "False"))) {
+                settings.selection.setAddedValue(group.id, variant.name, *value);
+            }
+        }
+    }
+    FallBackFromGoneVariants(file, added, settings.selection, gone);
     return status;
 }
 
-LoadedSettings LoadSettings(const std::filesystem::path& toolFolder) {
+LoadedSettings LoadSettings(const std::filesystem::path& toolFolder, const AddedVariants& added) {
     LoadedSettings loaded;
-    loaded.status = LoadSettings(toolFolder, loaded.settings);
+    loaded.status = LoadSettings(toolFolder, loaded.settings, added, &loaded.gone);
     return loaded;
 }
 
-Status SaveSettings(const std::filesystem::path& toolFolder, const Settings& settings) {
+Status SaveSettings(const std::filesystem::path& toolFolder, const Settings& settings,
+                    const AddedVariants& added) {
     IniDocument file;
     Status status = Status::Ok();
     auto set = [&](std::string_view section, std::string_view key, std::string_view value) {
@@ -120,6 +203,12 @@ Status SaveSettings(const std::filesystem::path& toolFolder, const Settings& set
         for (const PatchOption& option : group.options) {
             set(group.section, option.key,
                 settings.selection.optionValue(group.array, option.index) ? "True" : "False");
+        }
+    }
+    for (const VariantGroup& group : Groups()) {
+        for (const AddedVariant& variant : added.Of(group.id)) {
+            set(group.section, variant.name,
+                settings.selection.addedValue(group.id, variant.name) ? "True" : "False");
         }
     }
     if (!status) {

@@ -1,7 +1,10 @@
 #include "engine/plan.h"
 
 #include <array>
+#include <optional>
 #include <string_view>
+
+#include "catalog/added_variants.h"
 
 namespace kickvane::engine {
 
@@ -78,33 +81,49 @@ constexpr std::array<std::string_view, 8> kInterfaceFolders{
     "\\gui\\hud\\RefAdvantage", "\\gui\\hud\\watermark",     "\\gui\\loading", "\\gui\\font",
 };
 
-// Each function below adds one group's steps for its chosen option: the option's set from the
-// extras folder, or the base set when the option has none.
+// The set of a group's chosen variant below the extras folder: an added variant's folder or a
+// catalog option's set, the empty text for the option that restores the base set, and nullopt
+// when the group has no chosen variant. Every variant of a group, added or not, is applied by the
+// same steps from its set.
+using ChosenSet = std::optional<std::string>;
 
-void AddBall(PlanBuilder& plan, const catalog::PatchOption* chosen) {
+ChosenSet SetOf(const PatchSelection& selection, GroupId group) {
+    if (const std::string_view added = selection.chosenAdded(group); !added.empty()) {
+        return catalog::AddedVariant{group, std::string(added)}.SourceFolder();
+    }
+    if (const catalog::PatchOption* option = selection.chosenOption(group)) {
+        return std::string(option->sourceFolder);
+    }
+    return std::nullopt;
+}
+
+// Each function below adds one group's steps for its chosen variant: the variant's set from the
+// extras folder, or the base set when the variant has none.
+
+void AddBall(PlanBuilder& plan, const ChosenSet& chosen) {
     if (!chosen) {
         return;
     }
-    if (chosen->sourceFolder.empty()) {
+    if (chosen->empty()) {
         plan.Mirror(Root::ToolData, Root::Data, "\\ball");
         plan.Mirror(Root::ToolZData, Root::ZData, "\\ball");
     } else {
-        plan.Merge(Root::Extras, chosen->sourceFolder, Root::ZData, "\\ball");
+        plan.Merge(Root::Extras, *chosen, Root::ZData, "\\ball");
     }
 }
 
-void AddPitch(PlanBuilder& plan, const catalog::PatchOption* chosen) {
+void AddPitch(PlanBuilder& plan, const ChosenSet& chosen) {
     if (!chosen) {
         return;
     }
-    if (chosen->sourceFolder.empty()) {
+    if (chosen->empty()) {
         plan.Mirror(Root::ToolData, Root::Data, "\\pitch");
         plan.Mirror(Root::ToolZData, Root::ZData, "\\pitch");
         return;
     }
     // A variant's own grass, then the shared textures, then the base set's dirt and pitch lines
     // over whatever the variant brought, and the second tree's pitch reset to the base set.
-    plan.Merge(Root::Extras, chosen->sourceFolder, Root::Data, "\\pitch\\textures");
+    plan.Merge(Root::Extras, *chosen, Root::Data, "\\pitch\\textures");
     plan.Merge(Root::Extras, "\\pitch\\_textures", Root::Data, "\\pitch\\textures");
     plan.File(Root::ToolData, "\\pitch\\textures\\grass_dirt.dds", Root::Data, "\\pitch\\textures");
     plan.File(Root::ToolData, "\\pitch\\textures\\grass_pitchlines.dds", Root::Data,
@@ -112,38 +131,37 @@ void AddPitch(PlanBuilder& plan, const catalog::PatchOption* chosen) {
     plan.Mirror(Root::ToolZData, Root::ZData, "\\pitch");
 }
 
-void AddAdboard(PlanBuilder& plan, const catalog::PatchOption* chosen) {
-    if (chosen && chosen->sourceFolder.empty()) {
+void AddAdboard(PlanBuilder& plan, const ChosenSet& chosen) {
+    if (chosen && chosen->empty()) {
         // The default restores only the main tree's adboards.
         plan.Mirror(Root::ToolData, Root::Data, "\\adboard");
     } else if (chosen) {
-        plan.Merge(Root::Extras, chosen->sourceFolder, Root::ZData, "\\adboard");
+        plan.Merge(Root::Extras, *chosen, Root::ZData, "\\adboard");
     }
     plan.Mirror(Root::ToolData, Root::Data, "\\ingame_ad");
 }
 
-void AddScoreboard(PlanBuilder& plan, const catalog::PatchOption* chosen) {
+void AddScoreboard(PlanBuilder& plan, const ChosenSet& chosen) {
     if (!chosen) {
         return;
     }
-    if (chosen->sourceFolder.empty()) {
+    if (chosen->empty()) {
         plan.Mirror(Root::ToolData, Root::Data, "\\gui\\hud\\scoreboard");
         plan.Mirror(Root::ToolData, Root::Data, "\\gui\\hud\\namebar");
         return;
     }
-    const std::string set(chosen->sourceFolder);
-    plan.Merge(Root::Extras, set + "\\scoreboard", Root::Data, "\\gui\\hud\\scoreboard");
-    plan.Merge(Root::Extras, set + "\\namebar", Root::Data, "\\gui\\hud\\namebar");
+    plan.Merge(Root::Extras, *chosen + "\\scoreboard", Root::Data, "\\gui\\hud\\scoreboard");
+    plan.Merge(Root::Extras, *chosen + "\\namebar", Root::Data, "\\gui\\hud\\namebar");
 }
 
-void AddMark(PlanBuilder& plan, const catalog::PatchOption* chosen) {
+void AddMark(PlanBuilder& plan, const ChosenSet& chosen) {
     if (!chosen) {
         return;
     }
-    if (chosen->sourceFolder.empty()) {
+    if (chosen->empty()) {
         plan.Mirror(Root::ToolData, Root::Data, "\\gui\\hud\\Indicator");
     } else {
-        plan.Merge(Root::Extras, chosen->sourceFolder, Root::Data, "\\gui\\hud\\Indicator");
+        plan.Merge(Root::Extras, *chosen, Root::Data, "\\gui\\hud\\Indicator");
     }
 }
 
@@ -159,13 +177,13 @@ std::vector<PlanStep> BuildPlan(const PatchSelection& selection) {
         plan.Category(category);
         switch (category) {
             case kBall:
-                AddBall(plan, selection.chosenOption(GroupId::Ball));
+                AddBall(plan, SetOf(selection, GroupId::Ball));
                 break;
             case kPitch:
-                AddPitch(plan, selection.chosenOption(GroupId::Pitch));
+                AddPitch(plan, SetOf(selection, GroupId::Pitch));
                 break;
             case kAdboard:
-                AddAdboard(plan, selection.chosenOption(GroupId::Adboard));
+                AddAdboard(plan, SetOf(selection, GroupId::Adboard));
                 break;
             case kInterface:
                 for (std::string_view folder : kInterfaceFolders) {
@@ -197,10 +215,10 @@ std::vector<PlanStep> BuildPlan(const PatchSelection& selection) {
                 plan.Mirror(Root::ToolData, Root::Data, "\\net\\textures");
                 break;
             case kScoreboard:
-                AddScoreboard(plan, selection.chosenOption(GroupId::Scoreboard));
+                AddScoreboard(plan, SetOf(selection, GroupId::Scoreboard));
                 break;
             case kMark:
-                AddMark(plan, selection.chosenOption(GroupId::Mark));
+                AddMark(plan, SetOf(selection, GroupId::Mark));
                 break;
             case kCrowd:
                 plan.Mirror(Root::ToolZData, Root::ZData, "\\crowd\\textures");

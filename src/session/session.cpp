@@ -3,6 +3,7 @@
 #include "catalog/catalog.h"
 #include "platform/filesystem.h"
 #include "platform/text.h"
+#include "text/utf.h"
 
 namespace kickvane::session {
 
@@ -16,7 +17,76 @@ text::Message Notice(std::string text) {
     return {text::Message::Kind::Notice, std::move(text), std::string(kNoticeTitle)};
 }
 
+// Where a group's added variant lies, for people: "extras\Ball\Foo".
+std::string AddedFolder(catalog::GroupId group, std::string_view name) {
+    return "extras\\" + std::string(catalog::GroupFolder(group)) + "\\" + std::string(name);
+}
+
+std::string DefaultLabel(catalog::GroupId group) {
+    for (const catalog::PatchOption& option : catalog::Group(group).options) {
+        if (option.isDefault) {
+            return std::string(option.label);
+        }
+    }
+    return {};
+}
+
+text::Message GoneNotice(const std::vector<catalog::GoneChoice>& gone) {
+    std::string text = "Không còn thư mục của bộ đã chọn, đã chọn lại mặc định:";
+    for (const catalog::GoneChoice& choice : gone) {
+        text +=
+            "\n• " + AddedFolder(choice.group, choice.name) + " → " + DefaultLabel(choice.group);
+    }
+    return Notice(std::move(text));
+}
+
 }  // namespace
+
+std::string_view SkipReasonText(catalog::SkipReason reason) {
+    switch (reason) {
+        case catalog::SkipReason::Underscore:
+            return "tên bắt đầu bằng _";
+        case catalog::SkipReason::NotAFolder:
+            return "không phải thư mục";
+        case catalog::SkipReason::Empty:
+            return "thư mục trống";
+        case catalog::SkipReason::Unreadable:
+            return "không đọc được";
+        case catalog::SkipReason::NotText:
+            return "tên không đọc được";
+        case catalog::SkipReason::NotAKey:
+            return "tên có ký tự không dùng được";
+        case catalog::SkipReason::CatalogKey:
+            return "trùng tên một mục có sẵn";
+        case catalog::SkipReason::CaseTwin:
+            return "trùng tên, chỉ khác chữ hoa chữ thường";
+        case catalog::SkipReason::TakenInSection:
+            break;
+    }
+    return "trùng tên một bộ ở nhóm khác";
+}
+
+std::string SkippedLine(const catalog::AddedVariants& added, catalog::GroupId group) {
+    std::string line;
+    if (added.folderState(group) == catalog::GroupFolderState::Unreadable) {
+        line =
+            "Không đọc được hết thư mục extras\\" + std::string(catalog::GroupFolder(group)) + ".";
+    }
+    const auto skipped = added.Skipped(group);
+    if (skipped.empty()) {
+        return line;
+    }
+    line += line.empty() ? "Bỏ qua: " : " Bỏ qua: ";
+    for (size_t i = 0; i < skipped.size(); ++i) {
+        if (i > 0) {
+            line += "; ";
+        }
+        const std::string& name = skipped[i].name;
+        line += text::IsValidUtf8(name) ? name : text::LegacyTextToUtf8(name);
+        line += " (" + std::string(SkipReasonText(skipped[i].reason)) + ")";
+    }
+    return line;
+}
 
 std::string FailureAlertText(size_t failures) {
     return "Đã chép, " + std::to_string(failures) + " bước lỗi: bấm để xem";
@@ -77,11 +147,13 @@ std::string FailedStepLine(const engine::StepOutcome& step, const text::ShownFol
 Session::Session(std::filesystem::path toolFolder, std::unique_ptr<platform::KeySampler> keys,
                  Launcher launch)
     : toolFolder_(std::move(toolFolder)),
+      added_(catalog::AddedVariants::List(toolFolder_)),
       keys_(std::move(keys)),
       poll_(keys_.get()),
       launch_(std::move(launch)) {
-    catalog::LoadedSettings loaded = catalog::LoadSettings(toolFolder_);
+    catalog::LoadedSettings loaded = catalog::LoadSettings(toolFolder_, added_);
     settings_ = std::move(loaded.settings);
+    gone_ = std::move(loaded.gone);
     settingsRead_ = std::move(loaded.status);
     hotkeyValid_ = poll_.SetHotkey(settings_.hotkey);
 }
@@ -92,6 +164,38 @@ void Session::setCategoryOn(int switchIndex, bool on) {
 
 void Session::chooseOption(catalog::OptionArray array, int index) {
     settings_.selection.setOptionValue(array, index, true);
+}
+
+void Session::ChooseAdded(catalog::GroupId group, std::string_view name) {
+    if (added_.Find(group, name)) {
+        settings_.selection.setAddedValue(group, name, true);
+    }
+}
+
+Outcome Session::RefreshAddedVariants() {
+    added_ = catalog::AddedVariants::List(toolFolder_);
+    std::vector<catalog::GoneChoice> gone;
+    for (const catalog::VariantGroup& group : catalog::Groups()) {
+        const std::string chosen(settings_.selection.chosenAdded(group.id));
+        if (!chosen.empty() && !added_.Find(group.id, chosen)) {
+            catalog::ChooseGroupDefault(settings_.selection, group.id);
+            gone.push_back({group.id, chosen});
+        }
+    }
+    Outcome shown;
+    if (!gone.empty()) {
+        shown.messages.push_back(GoneNotice(gone));
+    }
+    return shown;
+}
+
+std::optional<text::Message> Session::TakeGoneNotice() {
+    if (gone_.empty()) {
+        return std::nullopt;
+    }
+    text::Message notice = GoneNotice(gone_);
+    gone_.clear();
+    return notice;
 }
 
 void Session::setHotkeyText(std::string text) {
@@ -183,7 +287,7 @@ std::vector<engine::PlanStep> Session::Plan() const {
 
 Outcome Session::Save() {
     Outcome shown;
-    if (const Status saved = catalog::SaveSettings(toolFolder_, settings_); !saved) {
+    if (const Status saved = catalog::SaveSettings(toolFolder_, settings_, added_); !saved) {
         shown.messages.push_back(
             {text::Message::Kind::Warning,
              "Không lưu được thiết lập!\n" +

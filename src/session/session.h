@@ -8,6 +8,7 @@
 #include <string_view>
 #include <vector>
 
+#include "catalog/added_variants.h"
 #include "catalog/settings.h"
 #include "engine/apply.h"
 #include "engine/hotkey_poll.h"
@@ -105,6 +106,18 @@ public:
     // Chooses a variant; the others of its group are cleared.
     void chooseOption(catalog::OptionArray array, int index);
 
+    // The variants the player added to the groups' folders, as listed at start or last refresh.
+    const catalog::AddedVariants& addedVariants() const { return added_; }
+    // Chooses an added variant of the group; a name that is not listed changes nothing.
+    void ChooseAdded(catalog::GroupId group, std::string_view name);
+    // Lists the groups' folders again (the window calls it when it comes back from the tray).
+    // A chosen added variant whose folder went away gives way to its group's default, and the
+    // outcome says so.
+    Outcome RefreshAddedVariants();
+    // Once: which chosen added variants were gone when the settings were loaded, and that their
+    // groups took their defaults. Empty afterwards, and when none was gone.
+    std::optional<text::Message> TakeGoneNotice();
+
     // Takes the hotkey text as typed; it is saved as it stands. A text that names no key keeps
     // the key in use as it was; hotkeyValid() says so.
     void setHotkeyText(std::string text);
@@ -134,6 +147,8 @@ public:
 
 private:
     std::filesystem::path toolFolder_;
+    catalog::AddedVariants added_;
+    std::vector<catalog::GoneChoice> gone_;
     catalog::Settings settings_;
     Status settingsRead_ = Status::Ok();
     std::unique_ptr<platform::KeySampler> keys_;
@@ -143,6 +158,12 @@ private:
     std::filesystem::path quickLoadFolder_;
     UpdateState updates_;
 };
+
+// The line under a group that names the folders of its added variants that were passed over and
+// why ("Bỏ qua: Foo (thư mục trống)"); empty when there are none.
+std::string SkippedLine(const catalog::AddedVariants& added, catalog::GroupId group);
+// Why a folder was passed over, in a few words: "thư mục trống".
+std::string_view SkipReasonText(catalog::SkipReason reason);
 
 // What a step does, for people: "chép thư mục extras\Ball\UCL 2011 vào zdata\data2\ball". Tool
 // folders start with "data" or "extras", the game's with "data2" or "zdata".

@@ -1,6 +1,7 @@
 #include "shell/catalog_panels.h"
 
 #include <QLabel>
+#include <QScrollBar>
 
 #include "platform/text.h"
 #include "shell/game_finder.h"
@@ -46,9 +47,24 @@ QRadioButton* MakeOptionButton(QWidget* parent, const QRect& geometry) {
     return button;
 }
 
+// Keeps a widget's own background off, so the panel's picture shows through.
+void SeeThrough(QWidget* widget) {
+    widget->setAutoFillBackground(false);
+}
+
+// The tab panels' rows: a button and a label per variant, 36 pixels apart; the framed groups of
+// the fourth panel are tighter.
+constexpr int kPanelRowsTop = 36;
+constexpr int kFrameRowsTop = 22;
+constexpr int kSkippedLineHeight = 16;
+
 }  // namespace
 
-CatalogPanels::CatalogPanels(QWidget* window) : QObject(window), window_(window) {
+CatalogPanels::CatalogPanels(QWidget* window)
+    : QObject(window),
+      window_(window),
+      entryColour_(kEntryBackground),
+      labelColour_(kLabelBackground) {
     for (int i = 0; i < kTabCount; ++i) {
         auto* tab = new TabHead(kTabCaptions[static_cast<size_t>(i)], window);
         tab->setGeometry(kTabLeft, kTabTops[static_cast<size_t>(i)], 90, 32);
@@ -62,9 +78,9 @@ CatalogPanels::CatalogPanels(QWidget* window) : QObject(window), window_(window)
     tabHeight_ = tabs_[0]->height();
     buildCategoryPanel(panels_[0]);
     MakeHeading(QStringLiteral("Chọn quả bóng:"), panels_[1], {12, 10});
-    buildGroupPanel(panels_[1], GroupId::Ball, 40);
+    buildGroupPanel(panels_[1], GroupId::Ball, kPanelRowsTop + 4);
     MakeHeading(QStringLiteral("Chọn bảng tỉ số:"), panels_[2], {12, 10});
-    buildGroupPanel(panels_[2], GroupId::Scoreboard, 40);
+    buildGroupPanel(panels_[2], GroupId::Scoreboard, kPanelRowsTop + 4);
     buildVariantFrames(panels_[3]);
 }
 
@@ -117,12 +133,63 @@ void CatalogPanels::addOption(const catalog::VariantGroup& group,
 
 void CatalogPanels::buildGroupPanel(QWidget* panel, GroupId id, int top) {
     const catalog::VariantGroup& group = catalog::Group(id);
-    int row = 0;
+    const QRect room(0, top - 4, panel->width(), panel->height() - (top - 4));
+    GroupView& view = makeGroupView(id, panel, room, {20, 2, 20, 44, 0, 250, 24, 36});
     for (const catalog::PatchOption& option : group.options) {
-        const int y = top + row++ * 36;
-        addOption(group, option, MakeOptionButton(panel, QRect(20, y + 2, 20, 20)),
-                  MakeLabel(option.label, panel, QRect(44, y, 250, 24)));
+        const int row = view.catalogRows++;
+        addOption(group, option, MakeOptionButton(view.rows, rowButton(view, row)),
+                  MakeLabel(option.label, view.rows, rowLabel(view, row)));
     }
+    fitRows(view);
+}
+
+CatalogPanels::GroupView& CatalogPanels::makeGroupView(GroupId id, QWidget* parent,
+                                                       const QRect& room, const RowLook& look) {
+    GroupView& view = groupViews_[static_cast<size_t>(id)];
+    view.room = room;
+    view.look = look;
+    view.area = new QScrollArea(parent);
+    view.area->setGeometry(room);
+    view.area->setFrameShape(QFrame::NoFrame);
+    view.area->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
+    view.area->setVerticalScrollBarPolicy(Qt::ScrollBarAsNeeded);
+    view.area->setFocusPolicy(Qt::NoFocus);
+    SeeThrough(view.area);
+    SeeThrough(view.area->viewport());
+    view.rows = new QWidget;
+    view.area->setWidget(view.rows);
+    SeeThrough(view.rows);  // after setWidget, which turns the filling on
+    view.skipped = new QLabel(parent);
+    view.skipped->setTextFormat(Qt::PlainText);
+    view.skipped->setGeometry(room.left() + 8, room.bottom() + 1 - kSkippedLineHeight,
+                              room.width() - 16, kSkippedLineHeight);
+    view.skipped->hide();
+    return view;
+}
+
+QRect CatalogPanels::rowButton(const GroupView& view, int row) const {
+    const RowLook& l = view.look;
+    return QRect(l.buttonX, 4 + row * l.step + l.buttonY, l.buttonSize, l.buttonSize);
+}
+
+QRect CatalogPanels::rowLabel(const GroupView& view, int row) const {
+    const RowLook& l = view.look;
+    return QRect(l.labelX, 4 + row * l.step + l.labelY, l.labelWidth, l.labelHeight);
+}
+
+void CatalogPanels::fitRows(GroupView& view) {
+    QRect room = view.room;
+    if (!view.skipped->text().isEmpty()) {
+        room.setBottom(room.bottom() - kSkippedLineHeight);
+    }
+    view.area->setGeometry(room);
+    const int rows = view.catalogRows + static_cast<int>(view.added.size());
+    const int height = 4 + (rows - 1) * view.look.step +
+                       std::max(view.look.labelY + view.look.labelHeight,
+                                view.look.buttonY + view.look.buttonSize) +
+                       4;
+    // The rows keep their width; the scroll bar, when needed, lies over the right margin.
+    view.rows->resize(room.width() - view.area->verticalScrollBar()->sizeHint().width(), height);
 }
 
 void CatalogPanels::buildVariantFrames(QWidget* panel) {
@@ -143,12 +210,14 @@ void CatalogPanels::buildVariantFrames(QWidget* panel) {
         groupFrames_[f] = frame;
         MakeHeading(frames[f].caption, frame, {8, 4});
         const catalog::VariantGroup& group = catalog::Group(frames[f].group);
-        int row = 0;
+        const QRect room(0, kFrameRowsTop, frame->width(), frame->height() - kFrameRowsTop);
+        GroupView& view = makeGroupView(group.id, frame, room, {10, 0, 18, 32, -1, 200, 19, 20});
         for (const catalog::PatchOption& option : group.options) {
-            const int y = 26 + row++ * 20;
-            addOption(group, option, MakeOptionButton(frame, QRect(10, y, 18, 18)),
-                      MakeLabel(option.label, frame, QRect(32, y - 1, 200, 19)));
+            const int row = view.catalogRows++;
+            addOption(group, option, MakeOptionButton(view.rows, rowButton(view, row)),
+                      MakeLabel(option.label, view.rows, rowLabel(view, row)));
         }
+        fitRows(view);
     }
 }
 
@@ -216,6 +285,14 @@ void CatalogPanels::recolour(const SkinLook& look) {
     for (PictureBox* frame : groupFrames_) {
         frame->setBackground(look.entryBackground);
     }
+    entryColour_ = look.entryBackground;
+    labelColour_ = look.labelBackground;
+    labelTextColour_ = look.labelText;
+    for (const GroupView& view : groupViews_) {
+        for (const AddedWidgets& added : view.added) {
+            paintAdded(added);
+        }
+    }
     // Headings on the panels and in the frames follow the labels' text colour, so they stay
     // readable on the dark pictures of skin 2.
     for (PictureBox* panel : panels_) {
@@ -242,6 +319,93 @@ void CatalogPanels::showSelection(const catalog::PatchSelection& selection) {
     for (const OptionWidgets& option : options_) {
         option.button->setChecked(selection.optionValue(option.array, option.index));
     }
+    for (const catalog::VariantGroup& group : catalog::Groups()) {
+        for (const AddedWidgets& added : groupViews_[static_cast<size_t>(group.id)].added) {
+            added.button->setChecked(selection.addedValue(group.id, added.name));
+        }
+    }
+}
+
+void CatalogPanels::paintAdded(const AddedWidgets& widgets) const {
+    Paint(widgets.button, entryColour_);
+    Paint(widgets.label, labelColour_, labelTextColour_);
+}
+
+void CatalogPanels::showAddedVariants(
+    const catalog::AddedVariants& added,
+    const std::array<QString, catalog::kGroupCount>& skippedLines) {
+    for (const catalog::VariantGroup& group : catalog::Groups()) {
+        GroupView& view = groupViews_[static_cast<size_t>(group.id)];
+        for (const AddedWidgets& old : view.added) {
+            delete old.button;
+            delete old.label;
+        }
+        view.added.clear();
+        const GroupId id = group.id;
+        int row = view.catalogRows;
+        // The keyboard reaches the added sets right after the group's last catalog option.
+        const OptionWidgets* lastListed = findOption(group.array, group.options.back().index);
+        QWidget* previous = lastListed ? lastListed->label : nullptr;
+        for (const catalog::AddedVariant& variant : added.Of(id)) {
+            // The folder's name is outside text: shown as it is, never read as markup.
+            auto* label = MakeLabel(variant.name, view.rows, rowLabel(view, row));
+            label->setTextFormat(Qt::PlainText);
+            label->setToolTip(label->text());
+            auto* button = MakeOptionButton(view.rows, rowButton(view, row));
+            button->setAccessibleName(label->text());
+            const std::string name = variant.name;
+            connect(button, &QRadioButton::clicked, this,
+                    [this, id, name] { emit addedChosen(id, name); });
+            connect(label, &ClickableLabel::clicked, this,
+                    [this, id, name] { emit addedLabelClicked(id, name); });
+            connect(label, &ClickableLabel::hovered, this,
+                    [this, id, name] { emit addedLabelHovered(id, name); });
+            view.added.push_back({name, button, label});
+            paintAdded(view.added.back());
+            button->show();
+            label->show();
+            if (previous) {
+                QWidget::setTabOrder(previous, button);
+                QWidget::setTabOrder(button, label);
+            }
+            previous = label;
+            ++row;
+        }
+        const QString& line = skippedLines[static_cast<size_t>(id)];
+        const QFontMetrics metrics(view.skipped->font());
+        view.skipped->setText(
+            line.isEmpty() ? QString()
+                           : metrics.elidedText(line, Qt::ElideRight, view.skipped->width()));
+        view.skipped->setToolTip(line);
+        view.skipped->setVisible(!line.isEmpty());
+        fitRows(view);
+    }
+}
+
+QRadioButton* CatalogPanels::addedButton(GroupId group, const QString& name) const {
+    for (const AddedWidgets& added : groupViews_[static_cast<size_t>(group)].added) {
+        if (ToQString(added.name) == name) {
+            return added.button;
+        }
+    }
+    return nullptr;
+}
+
+ClickableLabel* CatalogPanels::addedLabel(GroupId group, const QString& name) const {
+    for (const AddedWidgets& added : groupViews_[static_cast<size_t>(group)].added) {
+        if (ToQString(added.name) == name) {
+            return added.label;
+        }
+    }
+    return nullptr;
+}
+
+QLabel* CatalogPanels::skippedLine(GroupId group) const {
+    return groupViews_[static_cast<size_t>(group)].skipped;
+}
+
+QScrollArea* CatalogPanels::groupArea(GroupId group) const {
+    return groupViews_[static_cast<size_t>(group)].area;
 }
 
 void CatalogPanels::showGameFolder(const QString& folder) {

@@ -88,6 +88,10 @@ MainWindow::MainWindow(session::Session& session, ShellServices services, QWidge
         QTimer::singleShot(
             0, this, [this, message = std::move(*problem)] { outcomes_.ShowMessage(message); });
     }
+    if (std::optional<text::Message> gone = session_.TakeGoneNotice()) {
+        QTimer::singleShot(0, this,
+                           [this, message = std::move(*gone)] { outcomes_.ShowMessage(message); });
+    }
 }
 
 MainWindow::~MainWindow() = default;
@@ -104,6 +108,22 @@ void MainWindow::connectPanels() {
                 // Clicking an option button always chooses it; its group's others clear.
                 session_.chooseOption(array, index);
                 panels_->showSelection(session_.selection());
+            });
+    connect(panels_, &CatalogPanels::addedChosen, this,
+            [this](catalog::GroupId group, const std::string& name) {
+                session_.ChooseAdded(group, name);
+                panels_->showSelection(session_.selection());
+            });
+    connect(panels_, &CatalogPanels::addedLabelClicked, this,
+            [this](catalog::GroupId group, const std::string& name) {
+                sideWindows_.showAddedPreview(group, name);
+            });
+    // While the preview is open, pointing at an added set shows its picture there.
+    connect(panels_, &CatalogPanels::addedLabelHovered, this,
+            [this](catalog::GroupId group, const std::string& name) {
+                if (sideWindows_.preview() && sideWindows_.preview()->isVisible()) {
+                    sideWindows_.showAddedPreview(group, name);
+                }
             });
     connect(
         panels_, &CatalogPanels::labelClicked, this,
@@ -145,8 +165,18 @@ void MainWindow::connectTray() {
 
 void MainWindow::showSession() {
     panels_->showGameFolder(ToQString(session_.settings().gameFolder));
+    showAddedVariants();
     panels_->showSelection(session_.selection());
     showHotkey();
+}
+
+void MainWindow::showAddedVariants() {
+    std::array<QString, catalog::kGroupCount> skipped;
+    for (const catalog::VariantGroup& group : catalog::Groups()) {
+        skipped[static_cast<size_t>(group.id)] =
+            ToQString(session::SkippedLine(session_.addedVariants(), group.id));
+    }
+    panels_->showAddedVariants(session_.addedVariants(), skipped);
 }
 
 void MainWindow::showHotkey() {
@@ -311,6 +341,11 @@ void MainWindow::showFromTray() {
     raise();
     activateWindow();
     startFade(255, 15);
+    // Sets dropped into the groups' folders while the window was away show up now.
+    const session::Outcome refreshed = session_.RefreshAddedVariants();
+    showAddedVariants();
+    panels_->showSelection(session_.selection());
+    outcomes_.Show(refreshed);
 }
 
 void MainWindow::exitFromTray() {

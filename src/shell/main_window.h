@@ -100,6 +100,7 @@ private:
     bool hideToTray();
     // hideToTray, then says what happened: `popup` when hidden, the lack of a tray otherwise.
     void hideAndSay(const session::Popup& popup);
+    void showAddedVariants();
 
     session::Session& session_;
     ShellServices services_;

@@ -1,5 +1,7 @@
 #include "shell/side_window_set.h"
 
+#include "shell/qt_text.h"
+
 namespace kickvane::shell {
 
 void SideWindowSet::show(QPointer<QWidget>& window, QWidget* (*create)(QWidget*)) {
@@ -15,12 +17,29 @@ void SideWindowSet::showPreview(catalog::LabelArray labels, int index) {
     if (picture.empty()) {
         return;
     }
+    shownPreview().ShowPicture(picture);
+}
+
+void SideWindowSet::showAddedPreview(catalog::GroupId group, std::string_view name) {
+    const std::filesystem::path picture = AddedPreviewPicture(toolFolder_, group, name);
+    PreviewWindow& window = shownPreview();
+    if (picture.empty()) {
+        window.ShowNoPicture();
+        return;
+    }
+    window.ShowPicture(picture);
+    if (window.pictureFile() != PathToQString(picture)) {
+        window.ShowNoPicture();  // there but unreadable: never another entry's picture
+    }
+}
+
+PreviewWindow& SideWindowSet::shownPreview() {
     if (!preview_) {
         preview_ = new PreviewWindow(owner_);
     }
     preview_->show();
     preview_->raise();
-    preview_->ShowPicture(picture);
+    return *preview_;
 }
 
 }  // namespace kickvane::shell

@@ -19,11 +19,14 @@ public:
     void showHelp() { show(help_, CreateHelpWindow); }
     // Shows the label's preview picture; a label without one changes nothing.
     void showPreview(catalog::LabelArray labels, int index);
+    // Shows the preview of a variant the player added, or the note that it has none.
+    void showAddedPreview(catalog::GroupId group, std::string_view name);
 
     PreviewWindow* preview() const { return preview_; }
 
 private:
     void show(QPointer<QWidget>& window, QWidget* (*create)(QWidget*));
+    PreviewWindow& shownPreview();
 
     QWidget* owner_;
     std::filesystem::path toolFolder_;

@@ -10,7 +10,9 @@
 #include <QVBoxLayout>
 #include <algorithm>
 
+#include "catalog/added_variants.h"
 #include "platform/filesystem.h"
+#include "shell/qt_text.h"
 
 namespace kickvane::shell {
 
@@ -127,15 +129,34 @@ void PreviewWindow::keyPressEvent(QKeyEvent* event) {
 
 void PreviewWindow::ShowPicture(const std::filesystem::path& file) {
     QPixmap pixmap;
-    const QString name = QString::fromStdString(file.string());
-    if (pixmap.load(name)) {
+    const QString name = PathToQString(file);
+    if (!file.empty() && pixmap.load(name)) {
         picture_->setScaledContents(true);
         picture_->setPixmap(pixmap);
         pictureFile_ = name;
     } else if (pictureFile_.isEmpty()) {
-        picture_->setScaledContents(false);
-        picture_->setText(QStringLiteral("Chưa có ảnh xem trước cho mục này."));
+        ShowNoPicture();
     }
+}
+
+void PreviewWindow::ShowNoPicture() {
+    picture_->setScaledContents(false);
+    picture_->setText(QStringLiteral("Chưa có ảnh xem trước cho mục này."));
+    pictureFile_.clear();
+}
+
+std::filesystem::path AddedPreviewPicture(const std::filesystem::path& toolFolder,
+                                          catalog::GroupId group, std::string_view name) {
+    const std::filesystem::path folder = platform::ResolveCaseInsensitive(
+        toolFolder / "extras" / platform::PathFromUtf8(catalog::GroupFolder(group)) /
+        platform::PathFromUtf8(name));
+    for (std::string_view file : {"preview.jpg", "preview.png"}) {
+        if (auto found = platform::FindEntryIgnoringCase(folder, file);
+            found && platform::IsRegularFile(*found)) {
+            return *found;
+        }
+    }
+    return {};
 }
 
 QWidget* CreateAboutWindow(QWidget* owner) {
@@ -172,6 +193,14 @@ QString HelpText() {
         QStringLiteral(
             "Lưu ý: Để sử dụng được các file sau khi đã nạp nhanh, thì lựa chọn Bóng phải "
             "để ở mặc định"),
+        QString(),
+        QStringLiteral("Thêm bộ đồ hoạ mới:"),
+        QStringLiteral(" 1. Trong thư mục extras của công cụ, mở thư mục của nhóm: Ball, "
+                       "scoreboard, adboard, pitch hoặc Indicator."),
+        QStringLiteral(" 2. Tạo một thư mục mang tên bộ mới, chép các file vào, sắp xếp giống "
+                       "các bộ có sẵn của nhóm đó."),
+        QStringLiteral(" 3. Nếu muốn, thêm ảnh xem trước preview.jpg hoặc preview.png."),
+        QStringLiteral(" 4. Mở lại công cụ, hoặc ẩn xuống khay rồi hiện lại."),
     }
         .join(QStringLiteral("\r\n"));
 }

@@ -3,6 +3,7 @@
 #include <QLabel>
 #include <QWidget>
 #include <filesystem>
+#include <string_view>
 
 #include "catalog/catalog.h"
 
@@ -15,6 +16,11 @@ namespace kickvane::shell {
 std::filesystem::path PreviewPicture(const std::filesystem::path& toolFolder,
                                      catalog::LabelArray labels, int index);
 
+// The preview picture of a variant the player added: "preview.jpg", else "preview.png", in its
+// folder (any letter case); empty when it has neither.
+std::filesystem::path AddedPreviewPicture(const std::filesystem::path& toolFolder,
+                                          catalog::GroupId group, std::string_view name);
+
 // "Xem truoc": one picture scaled to the window, which opens centred on the main window's
 // screen. A picture that cannot be loaded leaves the one shown before (or a short note when there
 // was none).
@@ -23,6 +29,8 @@ class PreviewWindow final : public QWidget {
 public:
     explicit PreviewWindow(QWidget* owner);
     void ShowPicture(const std::filesystem::path& file);
+    // The note that the entry has no preview picture, in place of any picture shown before.
+    void ShowNoPicture();
     const QString& pictureFile() const { return pictureFile_; }
 
 protected:

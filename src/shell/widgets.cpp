@@ -120,6 +120,11 @@ ClickableLabel::ClickableLabel(const QString& text, QWidget* parent) : QLabel(te
     setAccessibleDescription(QStringLiteral("Xem ảnh minh hoạ"));
 }
 
+void ClickableLabel::enterEvent(QEnterEvent* event) {
+    QLabel::enterEvent(event);
+    emit hovered();
+}
+
 void ClickableLabel::keyPressEvent(QKeyEvent* event) {
     if (focusCue_.KeyPressed(*this, *event)) {
         emit clicked();

@@ -37,12 +37,14 @@ public:
 
 signals:
     void clicked();
+    void hovered();  // the pointer came over the label
 
 protected:
     void mouseReleaseEvent(QMouseEvent* event) override;
     void keyPressEvent(QKeyEvent* event) override;
     void focusInEvent(QFocusEvent* event) override;
     void paintEvent(QPaintEvent* event) override;
+    void enterEvent(QEnterEvent* event) override;
 
 private:
     FocusCue focusCue_;

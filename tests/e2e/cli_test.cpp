@@ -74,6 +74,37 @@ TEST_F(CliTest, PlanListsTheStepsAndApplyExitsZeroOneOrTwo) {
     EXPECT_NE(noBase.err.find("Thu muc nguon: Khong tim thay: "), std::string::npos);
 }
 
+// "list" shows every category and group, the chosen variants, the added ones and the skipped
+// folders; "plan" runs an added scoreboard by the steps of the catalog's scoreboards.
+TEST_F(CliTest, ListMarksChosenAndAddedVariantsAndNamesSkippedFolders) {
+    MakeToolFolder(tool());
+    MakeGameFolder(game());
+    WriteFile(tool() / "extras/scoreboard/Đài 1/scoreboard/sb.dds", "x");
+    WriteFile(tool() / "extras/scoreboard/a=b/sb.dds", "x");
+    WriteFile(tool() / "ThietLap.ini", "[Thiet lap]\r\nDuongDan=" + game().string() +
+                                           "\r\n[Bang Ti So]\r\nMacDinh=False\r\nĐài 1=True\r\n");
+    const Result list = Kickvane("list --tool-folder " + Quote(tool()));
+    EXPECT_EQ(list.exitCode, 0) << list.err;
+    EXPECT_NE(list.out.find("Bong [bật] Thay đổi bóng\n  ( ) MacDinh: Mặc định\n"
+                            "  (*) Europa League 2011: Europa League 2011\n"),
+              std::string::npos)
+        << list.out;
+    EXPECT_NE(list.out.find("  ( ) SSUCLRed: Supa Strikas UCL Red\n  (*) Đài 1 [đã thêm]\n"
+                            "  bỏ qua extras\\scoreboard\\a=b: tên có ký tự không dùng được\n"
+                            "Mark [bật]"),
+              std::string::npos)
+        << list.out;
+    EXPECT_NE(list.out.find("SVD [tắt] Thay đổi Sân vận động\n"), std::string::npos);
+
+    const Result plan = Kickvane("plan " + Folders());
+    EXPECT_NE(plan.out.find("Thay đổi bảng tỉ số: chép thư mục extras\\scoreboard\\Đài "
+                            "1\\scoreboard vào data2\\gui\\hud\\scoreboard\n"
+                            "Thay đổi bảng tỉ số: chép thư mục extras\\scoreboard\\Đài "
+                            "1\\namebar vào data2\\gui\\hud\\namebar\n"),
+              std::string::npos)
+        << plan.out;
+}
+
 TEST_F(CliTest, SettingsThatCannotBeReadStopApplyWithTheReasonAndCopyNothing) {
     MakeToolFolder(tool());
     MakeGameFolder(game());

@@ -203,5 +203,28 @@ TEST_F(WindowTest, TrayIconAppearsWhenATrayStartsAndBringsTheHiddenWindowBack) {
     EXPECT_TRUE(kickvane->Running());
 }
 
+// A set the player dropped beside the catalog's balls shows after them on the ball tab; clicked
+// and saved, it is what the hotkey copies.
+TEST_F(WindowTest, AddedBallIsChosenSavedAndApplied) {
+    WriteSettings("F7");
+    WriteFile(tool() / u8"extras/Ball/Bóng Mới/textures/ball10.dds", "new ball");
+    auto kickvane = StartKickvane();
+    ASSERT_TRUE(WindowShown(kWindowTitle)) << ReadText(dir_ / "kickvane.log");
+    const std::string window = FindWindow(kWindowTitle);
+    // The ball tab's head, then the fifth row's button (after the four catalog balls).
+    Capture("xdotool mousemove --window " + window + " 50 125 click 1");
+    Capture("xdotool mousemove --window " + window + " 131 243 click 1");
+    SaveScreenshot(window, "window-added-ball-chosen.png");
+    Capture("xdotool mousemove --window " + window + " 178 457 click 1");  // "Lưu thiết lập"
+    EXPECT_TRUE(WaitFor([&] {
+        return ReadText(tool() / "ThietLap.ini").find("Bóng Mới=True") != std::string::npos;
+    })) << ReadText(tool() / "ThietLap.ini");
+    EXPECT_EQ(ChildProcess({KICKVANE_BINARY, "trigger"}).Wait(), 0);
+    EXPECT_TRUE(WaitFor([&] {
+        return fs::exists(game() / "zdata/data2/ball/textures/ball10.dds") &&
+               ReadText(game() / "zdata/data2/ball/textures/ball10.dds") == "new ball";
+    }));
+}
+
 }  // namespace
 }  // namespace kickvane::testing

@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include "catalog/added_variants.h"
+
 namespace kickvane::engine {
 namespace {
 
@@ -59,6 +61,34 @@ TEST(BuildPlan, VariantStepsComeBeforeTheFixedStepsAndAGroupWithoutChoiceHasOnly
             "copy ToolDataRoot\\pitch\\textures\\grass_dirt.dds -> DataRoot\\pitch\\textures",
             "copy ToolDataRoot\\pitch\\textures\\grass_pitchlines.dds -> DataRoot\\pitch\\textures",
             "merge ToolZDataRoot\\pitch -> ZDataRoot\\pitch"}));
+}
+
+// A variant the player added runs the very steps of the catalog's variants of its group, from its
+// own folder; choosing it clears the group's catalog option and the other way round.
+TEST(BuildPlan, AddedVariantRunsTheStepsOfItsGroupsCatalogVariantsFromItsFolder) {
+    for (const catalog::VariantGroup& group : catalog::Groups()) {
+        SCOPED_TRACE(std::string(group.section) + " " +
+                     std::string(catalog::GroupFolder(group.id)));
+        const catalog::PatchOption& listed = group.options[1];
+        PatchSelection chosen = OnlyCategory(group.ownerSwitch);
+        chosen.setOptionValue(group.array, listed.index, true);
+        std::vector<std::string> expected = Describe(BuildPlan(chosen));
+        const catalog::AddedVariant added{group.id, "Bộ mới 2026"};
+        for (std::string& line : expected) {
+            if (const size_t at = line.find(listed.sourceFolder); at != std::string::npos) {
+                line.replace(at, listed.sourceFolder.size(), added.SourceFolder());
+            }
+        }
+
+        chosen.setAddedValue(group.id, added.name, true);
+        EXPECT_FALSE(chosen.optionValue(group.array, listed.index));
+        const std::vector<std::string> steps = Describe(BuildPlan(chosen));
+        EXPECT_EQ(steps, expected);
+        EXPECT_NE(steps.front().find("Bộ mới 2026"), std::string::npos);
+
+        chosen.setOptionValue(group.array, listed.index, true);
+        EXPECT_TRUE(chosen.chosenAdded(group.id).empty());
+    }
 }
 
 }  // namespace

@@ -158,5 +158,48 @@ TEST_F(SessionTest, QuickLoadRemembersItsFolderAndConfirmsWithThePopup) {
     EXPECT_EQ(session->quickLoadFolder(), dir_ / "faces");
 }
 
+// A set the player drops beside the catalog's is chosen, saved, applied like the others; when
+// its folder goes while the window is away, the group takes its default and the player hears it.
+TEST_F(SessionTest, AddedBallIsChosenSavedAppliedAndFallsBackWhenItsFolderGoes) {
+    WriteSettings("F7");
+    WriteFile(tool() / u8"extras/Ball/Bóng Tết/textures/ball10.dds", "tet ball");
+    auto session = Open();
+    ASSERT_NE(session->addedVariants().Find(catalog::GroupId::Ball, "Bóng Tết"), nullptr);
+    EXPECT_FALSE(session->TakeGoneNotice());
+
+    session->ChooseAdded(catalog::GroupId::Ball, "No such set");  // not listed: nothing changes
+    EXPECT_EQ(session->selection().chosen(catalog::GroupId::Ball), 1);
+    session->ChooseAdded(catalog::GroupId::Ball, "Bóng Tết");
+    EXPECT_EQ(session->selection().chosenAdded(catalog::GroupId::Ball), "Bóng Tết");
+    EXPECT_FALSE(session->Save().popup->text.empty());
+    const ApplyRun run = session->Apply();
+    EXPECT_TRUE(run.apply.Failures().empty());
+    EXPECT_EQ(testing::ReadText(game() / "zdata/data2/ball/textures/ball10.dds"), "tet ball");
+
+    // A second start reads the choice back.
+    EXPECT_EQ(Open()->selection().chosenAdded(catalog::GroupId::Ball), "Bóng Tết");
+
+    fs::remove_all(tool() / u8"extras/Ball/Bóng Tết");
+    WriteFile(tool() / "extras/Ball/Empty one/.hidden", "");
+    fs::remove(tool() / "extras/Ball/Empty one/.hidden");
+    const Outcome refreshed = session->RefreshAddedVariants();
+    ASSERT_EQ(refreshed.messages.size(), 1u);
+    EXPECT_EQ(refreshed.messages[0].text,
+              "Không còn thư mục của bộ đã chọn, đã chọn lại mặc định:\n"
+              "• extras\\Ball\\Bóng Tết → Europa League 2011");
+    EXPECT_EQ(session->selection().chosen(catalog::GroupId::Ball), 1);
+    EXPECT_EQ(SkippedLine(session->addedVariants(), catalog::GroupId::Ball),
+              "Bỏ qua: Empty one (thư mục trống)");
+    EXPECT_TRUE(session->RefreshAddedVariants().messages.empty());  // said once
+
+    // Started afresh on the saved file, the gone choice is said once at start.
+    auto restarted = Open();
+    const std::optional<text::Message> notice = restarted->TakeGoneNotice();
+    ASSERT_TRUE(notice);
+    EXPECT_NE(notice->text.find("Bóng Tết"), std::string::npos);
+    EXPECT_FALSE(restarted->TakeGoneNotice());
+    EXPECT_EQ(restarted->selection().chosen(catalog::GroupId::Ball), 1);
+}
+
 }  // namespace
 }  // namespace kickvane::session
