@@ -65,11 +65,12 @@ std::vector<StepOutcome> ApplyOutcome::Failures() const {
 }
 
 std::string ToolDataMissingText(const Roots& roots) {
-    return "Khong tim thay: " + roots.toolData.string() + "\r\nKiem tra lai duong dan";
+    return "Không tìm thấy: " + platform::PathToUtf8(roots.toolData) + "\r\nKiểm tra lại đường dẫn";
 }
 
 std::string ToolDataTooLongText(const Roots& roots) {
-    return "Duong dan qua dai: " + roots.toolData.string() + "\r\nKiem tra lai duong dan";
+    return "Đường dẫn quá dài: " + platform::PathToUtf8(roots.toolData) +
+           "\r\nKiểm tra lại đường dẫn";
 }
 
 std::filesystem::path SignalSoundPath(const std::filesystem::path& toolFolder) {

@@ -261,7 +261,7 @@ void MainWindow::launchGame(session::LaunchFrom from) {
 
 void MainWindow::browseGameFolder() {
     if (auto folder = services_.dialogs->PickFolder(
-            this, QStringLiteral("Chon thu muc cai dat FIFA Online 2"),
+            this, QStringLiteral("Chọn thư mục cài đặt FIFA Online 2"),
             ToQString(session_.settings().gameFolder))) {
         panels_->showGameFolder(*folder);
     }
@@ -270,7 +270,7 @@ void MainWindow::browseGameFolder() {
 void MainWindow::quickLoad() {
     std::optional<std::filesystem::path> chosen;
     if (auto folder = services_.dialogs->PickFolder(
-            this, QStringLiteral("Ho tro nap nhanh cac file Face va Ball"),
+            this, QStringLiteral("Hỗ trợ nạp nhanh các file Face và Ball"),
             PathToQString(session_.quickLoadFolder()))) {
         chosen = QStringToPath(*folder);
     }

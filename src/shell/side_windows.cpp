@@ -105,7 +105,7 @@ std::filesystem::path PreviewPicture(const std::filesystem::path& toolFolder,
 PreviewWindow::PreviewWindow(QWidget* owner)
     : QWidget(owner, Qt::Tool), picture_(new QLabel(this)) {
     setAttribute(Qt::WA_DeleteOnClose);
-    setWindowTitle(QStringLiteral("Xem truoc"));
+    setWindowTitle(QStringLiteral("Xem trước"));
     setFixedSize(kPreviewSize);
     picture_->setGeometry(0, 0, kPreviewSize.width(), kPreviewSize.height());
     picture_->setAlignment(Qt::AlignCenter);
@@ -161,7 +161,7 @@ std::filesystem::path AddedPreviewPicture(const std::filesystem::path& toolFolde
 
 QWidget* CreateAboutWindow(QWidget* owner) {
     return new TextWindow(
-        owner, QStringLiteral("Thong tin"),
+        owner, QStringLiteral("Thông tin"),
         {QStringLiteral("<b>Kickvane</b> phiên bản 2.0"),
          QStringLiteral("Công cụ thay đổi đồ hoạ cho FIFA Online 2: bóng, mặt cỏ, biển quảng cáo, "
                         "bảng tỉ số, Mark, ngoại hình, giày, áo đấu, lưới, cổ động viên và sân "
@@ -206,7 +206,7 @@ QString HelpText() {
 }
 
 QWidget* CreateHelpWindow(QWidget* owner) {
-    return new TextWindow(owner, QStringLiteral("Huong dan"),
+    return new TextWindow(owner, QStringLiteral("Hướng dẫn"),
                           {HelpText().replace(QStringLiteral("\r\n"), QStringLiteral("\n"))},
                           Qt::PlainText, 520);
 }

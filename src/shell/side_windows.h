@@ -21,7 +21,7 @@ std::filesystem::path PreviewPicture(const std::filesystem::path& toolFolder,
 std::filesystem::path AddedPreviewPicture(const std::filesystem::path& toolFolder,
                                           catalog::GroupId group, std::string_view name);
 
-// "Xem truoc": one picture scaled to the window, which opens centred on the main window's
+// "Xem trước": one picture scaled to the window, which opens centred on the main window's
 // screen. A picture that cannot be loaded leaves the one shown before (or a short note when there
 // was none).
 class PreviewWindow final : public QWidget {
@@ -41,11 +41,11 @@ private:
     QString pictureFile_;
 };
 
-// "Thong tin": the tool's name and version. It and the help window close with their button
+// "Thông tin": the tool's name and version. It and the help window close with their button
 // "Đóng" or with Escape.
 QWidget* CreateAboutWindow(QWidget* owner);
 
-// "Huong dan": the user guide.
+// "Hướng dẫn": the user guide.
 QWidget* CreateHelpWindow(QWidget* owner);
 QString HelpText();
 

@@ -116,10 +116,10 @@ TEST_F(WindowUsabilityTest, TabHeadsAndLabelsTellAssistiveToolsWhatTheyAreAndDo)
 TEST_F(WindowUsabilityTest, AboutAndHelpAreSideWindowsThatCloseWithTheirButtonAndWithEscape) {
     auto window = Open();
     window->show();
-    for (const char* title : {"Thong tin", "Huong dan"}) {
+    for (const char* title : {"Thông tin", "Hướng dẫn"}) {
         for (Qt::Key key : {Qt::Key_unknown, Qt::Key_Escape, Qt::Key_Return}) {
             SCOPED_TRACE(std::string(title) + " " + std::to_string(key));
-            if (std::string_view(title) == "Thong tin") {
+            if (std::string_view(title) == "Thông tin") {
                 Click(window->buttons().info());
             } else {
                 Click(window->buttons().help());
@@ -167,7 +167,7 @@ TEST_F(WindowUsabilityTest, FolderDialogSpeaksVietnameseAndListsHiddenFolders) {
     std::filesystem::create_directories(dir_ / ".wine");
     std::filesystem::create_directories(dir_ / "Games");
     QFileDialog dialog;
-    PrepareFolderDialog(dialog, QStringLiteral("Ho tro nap nhanh cac file Face va Ball"),
+    PrepareFolderDialog(dialog, QStringLiteral("Hỗ trợ nạp nhanh các file Face và Ball"),
                         QString::fromStdString(dir_.path().string()));
     EXPECT_EQ(dialog.proxyModel()->headerData(0, Qt::Horizontal, Qt::DisplayRole).toString(),
               "Tên");
