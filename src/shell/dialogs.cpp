@@ -1,17 +1,24 @@
 #include "shell/dialogs.h"
 
+#include <QCoreApplication>
 #include <QDateTime>
 #include <QDir>
 #include <QFileDialog>
 #include <QFileSystemModel>
+#include <QHeaderView>
 #include <QIdentityProxyModel>
 #include <QMessageBox>
+#include <QTranslator>
+#include <QTreeView>
+#include <algorithm>
 #include <array>
 #include <filesystem>
+#include <memory>
 
 #include "game/wine_prefix.h"
 #include "platform/filesystem.h"
 #include "shell/alert_popup.h"
+#include "shell/message_box.h"
 #include "shell/qt_text.h"
 
 namespace kickvane::shell {
@@ -55,6 +62,15 @@ public:
 };
 }  // namespace
 
+bool UseVietnameseQtTexts() {
+    auto* translator = new QTranslator(QCoreApplication::instance());
+    if (!translator->load(QStringLiteral(":/translations/qtbase_vi.qm"))) {
+        delete translator;
+        return false;
+    }
+    return QCoreApplication::installTranslator(translator);
+}
+
 QString FolderDialogStart(const QString& wanted) {
     namespace fs = std::filesystem;
     const QString text = wanted.trimmed();
@@ -95,8 +111,16 @@ void PrepareFolderDialog(QFileDialog& dialog, const QString& title, const QStrin
     dialog.setLabelText(QFileDialog::FileName, QStringLiteral("Thư mục:"));
     dialog.setLabelText(QFileDialog::FileType, QStringLiteral("Loại:"));
     dialog.setLabelText(QFileDialog::Accept, QStringLiteral("Chọn"));
-    dialog.setLabelText(QFileDialog::Reject, QStringLiteral("Hủy"));
+    dialog.setLabelText(QFileDialog::Reject, QStringLiteral("Huỷ"));
     dialog.setProxyModel(new VietnameseColumns(&dialog));
+    // Qt sizes the detail view's columns for English heads; the Vietnamese ones need more room.
+    if (auto* details = dialog.findChild<QTreeView*>(QStringLiteral("treeView"))) {
+        QHeaderView* header = details->header();
+        for (int column = 0; column < header->count(); ++column) {
+            header->resizeSection(
+                column, std::max(header->sectionSize(column), header->sectionSizeHint(column)));
+        }
+    }
     // A folder picker has no file types to choose ("Directories" only).
     for (const char* name : {"fileTypeCombo", "fileTypeLabel"}) {
         if (auto* widget = dialog.findChild<QWidget*>(QString::fromLatin1(name))) {
@@ -128,13 +152,14 @@ std::optional<QString> QtDialogs::PickFolder(QWidget* owner, const QString& titl
 }
 
 void QtDialogs::ShowMessage(QWidget* owner, const QString& title, const QString& text, Icon icon) {
-    QMessageBox box(icon == Icon::Warning ? QMessageBox::Warning : QMessageBox::Information, title,
-                    text, QMessageBox::Ok, owner);
-    box.exec();
+    const std::unique_ptr<QMessageBox> box(
+        NewPlainMessageBox(icon == Icon::Warning ? QMessageBox::Warning : QMessageBox::Information,
+                           title, text, owner));
+    box->exec();
 }
 
 void QtDialogs::ShowNotice(QWidget* owner, const QString& title, const QString& text) {
-    auto* box = new QMessageBox(QMessageBox::Warning, title, text, QMessageBox::Ok, owner);
+    QMessageBox* box = NewPlainMessageBox(QMessageBox::Warning, title, text, owner);
     box->setAttribute(Qt::WA_DeleteOnClose);
     box->setModal(false);
     box->show();

@@ -10,6 +10,7 @@
 #include <QVBoxLayout>
 #include <memory>
 
+#include "shell/message_box.h"
 #include "shell/qt_text.h"
 
 namespace kickvane::shell {
@@ -23,6 +24,25 @@ const QString kTitle = QStringLiteral("Tìm FIFA Online 2");
 // The button's caption; "m" is its mnemonic.
 const QString kCaption = QStringLiteral("Tì&m");
 
+// A found folder is kept only once the settings are saved; the finder says so.
+const QString kSaveToKeep = QStringLiteral("Bấm \"Lưu thiết lập\" để giữ thư mục này.");
+
+// A path laid out for `widget`'s font in lines of at most `width` pixels, continued lines
+// indented.
+QString BrokenPath(const QString& path, const QWidget& widget, int width) {
+    const QFontMetrics metrics = widget.fontMetrics();
+    return PathLines(path, width,
+                     [&](const QString& text) { return metrics.horizontalAdvance(text); })
+        .join(QStringLiteral("\n    "));
+}
+
+// A box that does not hold up the window; its text is shown as written.
+void OpenInformation(QWidget* owner, const QString& text) {
+    QMessageBox* box = NewPlainMessageBox(QMessageBox::Information, kTitle, text, owner);
+    box->setAttribute(Qt::WA_DeleteOnClose);
+    box->open();
+}
+
 // The list of several finds; the chosen folder goes into the box.
 void OpenChoice(QWidget* owner, QLineEdit* box, const std::vector<game::FoundGame>& games) {
     auto* dialog = new QDialog(owner);
@@ -33,15 +53,17 @@ void OpenChoice(QWidget* owner, QLineEdit* box, const std::vector<game::FoundGam
         new QLabel(QStringLiteral("Tìm thấy nhiều bản FIFA Online 2. Chọn một:"), dialog));
     auto* list = new QListWidget(dialog);
     list->setAccessibleName(QStringLiteral("Các thư mục tìm thấy"));
+    list->setMinimumWidth(520);
+    const int pathWidth = list->minimumWidth() - 48;  // the frame, the margins, a scroll bar
     for (const game::FoundGame& game : games) {
-        auto* item = new QListWidgetItem(PathToQString(game.folder) + QStringLiteral("\n    ") +
-                                         ToQString(game.source));
+        auto* item = new QListWidgetItem(BrokenPath(PathToQString(game.folder), *list, pathWidth) +
+                                         QStringLiteral("\n    ") + ToQString(game.source));
         item->setData(Qt::UserRole, PathToQString(game.folder));
         list->addItem(item);
     }
     list->setCurrentRow(0);
-    list->setMinimumWidth(520);
     layout->addWidget(list);
+    layout->addWidget(new QLabel(kSaveToKeep, dialog));
     auto* buttons = new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel, dialog);
     buttons->button(QDialogButtonBox::Ok)->setText(QStringLiteral("Chọn"));
     buttons->button(QDialogButtonBox::Cancel)->setText(QStringLiteral("Huỷ"));
@@ -58,19 +80,20 @@ void OpenChoice(QWidget* owner, QLineEdit* box, const std::vector<game::FoundGam
 }
 
 void OpenNothingFound(QWidget* owner, const game::FindOutcome& outcome) {
+    // The box is some 500 pixels wide at most; the places are laid out narrower, so that the box
+    // never breaks them itself.
+    constexpr int kPlaceWidth = 420;
     QString text = QStringLiteral("Không tìm thấy Gameloader.exe.\n\nĐã tìm trong:");
     for (const std::string& place : outcome.looked) {
-        text += QStringLiteral("\n  ") + ToQString(place);
+        text += QStringLiteral("\n  ") + BrokenPath(ToQString(place), *owner, kPlaceWidth);
     }
     if (!outcome.skipped.empty()) {
         text += QStringLiteral("\n\nBỏ qua (không đọc được):");
         for (const std::string& skipped : outcome.skipped) {
-            text += QStringLiteral("\n  ") + ToQString(skipped);
+            text += QStringLiteral("\n  ") + BrokenPath(ToQString(skipped), *owner, kPlaceWidth);
         }
     }
-    auto* box = new QMessageBox(QMessageBox::Information, kTitle, text, QMessageBox::Ok, owner);
-    box->setAttribute(Qt::WA_DeleteOnClose);
-    box->open();
+    OpenInformation(owner, text);
 }
 
 }  // namespace
@@ -131,13 +154,45 @@ void GameFinderButton::finish(const game::FindOutcome& outcome) {
     setText(kCaption);
     setEnabled(true);
     if (outcome.games.size() == 1) {
-        gameFolderBox_->setText(PathToQString(outcome.games.front().folder));
+        const QString folder = PathToQString(outcome.games.front().folder);
+        gameFolderBox_->setText(folder);
+        OpenInformation(window(), QStringLiteral("Đã tìm thấy FIFA Online 2:\n    ") +
+                                      BrokenPath(folder, *this, 420) + QStringLiteral("\n\n") +
+                                      kSaveToKeep);
     } else if (outcome.games.size() > 1) {
         OpenChoice(window(), gameFolderBox_, outcome.games);
     } else {
         OpenNothingFound(window(), outcome);
     }
     emit searchFinished();
+}
+
+QStringList PathLines(const QString& path, int width,
+                      const std::function<int(const QString&)>& measure) {
+    QStringList lines;
+    QString line;
+    qsizetype start = 0;
+    while (start < path.size()) {
+        // One name with the separator after it.
+        qsizetype end = start;
+        while (end < path.size() && path[end] != u'/' && path[end] != u'\\') {
+            ++end;
+        }
+        while (end < path.size() && (path[end] == u'/' || path[end] == u'\\')) {
+            ++end;
+        }
+        const QString piece = path.mid(start, end - start);
+        if (!line.isEmpty() && measure(line + piece) > width) {
+            lines << line;
+            line.clear();
+        }
+        line += piece;
+        start = end;
+    }
+    if (!line.isEmpty() || lines.isEmpty()) {
+        lines << line;
+    }
+    return lines;
 }
 
 GameFinderButton* AddGameFinder(QLineEdit* gameFolderBox, QPushButton* browseButton) {

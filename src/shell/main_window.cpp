@@ -68,6 +68,7 @@ MainWindow::MainWindow(session::Session& session, ShellServices services, QWidge
     const QIcon icon = ToolIcon(session_.toolFolder());
     setWindowIcon(icon);
     skins_.initialise();
+    sideWindows_.keepClearFrom(buttons_->save());
 
     tray_ = std::make_unique<TrayMenu>(icon, services_.makeTray);
     connectTray();
@@ -83,6 +84,7 @@ MainWindow::MainWindow(session::Session& session, ShellServices services, QWidge
     showSession();
     connectPanels();
     connectButtons();
+    panels_->tabHead(panels_->currentTab())->setFocus(Qt::OtherFocusReason);
     if (std::optional<text::Message> problem = session_.SettingsProblem()) {
         // Once the window is up, so the box has its owner on screen.
         QTimer::singleShot(
@@ -100,6 +102,7 @@ void MainWindow::connectPanels() {
     connect(panels_, &CatalogPanels::tabSelected, this, [this] {
         skins_.paintTabs();
         update();
+        moveFocusOffHotkey();
     });
     connect(panels_, &CatalogPanels::categoryToggled, this,
             [this](int switchIndex, bool on) { session_.setCategoryOn(switchIndex, on); });
@@ -313,7 +316,18 @@ TranslucentResult MainWindow::makeTranslucent(int alpha) {
     return TranslucentResult::Applied;
 }
 
+void MainWindow::moveFocusOffHotkey() {
+    // The focus rests in the hotkey box only while the user works in it: where it stayed, a key
+    // or the wheel meant for something else would change the hotkey silently.
+    const QWidget* focused = focusWidget();
+    HotkeyBox* box = buttons_->hotkeyBox();
+    if (focused && (focused == box || box->isAncestorOf(focused))) {
+        panels_->tabHead(panels_->currentTab())->setFocus(Qt::OtherFocusReason);
+    }
+}
+
 bool MainWindow::hideToTray() {
+    moveFocusOffHotkey();
     // Without a tray host the window could not come back from hiding; it minimises instead.
     if (tray_->icon().Shown()) {
         hide();
@@ -337,6 +351,7 @@ void MainWindow::runHidden() {
 }
 
 void MainWindow::showFromTray() {
+    moveFocusOffHotkey();
     showNormal();
     raise();
     activateWindow();

@@ -101,6 +101,8 @@ private:
     // hideToTray, then says what happened: `popup` when hidden, the lack of a tray otherwise.
     void hideAndSay(const session::Popup& popup);
     void showAddedVariants();
+    // Moves the focus from the hotkey box, if it is there, to the current tab head.
+    void moveFocusOffHotkey();
 
     session::Session& session_;
     ShellServices services_;

@@ -2,6 +2,7 @@
 
 #include <QMessageBox>
 #include <QWidget>
+#include <memory>
 
 #include "shell/qt_text.h"
 #include "text/vni.h"
@@ -12,11 +13,19 @@ QString NoticeTitle() {
     return ToQString(text::VniToUnicodeUtf8(kNoticeTitleVni));
 }
 
+QMessageBox* NewPlainMessageBox(QMessageBox::Icon icon, const QString& title, const QString& text,
+                                QWidget* owner) {
+    auto* box = new QMessageBox(icon, title, QString(), QMessageBox::Ok, owner);
+    box->setTextFormat(Qt::PlainText);
+    box->setText(text);
+    return box;
+}
+
 int ShowMessageW(std::string_view text, std::string_view title, int style, QWidget* owner) {
-    QMessageBox box(style == kStyleInformation ? QMessageBox::Information : QMessageBox::NoIcon,
-                    ToQString(text::VniToUnicodeUtf8(title)),
-                    ToQString(text::VniToUnicodeUtf8(text)), QMessageBox::Ok, owner);
-    box.exec();
+    const std::unique_ptr<QMessageBox> box(NewPlainMessageBox(
+        style == kStyleInformation ? QMessageBox::Information : QMessageBox::NoIcon,
+        ToQString(text::VniToUnicodeUtf8(title)), ToQString(text::VniToUnicodeUtf8(text)), owner));
+    box->exec();
     return 1;
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QMessageBox>
 #include <QString>
 #include <string_view>
 
@@ -16,5 +17,10 @@ inline constexpr std::string_view kNoticeTitleVni = "Tho6ng ba1o";
 int ShowMessageW(std::string_view text, std::string_view title, int style, QWidget* owner);
 
 QString NoticeTitle();
+
+// A message box with one OK button whose text is shown as written: the paths, fetched answers
+// and settings values in it are never read as markup.
+QMessageBox* NewPlainMessageBox(QMessageBox::Icon icon, const QString& title, const QString& text,
+                                QWidget* owner);
 
 }  // namespace kickvane::shell

@@ -9,6 +9,7 @@
 #include "platform/single_instance.h"
 #include "platform/sound.h"
 #include "popup/popup_model.h"
+#include "shell/dialogs.h"
 #include "shell/main_window.h"
 #include "shell/message_box.h"
 #include "shell/qt_text.h"
@@ -58,6 +59,7 @@ int RunWindow(int& argc, char** argv, const std::filesystem::path& toolFolder) {
     QApplication app(argc, argv);
     QApplication::setApplicationName(QStringLiteral("Kickvane"));
     UseReadableFonts();
+    UseVietnameseQtTexts();
 
     const std::unique_ptr<platform::SingleInstance> instance = platform::AcquireSingleInstance();
     if (!instance) {

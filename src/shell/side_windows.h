@@ -41,6 +41,13 @@ private:
     QString pictureFile_;
 };
 
+// Where a side window opens, as the top left corner of its frame of `size`: beside the owner's
+// frame on the right, else on the left, when it fits in the work area `area`; otherwise centred
+// over the owner, its bottom above `keepClearTop` (the top of the owner's command buttons) when
+// there is room. Always inside the work area as far as the window's size allows.
+QPoint SideWindowPosition(const QRect& area, const QRect& ownerFrame, int keepClearTop,
+                          const QSize& size);
+
 // "Thông tin": the tool's name and version. It and the help window close with their button
 // "Đóng" or with Escape.
 QWidget* CreateAboutWindow(QWidget* owner);

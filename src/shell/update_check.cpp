@@ -11,6 +11,7 @@
 #include "catalog/settings.h"
 #include "shell/fetch_problem.h"
 #include "shell/message_box.h"
+#include "shell/qt_text.h"
 #include "text/utf.h"
 #include "text/vni.h"
 
@@ -35,6 +36,16 @@ QString Vni(std::string_view text) {
     return QString::fromStdString(text::VniToUnicodeUtf8(text));
 }
 
+// A failure's reason with its last two words joined by a no-break space: a box that wraps it
+// carries the last word over together with the one before.
+QString WithLastWordsHeld(const QString& reason) {
+    QString held = reason.trimmed();
+    if (const qsizetype lastBlank = held.lastIndexOf(QLatin1Char(' ')); lastBlank > 0) {
+        held[lastBlank] = QChar::Nbsp;
+    }
+    return held;
+}
+
 const QString kTimedOut = FetchProblemText(FetchProblem::TimedOut);
 const QString kTooLarge = FetchProblemText(FetchProblem::TooLarge);
 const QString kRedirectRefused = FetchProblemText(FetchProblem::RedirectRefused);
@@ -44,8 +55,17 @@ const QString kBadHost = FetchProblemText(FetchProblem::BadHost);
 }  // namespace
 
 bool IsCurrentVersion(std::string_view text) {
-    return text.size() == kToolVersion.size() + 2 && text.starts_with(kToolVersion) &&
-           text.ends_with("\r\n");
+    return VersionFromAnswer(text) == kToolVersion;
+}
+
+QString CheckFailedText(const QString& reason) {
+    return QStringLiteral("Không kiểm tra được phiên bản mới:\n") + WithLastWordsHeld(reason);
+}
+
+QString NewerVersionText(std::string_view version) {
+    // Only the tool's own VNI-typed words are converted: a fetched "beta1" must not become
+    // "betá".
+    return Vni("D9a4 co1 phie6n ba3n mo71i! ") + ToQString(version);
 }
 
 UpdateCheck::UpdateCheck(Options options, QObject* parent)
@@ -280,18 +300,24 @@ void UpdateFlow::check() {
 }
 
 void UpdateFlow::onVersion(const QString& text) {
-    const std::string version = text.toStdString();
-    // An empty answer, a web page or binary data is no version: nothing to announce or record.
-    if (!IsVersionText(version)) {
-        onVersionFailed(QStringLiteral("máy chủ không trả về số phiên bản"));
+    // An empty answer, a web page or words are no version: nothing to announce or record.
+    const std::optional<std::string> version = VersionFromAnswer(text.toStdString());
+    if (!version) {
+        checking_ = false;
+        if (checkButton_) {
+            checkButton_->setEnabled(true);
+        }
+        showMessage(QStringLiteral("Máy chủ cập nhật trả lời không phải số phiên bản"),
+                    Dialogs::Icon::Warning);
+        emit checkFinished();
         return;
     }
     checking_ = false;
-    state_.versionText = version;
+    state_.versionText = *version;
     if (checkButton_) {
         checkButton_->setEnabled(true);
     }
-    if (IsCurrentVersion(version)) {
+    if (*version == kToolVersion) {
         showMessage(Vni("Chu7a co1 phie6n ba3n mo71i"), Dialogs::Icon::Information);
         emit checkFinished();
         return;
@@ -302,13 +328,13 @@ void UpdateFlow::onVersion(const QString& text) {
     if (checkButton_) {
         checkButton_->hide();  // until the tool closes
     }
-    // The writer drops the text's line breaks. Nothing reads the key back, so a failed write
-    // must not keep the user from hearing about the new version.
-    (void)catalog::WriteIni(catalog::SettingsFile(toolFolder_), "KiemTra", "PhienBan", version);
+    // Nothing reads the key back, so a failed write must not keep the user from hearing about
+    // the new version.
+    (void)catalog::WriteIni(catalog::SettingsFile(toolFolder_), "KiemTra", "PhienBan", *version);
     if (downloadButton_) {
         downloadButton_->show();
     }
-    showMessage(Vni("D9a4 co1 phie6n ba3n mo71i! " + version), Dialogs::Icon::Information);
+    showMessage(NewerVersionText(*version), Dialogs::Icon::Information);
     emit checkFinished();
 }
 
@@ -317,8 +343,7 @@ void UpdateFlow::onVersionFailed(const QString& reason) {
     if (checkButton_) {
         checkButton_->setEnabled(true);
     }
-    showMessage(QStringLiteral("Không kiểm tra được phiên bản mới: %1").arg(reason),
-                Dialogs::Icon::Warning);
+    showMessage(CheckFailedText(reason), Dialogs::Icon::Warning);
     emit checkFinished();
 }
 
@@ -331,7 +356,8 @@ void UpdateFlow::download() {
                 QStringLiteral("Chưa nhận được đường dẫn tải về, xin thử lại sau giây lát."),
                 Dialogs::Icon::Information);
         } else if (link_ == LinkState::Failed) {
-            showMessage(QStringLiteral("Không lấy được đường dẫn tải về: %1").arg(linkFailure_),
+            showMessage(QStringLiteral("Không lấy được đường dẫn tải về:\n") +
+                            WithLastWordsHeld(linkFailure_),
                         Dialogs::Icon::Warning);
         } else {
             showMessage(QStringLiteral("Đường dẫn tải về không hợp lệ."), Dialogs::Icon::Warning);
