@@ -27,6 +27,10 @@ const QString kCaption = QStringLiteral("Tì&m");
 // A found folder is kept only once the settings are saved; the finder says so.
 const QString kSaveToKeep = QStringLiteral("Bấm \"Lưu thiết lập\" để giữ thư mục này.");
 
+// A message box is some 500 pixels wide at most; the paths in it are laid out narrower, so that
+// the box never breaks them itself.
+constexpr int kPlaceWidth = 420;
+
 // A path laid out for `widget`'s font in lines of at most `width` pixels, continued lines
 // indented.
 QString BrokenPath(const QString& path, const QWidget& widget, int width) {
@@ -80,9 +84,6 @@ void OpenChoice(QWidget* owner, QLineEdit* box, const std::vector<game::FoundGam
 }
 
 void OpenNothingFound(QWidget* owner, const game::FindOutcome& outcome) {
-    // The box is some 500 pixels wide at most; the places are laid out narrower, so that the box
-    // never breaks them itself.
-    constexpr int kPlaceWidth = 420;
     QString text = QStringLiteral("Không tìm thấy Gameloader.exe.\n\nĐã tìm trong:");
     for (const std::string& place : outcome.looked) {
         text += QStringLiteral("\n  ") + BrokenPath(ToQString(place), *owner, kPlaceWidth);
@@ -157,8 +158,8 @@ void GameFinderButton::finish(const game::FindOutcome& outcome) {
         const QString folder = PathToQString(outcome.games.front().folder);
         gameFolderBox_->setText(folder);
         OpenInformation(window(), QStringLiteral("Đã tìm thấy FIFA Online 2:\n    ") +
-                                      BrokenPath(folder, *this, 420) + QStringLiteral("\n\n") +
-                                      kSaveToKeep);
+                                      BrokenPath(folder, *this, kPlaceWidth) +
+                                      QStringLiteral("\n\n") + kSaveToKeep);
     } else if (outcome.games.size() > 1) {
         OpenChoice(window(), gameFolderBox_, outcome.games);
     } else {
