@@ -178,14 +178,14 @@ Status IniDocument::Read(const fs::path& file, IniDocument* document) {
                 *document = std::move(*parsed);
                 return Status::Ok();
             }
-            return Status::Fail("Tệp thiết lập " + name + " không phải là văn bản.");
+            return Status::Fail("File thiết lập " + name + " không phải là văn bản.");
         case Result::Folder:
-            return Status::Fail("Tệp thiết lập " + name + " là một thư mục, không phải tệp.");
+            return Status::Fail("File thiết lập " + name + " là một thư mục, không phải file.");
         case Result::NotRegular:
-            return Status::Fail("Tệp thiết lập " + name +
-                                " không phải tệp thường (có thể là thiết bị hoặc ống dẫn).");
+            return Status::Fail("File thiết lập " + name +
+                                " không phải file thường (có thể là thiết bị hoặc ống dẫn).");
         case Result::TooLarge:
-            return Status::Fail("Tệp thiết lập " + name + " quá lớn (hơn " +
+            return Status::Fail("File thiết lập " + name + " quá lớn (hơn " +
                                 std::to_string(kMaxIniBytes >> 10) + " KiB).");
         case Result::Unreadable:
             break;

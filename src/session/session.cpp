@@ -240,7 +240,7 @@ std::optional<text::Message> Session::SettingsProblem() const {
     return text::Message{text::Message::Kind::Warning,
                          why +
                              "\nĐang dùng thiết lập mặc định; phím tắt sẽ không chép gì cho đến "
-                             "khi tệp được sửa hoặc xoá và chương trình được mở lại.",
+                             "khi file được sửa hoặc xoá và chương trình được mở lại.",
                          std::string(kNoticeTitle)};
 }
 

@@ -60,6 +60,22 @@ public:
         return QIdentityProxyModel::data(index, role);
     }
 };
+// The chooser's own boxes (a typed folder that does not exist) quote what the user typed: shown
+// as written, never as markup.
+class PlainTextBoxes final : public QObject {
+public:
+    using QObject::QObject;
+
+    bool eventFilter(QObject* watched, QEvent* event) override {
+        if (event->type() == QEvent::ChildPolished) {
+            if (auto* box = qobject_cast<QMessageBox*>(static_cast<QChildEvent*>(event)->child())) {
+                box->setTextFormat(Qt::PlainText);
+            }
+        }
+        return QObject::eventFilter(watched, event);
+    }
+};
+
 }  // namespace
 
 bool UseVietnameseQtTexts() {
@@ -113,6 +129,7 @@ void PrepareFolderDialog(QFileDialog& dialog, const QString& title, const QStrin
     dialog.setLabelText(QFileDialog::Accept, QStringLiteral("Chọn"));
     dialog.setLabelText(QFileDialog::Reject, QStringLiteral("Huỷ"));
     dialog.setProxyModel(new VietnameseColumns(&dialog));
+    dialog.installEventFilter(new PlainTextBoxes(&dialog));
     // Qt sizes the detail view's columns for English heads; the Vietnamese ones need more room.
     if (auto* details = dialog.findChild<QTreeView*>(QStringLiteral("treeView"))) {
         QHeaderView* header = details->header();

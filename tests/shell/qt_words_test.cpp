@@ -144,14 +144,16 @@ TEST_F(QtWordsTest, FolderChooserSpeaksVietnameseAndShowsItsHeadsWhole) {
     }
     SavePicture(dialog, QStringLiteral("folder-chooser.png"));
 
-    // A typed folder that does not exist: Qt's own box says so in Vietnamese.
+    // A typed folder that does not exist: Qt's own box says so in Vietnamese, and shows the
+    // typed text as written.
     auto* nameBox = dialog.findChild<QLineEdit*>(QStringLiteral("fileNameEdit"));
     ASSERT_NE(nameBox, nullptr);
-    nameBox->setText(QString::fromStdString((dir_ / "missing").string()));
+    nameBox->setText(QStringLiteral("<b>missing"));
     QString boxText;
     QTimer::singleShot(0, [&] {
         if (auto* box = qobject_cast<QMessageBox*>(QApplication::activeModalWidget())) {
             boxText = box->text();
+            EXPECT_EQ(box->textFormat(), Qt::PlainText);
             ExpectNoEnglish(*box);
             box->close();
         }
@@ -159,6 +161,7 @@ TEST_F(QtWordsTest, FolderChooserSpeaksVietnameseAndShowsItsHeadsWhole) {
     static_cast<QDialog&>(dialog).accept();  // as the "Chọn" button does
     EXPECT_TRUE(boxText.contains(QStringLiteral("Không tìm thấy thư mục")))
         << boxText.toStdString();
+    EXPECT_TRUE(boxText.contains(QStringLiteral("<b>missing"))) << boxText.toStdString();
 }
 
 TEST_F(QtWordsTest, TextBoxContextMenusAndStandardButtonsSpeakVietnamese) {
@@ -184,14 +187,15 @@ TEST_F(QtWordsTest, OutsideTextIsShownAsWrittenNeverAsMarkup) {
          {QStringLiteral("<img src=\"/usr/share/pixmaps/debian-logo.png\">"),
           QStringLiteral("<h1>404 Not Found</h1>"), QStringLiteral("Tom &amp; Jerry")}) {
         SCOPED_TRACE(outside.toStdString());
-        std::unique_ptr<QMessageBox> box(NewPlainMessageBox(
-            QMessageBox::Warning, QStringLiteral("Thông báo"), outside, window.get()));
-        EXPECT_EQ(box->textFormat(), Qt::PlainText);
-        auto* label = box->findChild<QLabel*>(QStringLiteral("qt_msgbox_label"));
-        ASSERT_NE(label, nullptr);
-        EXPECT_EQ(label->textFormat(), Qt::PlainText);
-        EXPECT_EQ(label->text(), outside);
-
+        {
+            std::unique_ptr<QMessageBox> box(NewPlainMessageBox(
+                QMessageBox::Warning, QStringLiteral("Thông báo"), outside, window.get()));
+            EXPECT_EQ(box->textFormat(), Qt::PlainText);
+            auto* label = box->findChild<QLabel*>(QStringLiteral("qt_msgbox_label"));
+            ASSERT_NE(label, nullptr);
+            EXPECT_EQ(label->textFormat(), Qt::PlainText);
+            EXPECT_EQ(label->text(), outside);
+        }
         QtDialogs dialogs;
         dialogs.ShowNotice(window.get(), QStringLiteral("Thông báo"), outside);
         auto* notice = window->findChild<QMessageBox*>();
