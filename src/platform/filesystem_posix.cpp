@@ -9,10 +9,13 @@
 #include <array>
 #include <atomic>
 #include <cerrno>
+#include <chrono>
 #include <cstdint>
 #include <cstring>
+#include <ctime>
 #include <random>
 #include <string>
+#include <thread>
 
 #include "platform/filesystem.h"
 #include "platform/posix_fd.h"
@@ -99,17 +102,19 @@ public:
     bool valid() const { return fd_ >= 0; }
     int fd() const { return fd_; }
 
-    // Closes the file and renames it over `targetName`; `target` names it in messages.
+    // Renames the file over `targetName`, then closes it; `target` names it in messages. The lock
+    // is held until the rename is done: a file closed first would look abandoned to a cleaner in
+    // another process, which could delete it before it reaches its place.
     Status CommitAs(const std::string& targetName, const fs::path& target) {
-        int fd = fd_;
-        fd_ = -1;
-        if (::close(fd) != 0) {
-            return Failed(FailedAction::Write, target, errno);
-        }
         if (::renameat(dirFd_, name_.c_str(), dirFd_, targetName.c_str()) != 0) {
             return Failed(FailedAction::Replace, target, errno);
         }
         committed_ = true;
+        const int fd = fd_;
+        fd_ = -1;
+        if (::close(fd) != 0) {
+            return Failed(FailedAction::Write, target, errno);
+        }
         return Status::Ok();
     }
 
@@ -407,14 +412,60 @@ Status WriteFileAtomically(const fs::path& path, std::string_view content) {
     return temp.CommitAs(path.filename().string(), path);
 }
 
-bool RemoveIfStale(const fs::path& file) {
+FileUpdateLock::FileUpdateLock(const fs::path& path) {
+    // A writer replaces the file by renaming a new one over it, so the file locked may have been
+    // replaced by the time the lock is granted: then the new one is locked instead.
+    const auto giveUp = std::chrono::steady_clock::now() + std::chrono::seconds(5);
+    while (std::chrono::steady_clock::now() < giveUp) {
+        Fd fd(::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NOFOLLOW | O_NONBLOCK));
+        struct stat held {};
+        if (!fd.valid() || ::fstat(fd.get(), &held) != 0 || !S_ISREG(held.st_mode)) {
+            return;
+        }
+        while (::flock(fd.get(), LOCK_EX | LOCK_NB) != 0) {
+            if (errno != EWOULDBLOCK || std::chrono::steady_clock::now() >= giveUp) {
+                return;
+            }
+            std::this_thread::sleep_for(std::chrono::milliseconds(1));
+        }
+        struct stat named {};
+        if (::stat(path.c_str(), &named) == 0 && named.st_dev == held.st_dev &&
+            named.st_ino == held.st_ino) {
+            fd_ = fd.Release();
+            return;
+        }
+    }
+}
+
+FileUpdateLock::~FileUpdateLock() {
+    if (fd_ >= 0) {
+        ::close(fd_);
+    }
+}
+
+bool RemoveIfStale(const fs::path& file, std::chrono::seconds minimumAge) {
     Fd fd(::open(file.c_str(), O_RDONLY | O_CLOEXEC | O_NOFOLLOW | O_NONBLOCK));
     struct stat st {};
     if (fd.get() < 0 || ::fstat(fd.get(), &st) != 0 || !S_ISREG(st.st_mode)) {
         return false;
     }
+    // A writer creates its file and only then locks it: a file changed lately may be one whose
+    // lock is still to come. The change time counts, as a copy sets the modification time to its
+    // source's.
+    struct timespec now {};
+    ::clock_gettime(CLOCK_REALTIME, &now);
+    if (now.tv_sec - st.st_ctim.tv_sec < minimumAge.count()) {
+        return false;
+    }
     // The writer's lock goes with its process: a lock that can be taken has no writer.
     if (::flock(fd.get(), LOCK_EX | LOCK_NB) != 0) {
+        return false;
+    }
+    // The writer renames its file before it lets go of the lock, so the file locked here may
+    // since have reached its final name: then the temporary name is gone or names another file.
+    struct stat named {};
+    if (::lstat(file.c_str(), &named) != 0 || named.st_dev != st.st_dev ||
+        named.st_ino != st.st_ino) {
         return false;
     }
     return ::unlink(file.c_str()) == 0;

@@ -236,7 +236,8 @@ TEST_F(WindowTest, TrayIconAppearsWhenATrayStartsAndBringsTheHiddenWindowBack) {
     ASSERT_TRUE(WaitFor([] { return !FindTrayIcon().empty(); })) << Capture("xwininfo -root -tree");
 
     // "Chạy ẩn" under the tab heads hides the window; the hotkey still works meanwhile.
-    Capture("xdotool mousemove --window " + FindWindow(kWindowTitle, *kickvane) + " 50 275 click 1");
+    Capture("xdotool mousemove --window " + FindWindow(kWindowTitle, *kickvane) +
+            " 50 275 click 1");
     ASSERT_TRUE(WaitFor([] { return !WindowVisible(kWindowTitle); }));
     Capture("xdotool key F7");
     EXPECT_TRUE(WaitFor([&] { return fs::exists(applied()); }));
