@@ -205,12 +205,16 @@ TEST(TemporaryFiles, ASweepNeverRemovesTheFileOfASaveInProgress) {
         }
     });
     int failures = 0;
+    std::string firstFailure;
     for (int save = 0; save < 2000; ++save) {
-        failures += WriteFileAtomically(file, "save " + std::to_string(save)).ok() ? 0 : 1;
+        const Status saved = WriteFileAtomically(file, "save " + std::to_string(save));
+        if (!saved.ok() && failures++ == 0) {
+            firstFailure = saved.reason();
+        }
     }
     saving = false;
     sweeper.join();
-    EXPECT_EQ(failures, 0);
+    EXPECT_EQ(failures, 0) << firstFailure;
     EXPECT_EQ(ReadText(file), "save 1999");
 }
 
