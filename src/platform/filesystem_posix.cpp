@@ -57,6 +57,24 @@ int OpenFolder(const fs::path& folder) {
     return ::open(folder.empty() ? "." : folder.c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC);
 }
 
+// Gives the unnamed file `fd` the name `targetName` in the folder `dirFd`. Linking by descriptor
+// needs a privilege on kernels before 6.10; the descriptor's entry under /proc does not. Once
+// refused, the process goes to /proc straight away.
+bool LinkUnnamed(int fd, int dirFd, const std::string& targetName) {
+    static std::atomic<bool> byDescriptor{true};
+    if (byDescriptor.load(std::memory_order_relaxed)) {
+        if (::linkat(fd, "", dirFd, targetName.c_str(), AT_EMPTY_PATH) == 0) {
+            return true;
+        }
+        if (errno != EPERM && errno != ENOENT) {
+            return false;
+        }
+        byDescriptor.store(false, std::memory_order_relaxed);
+    }
+    const std::string self = "/proc/self/fd/" + std::to_string(fd);
+    return ::linkat(AT_FDCWD, self.c_str(), dirFd, targetName.c_str(), AT_SYMLINK_FOLLOW) == 0;
+}
+
 // A temporary file beside its final place, in the folder `dirFd`; removed unless it was renamed
 // into place. It holds an exclusive lock for its life, which tells RemoveIfStale that its writer
 // still runs.
@@ -64,6 +82,22 @@ class TempFile {
 public:
     TempFile(int dirFd, const std::string& targetName, mode_t mode) : dirFd_(dirFd) {
         const std::string prefix = TemporaryNamePrefix(targetName);
+        // Where the file system has unnamed files, the file is locked before it gets its name,
+        // so that no cleaner ever sees it unlocked.
+        if (Fd unnamed(::openat(dirFd, ".", O_TMPFILE | O_WRONLY | O_CLOEXEC, mode));
+            unnamed.valid() && ::flock(unnamed.get(), LOCK_EX) == 0) {
+            for (int attempt = 0; attempt < 16; ++attempt) {
+                std::string name = prefix + UniqueSuffix();
+                if (LinkUnnamed(unnamed.get(), dirFd, name)) {
+                    fd_ = unnamed.Release();
+                    name_ = std::move(name);
+                    return;
+                }
+                if (errno != EEXIST) {
+                    break;
+                }
+            }
+        }
         for (int attempt = 0; attempt < 16; ++attempt) {
             std::string name = prefix + UniqueSuffix();
             const int fd =
@@ -231,24 +265,6 @@ void TakeModeAndTimes(int out, const struct stat& st) {
     }
     const struct timespec times[2] = {st.st_atim, st.st_mtim};
     ::futimens(out, times);
-}
-
-// Gives the unnamed file `fd` the name `targetName` in the folder `dirFd`. Linking by descriptor
-// needs a privilege on kernels before 6.10; the descriptor's entry under /proc does not. Once
-// refused, the process goes to /proc straight away.
-bool LinkUnnamed(int fd, int dirFd, const std::string& targetName) {
-    static std::atomic<bool> byDescriptor{true};
-    if (byDescriptor.load(std::memory_order_relaxed)) {
-        if (::linkat(fd, "", dirFd, targetName.c_str(), AT_EMPTY_PATH) == 0) {
-            return true;
-        }
-        if (errno != EPERM && errno != ENOENT) {
-            return false;
-        }
-        byDescriptor.store(false, std::memory_order_relaxed);
-    }
-    const std::string self = "/proc/self/fd/" + std::to_string(fd);
-    return ::linkat(AT_FDCWD, self.c_str(), dirFd, targetName.c_str(), AT_SYMLINK_FOLLOW) == 0;
 }
 
 enum class NewFile { Written, Failed, Unsupported };
