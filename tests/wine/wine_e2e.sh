@@ -133,7 +133,9 @@ windows_of() {  # windows_of PID TITLE [--onlyvisible]
   xdotool search ${3:-} --pid "$1" --name "^$2\$" 2>/dev/null
 }
 find_window() { windows_of "$window_pid" 'Kickvane v2.0' | head -n 1; }
-window_shown() { [ -n "$(find_window)" ]; }
+# Wine gives a window's title to more than one X window of it; the one to focus is mapped.
+visible_window() { windows_of "$window_pid" 'Kickvane v2.0' --onlyvisible | head -n 1; }
+window_shown() { [ -n "$(visible_window)" ]; }
 notice_shown() { [ -n "$(windows_of "$second_pid" 'Thông báo')" ]; }
 game_has_more_files() { [ "$(files_in_game)" -gt "$before" ]; }
 fresh_game() {  # the running copy may still be writing: wait until the count stands still
@@ -149,7 +151,7 @@ window_pid=$!
 # The first window of a fresh Wine prefix waits for Wine's own set-up (fonts, desktop): allow more.
 WAIT_LIMIT=180 check "the window shows" wait_for window_shown
 echo "start to window under Wine: $(($(now_ms) - started)) ms"
-window=$(find_window)
+window=$(visible_window)
 focus_window() {
   xdotool windowactivate --sync "$window" 2>/dev/null || xdotool windowfocus --sync "$window"
 }
