@@ -16,11 +16,12 @@ work=$(mktemp -d)
 xvfb_pid=""
 window_pid=""
 second_pid=""
-cleanup() {
-  [ -n "$window_pid" ] && kill "$window_pid" 2>/dev/null
-  [ -n "$second_pid" ] && kill "$second_pid" 2>/dev/null
-  [ -n "$xvfb_pid" ] && kill "$xvfb_pid" 2>/dev/null
-  rm -rf "$work"
+cleanup() {  # ends what the test started; its own failure is no failure of the test
+  local pid
+  for pid in "$window_pid" "$second_pid" "$xvfb_pid"; do
+    [ -n "$pid" ] && kill "$pid" 2>/dev/null && wait "$pid" 2>/dev/null
+  done
+  rm -rf "$work" 2>/dev/null || true
 }
 trap cleanup EXIT
 
@@ -210,7 +211,12 @@ second_pid=$!
 check "a second start shows its notice" wait_for notice_shown
 kill "$second_pid" 2>/dev/null || true
 check "the first copy runs on" kill -0 "$window_pid"
-check "its window is still there" test -n "$(find_window)"
+# Hidden to the tray, a Wine window need not keep its process's _NET_WM_PID: the first copy's
+# class and title find it (the second copy has ended).
+first_copy_window() {
+  xdotool search --all --classname '^kickvane\.exe$' --name '^Kickvane v2\.0$' 2>/dev/null
+}
+check "its window is still there" test -n "$(first_copy_window)"
 
 if [ "$failures" -gt 0 ]; then
   echo "$failures checks failed"
