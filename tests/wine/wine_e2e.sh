@@ -214,7 +214,11 @@ check "the first copy runs on" kill -0 "$window_pid"
 # Hidden to the tray, a Wine window need not keep its process's _NET_WM_PID: the first copy's
 # class and title find it (the second copy has ended).
 first_copy_window() {
-  xdotool search --all --classname '^kickvane\.exe$' --name '^Kickvane v2\.0$' 2>/dev/null
+  local id
+  for id in $(xdotool search --classname '^kickvane\.exe$' 2>/dev/null); do
+    [ "$(xdotool getwindowname "$id" 2>/dev/null)" = 'Kickvane v2.0' ] && echo "$id" && return 0
+  done
+  return 1
 }
 check "its window is still there" test -n "$(first_copy_window)"
 
