@@ -231,8 +231,8 @@ std::vector<std::pair<std::string, std::string>> IniDocument::Entries(
     const std::string wanted_section = NormalizeName(section);
     std::vector<std::pair<std::string, std::string>> entries;
     bool in_section = wanted_section.empty();
-    for (const std::string& line : lines_) {
-        const ParsedLine parsed = ParseLine(line);
+    for (const Line& line : lines_) {
+        const ParsedLine parsed = ParseLine(line.text);
         if (parsed.kind == LineKind::kSection) {
             if (in_section) {
                 break;

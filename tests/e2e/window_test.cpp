@@ -58,7 +58,7 @@ protected:
         const std::string byOwner =
             owner ? " --pid " + std::to_string(owner->pid()) : std::string();
         std::string ids =
-            Capture("xdotool search" + byOwner + " --name '^" + title + "$' 2>/dev/null");
+            Capture("xdotool search --all" + byOwner + " --name '^" + title + "$' 2>/dev/null");
         return ids.substr(0, ids.find('\n'));
     }
     static std::string FindWindow(const std::string& title, const ChildProcess& owner) {
@@ -110,21 +110,21 @@ TEST_F(WindowTest, FailedStepsOverTheGameShowTheAlertAndItsClickTheList) {
     fs::remove_all(game() / "zdata");  // the ball's copy has nowhere to go
     WriteSettings("F7");
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle)) << ReadText(dir_ / "kickvane.log");
+    ASSERT_TRUE(WindowShown(kWindowTitle, *kickvane)) << ReadText(dir_ / "kickvane.log");
     auto focused = FocusOtherWindow();
-    const std::string gameWindow = FindWindow("the game");
+    const std::string gameWindow = FindWindow("the game", nullptr);
     Capture("xdotool key F7");
-    ASSERT_TRUE(WindowShown("Alert")) << ReadText(dir_ / "kickvane.log");
-    EXPECT_TRUE(fs::exists(applied()));  // the other steps went through
+    ASSERT_TRUE(WindowShown("Alert", *kickvane)) << ReadText(dir_ / "kickvane.log");
+    EXPECT_TRUE(fs::exists(applied())) << ReadText(dir_ / "kickvane.log");  // the others went through
     EXPECT_EQ(Capture("xdotool getwindowfocus"), gameWindow + "\n");
-    EXPECT_TRUE(FindWindow("Thông báo").empty());
+    EXPECT_TRUE(FindWindow("Thông báo", *kickvane).empty());
     // Once it has risen into its place.
     std::this_thread::sleep_for(std::chrono::milliseconds(1500));
-    SaveScreenshot(FindWindow("Alert"), "failure-alert.png");
+    SaveScreenshot(FindWindow("Alert", *kickvane), "failure-alert.png");
 
-    Capture("xdotool mousemove --window " + FindWindow("Alert") + " 20 20 click 1");
-    ASSERT_TRUE(WindowShown("Thông báo")) << ReadText(dir_ / "kickvane.log");
-    SaveScreenshot(FindWindow("Thông báo"), "failure-list.png");
+    Capture("xdotool mousemove --window " + FindWindow("Alert", *kickvane) + " 20 20 click 1");
+    ASSERT_TRUE(WindowShown("Thông báo", *kickvane)) << ReadText(dir_ / "kickvane.log");
+    SaveScreenshot(FindWindow("Thông báo", *kickvane), "failure-list.png");
     EXPECT_TRUE(kickvane->Running());
 }
 
@@ -261,8 +261,8 @@ TEST_F(WindowTest, AddedBallIsChosenSavedAndApplied) {
     WriteSettings("F7");
     WriteFile(tool() / u8"extras/Ball/Bóng Mới/textures/ball10.dds", "new ball");
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle)) << ReadText(dir_ / "kickvane.log");
-    const std::string window = FindWindow(kWindowTitle);
+    ASSERT_TRUE(WindowShown(kWindowTitle, *kickvane)) << ReadText(dir_ / "kickvane.log");
+    const std::string window = FindWindow(kWindowTitle, *kickvane);
     // The ball tab's head, then the fifth row's button (after the four catalog balls).
     Capture("xdotool mousemove --window " + window + " 50 125 click 1");
     Capture("xdotool mousemove --window " + window + " 131 243 click 1");

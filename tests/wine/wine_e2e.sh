@@ -133,7 +133,7 @@ before=$(files_in_game)
 # Windows are found by the process that owns them (Wine gives each its _NET_WM_PID), not by their
 # title alone: another program on the display may show a window of the same title.
 windows_of() {  # windows_of PID TITLE [--onlyvisible]
-  xdotool search ${3:-} --pid "$1" --name "^$2\$" 2>/dev/null
+  xdotool search --all ${3:-} --pid "$1" --name "^$2\$" 2>/dev/null
 }
 find_window() { windows_of "$window_pid" 'Kickvane v2.0' | head -n 1; }
 # Wine gives a window's title to more than one X window of it; the one to focus is mapped.
