@@ -43,6 +43,10 @@ StepOutcome RunStep(const PlanStep& step, const Roots& roots) {
                 return outcome;
             }
             status = MakeFolder(roots.Resolve(step.target));
+            if (!status && FolderExists(roots.Resolve(step.target))) {
+                outcome.state = StepState::NotNeeded;  // another program made it meanwhile
+                return outcome;
+            }
             break;
     }
     if (!status) {

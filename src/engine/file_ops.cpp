@@ -44,6 +44,19 @@ private:
     std::unordered_map<std::string, std::string> names_;
 };
 
+// Creates one folder. Another program (a second apply on the same game) may have created it
+// since the caller looked: a folder there now is what was wanted.
+Status MakeFolderIfMissing(const fs::path& folder) {
+    Status made = platform::MakeDirectory(folder);
+    return made || platform::IsDirectory(folder) ? Status::Ok() : made;
+}
+
+// A copy that failed because another program replaced the target meanwhile (a second apply of
+// the same sets) has nothing left to do when the target now equals its source.
+bool ReplacedByAnEqualCopy(const fs::path& source, const fs::path& target) {
+    return platform::IsUpToDateCopy(source, target);
+}
+
 Status CopyOne(const fs::path& source, const fs::path& target, CopyCount* count) {
     if (platform::IsUpToDateCopy(source, target)) {
         if (count) {
@@ -52,6 +65,9 @@ Status CopyOne(const fs::path& source, const fs::path& target, CopyCount* count)
         return Status::Ok();
     }
     Status status = platform::ReplaceFile(source, target);
+    if (!status && ReplacedByAnEqualCopy(source, target)) {
+        status = Status::Ok();
+    }
     if (status && count) {
         ++count->copied;
     }
@@ -75,8 +91,9 @@ unsigned CopyWorkers(size_t files) {
 
 // Copies the files of one folder, several at once where there are many. On a failure no further
 // file is started, and the failure of the first file in name order among those tried is returned.
-Status CopyFiles(platform::FolderCopy& files, const std::vector<FileJob>& jobs, bool oneByOne,
-                 CopyCount* count) {
+Status CopyFiles(const fs::path& source, const fs::path& target, const std::vector<FileJob>& jobs,
+                 bool oneByOne, CopyCount* count) {
+    platform::FolderCopy files(source, target);  // both folders opened once for all files
     std::atomic<size_t> next{0};
     std::atomic<bool> stop{false};
     std::atomic<int> copied{0};
@@ -93,6 +110,11 @@ Status CopyFiles(platform::FolderCopy& files, const std::vector<FileJob>& jobs, 
             bool wasCopied = false;
             Status status = files.Copy(jobs[i].sourceName, jobs[i].targetName, jobs[i].targetExists,
                                        &wasCopied);
+            if (!status &&
+                ReplacedByAnEqualCopy(source / platform::PathFromUtf8(jobs[i].sourceName),
+                                      target / platform::PathFromUtf8(jobs[i].targetName))) {
+                status = Status::Ok();
+            }
             if (!status) {
                 const std::lock_guard lock(failureMutex);
                 if (i < failedAt) {
@@ -151,17 +173,14 @@ Status CopyTree(const fs::path& source, const fs::path& target, CopyCount* count
     std::sort(jobs.begin(), jobs.end(),
               [](const FileJob& a, const FileJob& b) { return a.sourceName < b.sourceName; });
     std::sort(folders.begin(), folders.end());
-    {
-        platform::FolderCopy files(source, target);  // both folders opened once for all files
-        if (Status copied = CopyFiles(files, jobs, namesCollide, count); !copied) {
-            return copied;
-        }
+    if (Status copied = CopyFiles(source, target, jobs, namesCollide, count); !copied) {
+        return copied;
     }
     for (const std::string& name : folders) {
         const auto [targetName, exists] = index.Name(name);
         const fs::path into = target / platform::PathFromUtf8(targetName);
         if (!exists || !platform::IsDirectory(into)) {
-            if (Status made = platform::MakeDirectory(into); !made) {
+            if (Status made = MakeFolderIfMissing(into); !made) {
                 return made;
             }
         }
@@ -193,7 +212,7 @@ Status MergeCopy(const fs::path& source, const fs::path& target, CopyCount* coun
         if (!platform::IsDirectory(into.parent_path())) {
             return NotFound(FailedAction::CopyInto, into);
         }
-        if (Status made = platform::MakeDirectory(into); !made) {
+        if (Status made = MakeFolderIfMissing(into); !made) {
             return made;
         }
     }

@@ -153,11 +153,11 @@ bool IsTemporaryName(std::string_view name) {
     });
 }
 
-void RemoveStaleTemporaries(const fs::path& folder) {
+void RemoveStaleTemporaries(const fs::path& folder, std::chrono::seconds minimumAge) {
     std::error_code ec;
     for (fs::directory_iterator it(folder, ec), end; !ec && it != end; it.increment(ec)) {
         if (IsTemporaryName(it->path().filename().string())) {
-            RemoveIfStale(it->path());
+            RemoveIfStale(it->path(), minimumAge);
         }
     }
 }

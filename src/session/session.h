@@ -27,6 +27,10 @@ std::string FailureAlertText(size_t failures);
 
 // Texts of the corner popups that confirm an action.
 inline constexpr std::string_view kSavedPopupText = "Đã lưu thiết lập!";
+// After a save over a settings file that could not be read: the old file was kept beside it.
+inline constexpr std::string_view kSavedKeepingOldPopupText =
+    "Đã lưu thiết lập!\nTệp cũ không đọc được, đã giữ lại thành ThietLap.ini.bak";
+inline constexpr std::string_view kSettingsBackupName = "ThietLap.ini.bak";
 inline constexpr std::string_view kHiddenPopupText = "Ẩn xuống khay hệ thống!";
 // Said instead where no tray is up: the window minimises, since hidden it could not come back.
 inline constexpr std::string_view kNoTrayPopupText = "Không có khay hệ thống: đã thu nhỏ cửa sổ!";
@@ -133,6 +137,9 @@ public:
 
     ApplyRun Apply();
     std::vector<engine::PlanStep> Plan() const;
+    // Writes the settings file. When it could not be read at the start, the first save keeps
+    // the old file as "ThietLap.ini.bak" (replacing an older one) and says so; without that copy
+    // nothing is written.
     Outcome Save();
     LaunchRun Launch(LaunchFrom from);
     // Loads from `chosen`, or from the folder chosen last time when the user picked none.

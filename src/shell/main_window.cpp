@@ -4,6 +4,8 @@
 #include <QCloseEvent>
 #include <QPainter>
 #include <QTime>
+#include <QTimer>
+#include <utility>
 
 #include "engine/run_summary.h"
 #include "platform/filesystem.h"
@@ -203,16 +205,27 @@ void MainWindow::pollHotkey() {
         applying_ = true;
         showRun(*run);
         applying_ = false;
+        runAgainIfAsked();
+    }
+}
+
+void MainWindow::runAgainIfAsked() {
+    if (std::exchange(applyAgain_, false)) {
+        QTimer::singleShot(0, this, [this] { applyPatchesNow(); });
     }
 }
 
 void MainWindow::applyPatchesNow() {
     if (applying_) {
-        return;  // A run and its messages finish before the next one starts.
+        // A run and its messages finish before the next one starts; a request meanwhile (the
+        // messages' dialogs keep events flowing) runs once after it, however many came.
+        applyAgain_ = true;
+        return;
     }
     applying_ = true;
     showRun(session_.Apply());
     applying_ = false;
+    runAgainIfAsked();
 }
 
 void MainWindow::showRun(const session::ApplyRun& run) {

@@ -49,8 +49,11 @@ public:
     UpdateFlow& updateFlow() { return *updateFlow_; }
     const FadeModel& fade() const { return fade_; }
 
-    // Applies the chosen sets now, as a hotkey press does; ignored while a run and its messages
-    // are still going on.
+    // Ends the tool as "Thoát" in the tray menu does: the tray icon goes, nothing is saved.
+    void exitFromTray();
+
+    // Applies the chosen sets now, as a hotkey press does. Asked while a run and its messages
+    // are still going on, it runs once after them.
     void applyPatchesNow();
     // One tick of the hotkey poll.
     void pollHotkey();
@@ -78,6 +81,8 @@ private:
     void showRun(const session::ApplyRun& run);
     // The failures of the last run that reported them by the corner alert.
     void showLastFailures();
+    // Starts the run that applyPatchesNow was asked for during the one that just ended.
+    void runAgainIfAsked();
     void saveSettings();
     void launchGame(session::LaunchFrom from);
     void quickLoad();
@@ -89,7 +94,6 @@ private:
     // "Hiện chương trình": shows the window and fades it in.
     void showFromTray();
     // "Thoát": the tray icon goes first, then the program ends.
-    void exitFromTray();
 
     void connectPanels();
     void connectButtons();
@@ -119,6 +123,7 @@ private:
     QTimer hotkeyTimer_;
     bool applying_ = false;
     std::optional<text::Message> lastFailures_;
+    bool applyAgain_ = false;  // applyPatchesNow was asked for during a run
 };
 
 }  // namespace kickvane::shell

@@ -8,6 +8,7 @@
 
 #include "platform/single_instance.h"
 #include "platform/sound.h"
+#include "platform/stop_signals.h"
 #include "popup/popup_model.h"
 #include "shell/dialogs.h"
 #include "shell/main_window.h"
@@ -83,11 +84,14 @@ int RunWindow(int& argc, char** argv, const std::filesystem::path& toolFolder) {
 
     // Commands from later starts: "kickvane trigger" applies the sets as the hotkey does. Where
     // the command channel has no descriptor to watch, it is asked on a timer instead.
+    // Triggers that waited together (sent while the window was busy) make one run.
     auto takeCommands = [&] {
+        bool triggered = false;
         while (const std::optional<std::string> command = instance->TakeCommand()) {
-            if (*command == kTriggerCommand) {
-                window.applyPatchesNow();
-            }
+            triggered = triggered || *command == kTriggerCommand;
+        }
+        if (triggered) {
+            window.applyPatchesNow();
         }
     };
     std::unique_ptr<QSocketNotifier> commandNotifier;
@@ -99,6 +103,15 @@ int RunWindow(int& argc, char** argv, const std::filesystem::path& toolFolder) {
     } else {
         QObject::connect(&commandTimer, &QTimer::timeout, &window, takeCommands);
         commandTimer.start(200);
+    }
+
+    // SIGTERM, SIGINT and SIGHUP end the tool as "Thoát" does: the tray icon and the command
+    // socket go, nothing is saved.
+    std::unique_ptr<QSocketNotifier> stopNotifier;
+    if (const int stopRequests = platform::WatchStopRequests(); stopRequests >= 0) {
+        stopNotifier = std::make_unique<QSocketNotifier>(stopRequests, QSocketNotifier::Read);
+        QObject::connect(stopNotifier.get(), &QSocketNotifier::activated, &window,
+                         [&window] { window.exitFromTray(); });
     }
 
     CentreOnScreen(window);
