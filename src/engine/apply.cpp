@@ -65,11 +65,11 @@ std::vector<StepOutcome> ApplyOutcome::Failures() const {
 }
 
 std::string ToolDataMissingText(const Roots& roots) {
-    return "Khong tim thay: " + roots.toolData.string() + "\r\nKiem tra lai duong dan";
+    return "Khong tim thay: " + platform::PathToUtf8(roots.toolData) + "\r\nKiem tra lai duong dan";
 }
 
 std::string ToolDataTooLongText(const Roots& roots) {
-    return "Duong dan qua dai: " + roots.toolData.string() + "\r\nKiem tra lai duong dan";
+    return "Duong dan qua dai: " + platform::PathToUtf8(roots.toolData) + "\r\nKiem tra lai duong dan";
 }
 
 std::filesystem::path SignalSoundPath(const std::filesystem::path& toolFolder) {
