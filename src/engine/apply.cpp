@@ -69,7 +69,8 @@ std::string ToolDataMissingText(const Roots& roots) {
 }
 
 std::string ToolDataTooLongText(const Roots& roots) {
-    return "Duong dan qua dai: " + platform::PathToUtf8(roots.toolData) + "\r\nKiem tra lai duong dan";
+    return "Duong dan qua dai: " + platform::PathToUtf8(roots.toolData) +
+           "\r\nKiem tra lai duong dan";
 }
 
 std::filesystem::path SignalSoundPath(const std::filesystem::path& toolFolder) {

@@ -209,8 +209,9 @@ Status CopyFileInto(const fs::path& file, const fs::path& folder, CopyCount* cou
     if (!platform::IsDirectory(into)) {
         return NotFound(FailedAction::CopyInto, into);
     }
-    const fs::path target = platform::FindEntryIgnoringCase(into, platform::PathToUtf8(from.filename()))
-                                .value_or(into / from.filename());
+    const fs::path target =
+        platform::FindEntryIgnoringCase(into, platform::PathToUtf8(from.filename()))
+            .value_or(into / from.filename());
     return CopyOne(from, target, count);
 }
 

@@ -82,8 +82,8 @@ template <typename Visit>
 void ForEachEntry(const fs::path& folder, Visit&& visit) {
     WIN32_FIND_DATAW entry;
     const std::wstring pattern = (folder / L"*").wstring();
-    HANDLE find = FindFirstFileExW(pattern.c_str(), FindExInfoBasic, &entry,
-                                   FindExSearchNameMatch, nullptr, FIND_FIRST_EX_LARGE_FETCH);
+    HANDLE find = FindFirstFileExW(pattern.c_str(), FindExInfoBasic, &entry, FindExSearchNameMatch,
+                                   nullptr, FIND_FIRST_EX_LARGE_FETCH);
     if (find == INVALID_HANDLE_VALUE) {
         return;
     }
@@ -260,8 +260,7 @@ private:
                 }
                 return true;
             }
-            if (!platform::NamesEqualIgnoringCase(platform::PathToUtf8(path.extension()),
-                                                  ".lnk")) {
+            if (!platform::NamesEqualIgnoringCase(platform::PathToUtf8(path.extension()), ".lnk")) {
                 return true;
             }
             const fs::path target = LinkTarget(path);
@@ -305,9 +304,8 @@ private:
             Add(root, "drive " + platform::PathToUtf8(root));
         }
         std::vector<std::string> top;
-        bool within = VisitFolders(root, [&](const std::wstring& name) {
-            top.push_back(platform::WideToUtf8(name));
-        });
+        bool within = VisitFolders(
+            root, [&](const std::wstring& name) { top.push_back(platform::WideToUtf8(name)); });
         std::deque<std::pair<fs::path, int>> queue;
         for (const std::string& name : OrderDriveFolders(std::move(top))) {
             queue.emplace_back(root / platform::PathFromUtf8(name), 1);

@@ -13,10 +13,10 @@ TEST(CompleteUtf8Length, HoldsBackOnlyALetterCutAtTheEnd) {
     EXPECT_EQ(CompleteUtf8Length(viet.substr(0, 3)), 2u);
     EXPECT_EQ(CompleteUtf8Length(viet.substr(0, 4)), 2u);
     EXPECT_EQ(CompleteUtf8Length(viet.substr(0, 5)), 5u);
-    EXPECT_EQ(CompleteUtf8Length("\xF0\x9F\x98"), 0u);       // an emoji short of one byte
-    EXPECT_EQ(CompleteUtf8Length("ab\xC3"), 2u);             // "ô" short of one byte
+    EXPECT_EQ(CompleteUtf8Length("\xF0\x9F\x98"), 0u);        // an emoji short of one byte
+    EXPECT_EQ(CompleteUtf8Length("ab\xC3"), 2u);              // "ô" short of one byte
     EXPECT_EQ(CompleteUtf8Length("ab\x80\x80\x80\x80"), 6u);  // stray continuation bytes
-    EXPECT_EQ(CompleteUtf8Length("ab\xFF"), 3u);             // no letter begins so
+    EXPECT_EQ(CompleteUtf8Length("ab\xFF"), 3u);              // no letter begins so
     EXPECT_EQ(CompleteUtf8Length(""), 0u);
 }
 

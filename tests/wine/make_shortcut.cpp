@@ -49,8 +49,8 @@ int main() {
     }
     CoUninitialize();
     if (saved) {
-        const int size = WideCharToMultiByte(CP_UTF8, 0, link.c_str(), -1, nullptr, 0, nullptr,
-                                             nullptr);
+        const int size =
+            WideCharToMultiByte(CP_UTF8, 0, link.c_str(), -1, nullptr, 0, nullptr, nullptr);
         std::string utf8(static_cast<size_t>(size), '\0');
         WideCharToMultiByte(CP_UTF8, 0, link.c_str(), -1, utf8.data(), size, nullptr, nullptr);
         std::printf("%s\n", utf8.c_str());
