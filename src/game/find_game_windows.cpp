@@ -111,7 +111,9 @@ private:
     bool ok_;
 };
 
-// The program a shortcut starts; empty when it cannot be read.
+// The program a shortcut starts; empty when it cannot be read. The link's item list comes first:
+// it holds the whole name, where the path text that some shells keep beside it is in the ANSI
+// code page (Wine's GetPath answers with that one, "?" for each Vietnamese letter).
 fs::path LinkTarget(const fs::path& link) {
     IShellLinkW* shellLink = nullptr;
     if (FAILED(CoCreateInstance(CLSID_ShellLink, nullptr, CLSCTX_INPROC_SERVER, IID_IShellLinkW,
@@ -122,10 +124,18 @@ fs::path LinkTarget(const fs::path& link) {
     IPersistFile* file = nullptr;
     if (SUCCEEDED(shellLink->QueryInterface(IID_IPersistFile, reinterpret_cast<void**>(&file)))) {
         std::array<wchar_t, 32768> path{};
-        if (SUCCEEDED(file->Load(link.c_str(), STGM_READ)) &&
-            shellLink->GetPath(path.data(), static_cast<int>(path.size()), nullptr, 0) == S_OK) {
-            target = path.data();
+        PIDLIST_ABSOLUTE items = nullptr;
+        if (SUCCEEDED(file->Load(link.c_str(), STGM_READ))) {
+            if (SUCCEEDED(shellLink->GetIDList(&items)) && items != nullptr &&
+                SHGetPathFromIDListEx(items, path.data(), static_cast<DWORD>(path.size()),
+                                      GPFIDL_DEFAULT)) {
+                target = path.data();
+            } else if (shellLink->GetPath(path.data(), static_cast<int>(path.size()), nullptr,
+                                          0) == S_OK) {
+                target = path.data();
+            }
         }
+        CoTaskMemFree(items);
         file->Release();
     }
     shellLink->Release();

@@ -9,12 +9,12 @@ namespace {
 using WindowPathsTest = WindowFixture;
 
 TEST_F(WindowPathsTest, QuickLoadCopiesFromAVietnameseFolderAndOpensThereNextTime) {
-    const fs::path toolFolder = dir_ / platform::PathFromUtf8("Công cụ");
-    const fs::path faces = dir_ / platform::PathFromUtf8("Khuôn mặt");
+    const fs::path toolFolder = dir_ / "Công cụ";
+    const fs::path faces = dir_ / "Khuôn mặt";
     fs::create_directories(toolFolder / "data/data2/players/heads/textures");
     fs::create_directories(faces);
     WriteFile(faces / "face1.dds", "face");
-    const QString facesText = QStringLiteral("%1/Khuôn mặt").arg(shell::PathToQString(dir_));
+    const QString facesText = QStringLiteral("%1/Khuôn mặt").arg(shell::PathToQString(dir_.path()));
     auto window = Open(toolFolder);
 
     dialogs_.folders = {facesText, std::nullopt};
@@ -29,7 +29,7 @@ TEST_F(WindowPathsTest, QuickLoadCopiesFromAVietnameseFolderAndOpensThereNextTim
 
 TEST_F(WindowPathsTest, PathsAndTextRoundTripThroughQt) {
     for (const char* name : {"Khuôn mặt", "Sân vận động", "Cổ động viên", "ASCII"}) {
-        const fs::path path = dir_ / platform::PathFromUtf8(name);
+        const fs::path path = dir_ / name;
         const QString text = shell::PathToQString(path);
         EXPECT_TRUE(text.endsWith(QString::fromUtf8(name))) << name;
         EXPECT_EQ(shell::QStringToPath(text), path) << name;
