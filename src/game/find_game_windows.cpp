@@ -130,8 +130,8 @@ fs::path LinkTarget(const fs::path& link) {
                 SHGetPathFromIDListEx(items, path.data(), static_cast<DWORD>(path.size()),
                                       GPFIDL_DEFAULT)) {
                 target = path.data();
-            } else if (shellLink->GetPath(path.data(), static_cast<int>(path.size()), nullptr,
-                                          0) == S_OK) {
+            } else if (shellLink->GetPath(path.data(), static_cast<int>(path.size()), nullptr, 0) ==
+                       S_OK) {
                 target = path.data();
             }
         }
