@@ -1,7 +1,8 @@
 #!/usr/bin/env bash
 # Makes build/windows/kickvane-<version>-windows.zip from the Windows build: kickvane.exe and its
-# console companion kickvane.com (without their symbols) and the tool folder beside it, with a short read-me in Vietnamese (DOC-TOI.txt, "read me"). The settings
-# file of the build's own runs is left out: a player's copy starts with none.
+# console companion kickvane.com (without their symbols) and the tool folder beside them, with a
+# short read-me in Vietnamese (DOC-TOI.txt, "read me"). The settings file of the build's own runs
+# is left out: a player's copy starts with none.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 
