@@ -37,7 +37,7 @@ check "standard input reaches the program" test "$(cat "$work/in.txt")" = "Thôn
 code=0
 wine "$com" no-such-command >"$work/out.txt" 2>"$work/err.txt" || code=$?
 check "the program's exit code comes back" test "$code" = 2
-check "error output comes back" grep -q "unknown command no-such-command" "$work/err.txt"
+check "error output comes back" grep -q "không có lệnh no-such-command" "$work/err.txt"
 
 # In a console: script(1) gives Wine a terminal, which Wine makes its console; the code page stays
 # Wine's default (not UTF-8), so only text written through the wide console functions arrives
@@ -55,8 +55,8 @@ in_console() {  # in_console OUTPUT ARGS...
 in_console "$work/console.txt" vni "Vie65t Nam - Co6ng cu5 - Ho65i"
 check "Vietnamese shows whole in a console" grep -q "Việt Nam - Công cụ - Hội" "$work/console.txt"
 in_console "$work/console-error.txt" no-such-command
-check "error output shows in a console" \
-  grep -q "unknown command no-such-command" "$work/console-error.txt"
+check "Vietnamese error output shows whole in a console" \
+  grep -q "không có lệnh no-such-command" "$work/console-error.txt"
 
 if [ "$failures" != 0 ]; then
   echo "--- console output:"; od -c "$work/console.txt" | head -20
