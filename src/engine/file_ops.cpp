@@ -26,7 +26,7 @@ public:
     explicit FolderIndex(const fs::path& folder) : names_(platform::EntriesByFoldedName(folder)) {
         std::erase_if(names_, [&folder](const auto& entry) {
             return platform::IsTemporaryName(entry.second) &&
-                   platform::RemoveIfStale(folder / entry.second);
+                   platform::RemoveIfStale(folder / platform::PathFromUtf8(entry.second));
         });
     }
 
@@ -156,7 +156,7 @@ Status CopyTree(const fs::path& source, const fs::path& target, CopyCount* count
     std::error_code ec;
     const FolderIndex index(target);
     for (fs::directory_iterator it(source, ec), end; !ec && it != end; it.increment(ec)) {
-        std::string name = it->path().filename().string();
+        std::string name = platform::PathToUtf8(it->path().filename());
         std::error_code typeError;
         if (it->is_directory(typeError)) {
             folders.push_back(std::move(name));
@@ -228,8 +228,9 @@ Status CopyFileInto(const fs::path& file, const fs::path& folder, CopyCount* cou
     if (!platform::IsDirectory(into)) {
         return NotFound(FailedAction::CopyInto, into);
     }
-    const fs::path target = platform::FindEntryIgnoringCase(into, from.filename().string())
-                                .value_or(into / from.filename());
+    const fs::path target =
+        platform::FindEntryIgnoringCase(into, platform::PathToUtf8(from.filename()))
+            .value_or(into / from.filename());
     return CopyOne(from, target, count);
 }
 

@@ -93,7 +93,7 @@ QString FolderDialogStart(const QString& wanted) {
     if (!text.isEmpty()) {
         // A relative text would name a folder under the program's working folder, which is
         // nowhere the user has been.
-        fs::path folder = platform::NativePathFromUserText(text.toStdString());
+        fs::path folder = platform::NativePathFromUserText(ToUtf8(text));
         while (folder.is_absolute()) {
             const fs::path existing = platform::ResolveCaseInsensitive(folder);
             if (platform::IsDirectory(existing)) {

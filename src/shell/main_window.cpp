@@ -314,18 +314,27 @@ void MainWindow::startFade(int target, int step) {
 
 void MainWindow::fadeTick() {
     const FadeModel::Tick tick = fade_.Step();
-    setWindowOpacity(tick.alpha / 255.0);
+    setAlpha(tick.alpha);
     if (tick.ended) {
         fadeTimer_.stop();
         QApplication::beep();
     }
 }
 
+void MainWindow::setAlpha(int alpha) {
+    // On Windows a window at full opacity stops being a layered window, and Wine without a window
+    // manager then draws another kind of title bar than for the translucent one. Full opacity
+    // stays a hair below 1 there, which the system rounds to opaque, so the window stays layered
+    // and keeps one title bar.
+    static const bool staysLayered = QGuiApplication::platformName() == QLatin1String("windows");
+    setWindowOpacity(alpha >= 255 && staysLayered ? 0.999 : alpha / 255.0);
+}
+
 TranslucentResult MainWindow::makeTranslucent(int alpha) {
     if (alpha < 0 || alpha > 255) {
         return TranslucentResult::OutOfRange;
     }
-    setWindowOpacity(alpha / 255.0);
+    setAlpha(alpha);
     return TranslucentResult::Applied;
 }
 

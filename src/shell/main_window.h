@@ -89,6 +89,8 @@ private:
     void browseGameFolder();
     // Starts a fade of the window's opacity towards `target` by `step` every 20 ms.
     void startFade(int target, int step);
+    // Sets the window's opacity, 0 to 255.
+    void setAlpha(int alpha);
     // "Chạy ẩn": fades towards 150, hides to the tray and says so.
     void runHidden();
     // "Hiện chương trình": shows the window and fades it in.

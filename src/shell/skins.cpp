@@ -65,7 +65,7 @@ WindowSkins::WindowSkins(std::filesystem::path toolFolder, CatalogPanels& panels
 
 QString WindowSkins::skinFile(const QString& skin, const QString& suffix) const {
     return PathToQString(
-        platform::ResolveCaseInsensitive(toolFolder_ / "skin" / ToUtf8(skin + suffix)));
+        platform::ResolveCaseInsensitive(toolFolder_ / "skin" / QStringToPath(skin + suffix)));
 }
 
 void WindowSkins::initialise() {
