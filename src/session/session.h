@@ -134,6 +134,10 @@ public:
 
     // One tick of the hotkey poll: applies the patches when the key was pressed.
     std::optional<ApplyRun> PollHotkey();
+    // When to tick: on every readable event of the descriptor (-1: none), and on the poll's
+    // interval while HotkeyNeedsTicks() says so.
+    int HotkeyWakeDescriptor() const { return poll_.wakeDescriptor(); }
+    bool HotkeyNeedsTicks() const { return poll_.needsTicks(); }
 
     ApplyRun Apply();
     std::vector<engine::PlanStep> Plan() const;

@@ -76,9 +76,15 @@ MainWindow::MainWindow(session::Session& session, ShellServices services, QWidge
     connectTray();
     tray_->icon().Add();
 
+    // The hotkey is sampled when a key event arrives and, while it is held (or where no events
+    // come), on the poll's interval; an idle tool sleeps.
     hotkeyTimer_.setInterval(engine::HotkeyPoll::kInterval);
     connect(&hotkeyTimer_, &QTimer::timeout, this, &MainWindow::pollHotkey);
-    hotkeyTimer_.start();
+    if (const int wake = session_.HotkeyWakeDescriptor(); wake >= 0) {
+        hotkeyWake_ = std::make_unique<QSocketNotifier>(wake, QSocketNotifier::Read);
+        connect(hotkeyWake_.get(), &QSocketNotifier::activated, this, &MainWindow::pollHotkey);
+    }
+    pollHotkey();
 
     updateFlow_ = std::make_unique<UpdateFlow>(services_.updates, session_.toolFolder(),
                                                *services_.dialogs, this, buttons_->checkUpdate(),
@@ -201,11 +207,12 @@ void MainWindow::pollHotkey() {
     if (applying_) {
         return;
     }
-    if (std::optional<session::ApplyRun> run = session_.PollHotkey()) {
-        applying_ = true;
-        showRun(*run);
-        applying_ = false;
-        runAgainIfAsked();
+    std::optional<session::ApplyRun> run = session_.PollHotkey();
+    if (session_.HotkeyNeedsTicks() != hotkeyTimer_.isActive()) {
+        session_.HotkeyNeedsTicks() ? hotkeyTimer_.start() : hotkeyTimer_.stop();
+    }
+    if (run) {
+        showRunAlone(*run);
     }
 }
 
@@ -222,8 +229,20 @@ void MainWindow::applyPatchesNow() {
         applyAgain_ = true;
         return;
     }
+    showRunAlone(session_.Apply());
+}
+
+void MainWindow::showRunAlone(const session::ApplyRun& run) {
+    // A run's box may wait for the user; key events meanwhile stay queued (the wake is off, or it
+    // would fire again and again), and a press among them counts once the box is closed.
     applying_ = true;
-    showRun(session_.Apply());
+    if (hotkeyWake_) {
+        hotkeyWake_->setEnabled(false);
+    }
+    showRun(run);
+    if (hotkeyWake_) {
+        hotkeyWake_->setEnabled(true);
+    }
     applying_ = false;
     runAgainIfAsked();
 }

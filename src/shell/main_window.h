@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QSocketNotifier>
 #include <QTimer>
 #include <QWidget>
 #include <filesystem>
@@ -79,6 +80,7 @@ private:
     // window is in front; over another program (the game) they show as the corner alert, which
     // takes no focus and whose click, like the tray entry, opens the list.
     void showRun(const session::ApplyRun& run);
+    void showRunAlone(const session::ApplyRun& run);  // no other run starts meanwhile
     // The failures of the last run that reported them by the corner alert.
     void showLastFailures();
     // Starts the run that applyPatchesNow was asked for during the one that just ended.
@@ -122,7 +124,8 @@ private:
 
     FadeModel fade_;
     QTimer fadeTimer_;
-    QTimer hotkeyTimer_;
+    QTimer hotkeyTimer_;  // runs only while the key needs polling (held, or no key events)
+    std::unique_ptr<QSocketNotifier> hotkeyWake_;  // key events; null where none come
     bool applying_ = false;
     std::optional<text::Message> lastFailures_;
     bool applyAgain_ = false;  // applyPatchesNow was asked for during a run
