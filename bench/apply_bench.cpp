@@ -263,11 +263,10 @@ Ratios RunCase(const std::string& name, const fs::path& work, const fs::path& to
 }  // namespace
 
 int main(int argc, char** argv) {
-    const fs::path work = argc > 1
-                              ? fs::path(argv[1]) / ("kickvane-bench-" +
-                                                     std::to_string(std::random_device()()))
-                              : fs::temp_directory_path() /
-                                    ("kickvane-bench-" + std::to_string(std::random_device()()));
+    const fs::path work =
+        argc > 1 ? fs::path(argv[1]) / ("kickvane-bench-" + std::to_string(std::random_device()()))
+                 : fs::temp_directory_path() /
+                       ("kickvane-bench-" + std::to_string(std::random_device()()));
     fs::create_directories(work);
     const fs::path realistic = work / "tool";
     const fs::path small = work / "tool-small";
@@ -275,10 +274,9 @@ int main(int argc, char** argv) {
     const std::pair<std::string, Ratios> cases[] = {
         {"every category",
          RunCase("every category", work, realistic, MakeToolFolder(realistic), EverythingOn(), 6)},
-        {"8,000 small files",
-         RunCase("8,000 small files (Face, Kit, Boots, Logo)", work, small,
-                 MakeSmallFilesToolFolder(small), OnlyCategories({"Face", "Giay", "Kit", "Logo"}),
-                 6)},
+        {"8,000 small files", RunCase("8,000 small files (Face, Kit, Boots, Logo)", work, small,
+                                      MakeSmallFilesToolFolder(small),
+                                      OnlyCategories({"Face", "Giay", "Kit", "Logo"}), 6)},
         {"2,000 files in 400 folders",
          RunCase("2,000 small files in 400 folders (Kit)", work, folders,
                  MakeManyFoldersToolFolder(folders), OnlyCategories({"Kit"}), 6)},
