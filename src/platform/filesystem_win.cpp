@@ -35,12 +35,17 @@ fs::path TemporaryBeside(const fs::path& target) {
 }
 
 // Windows refuses to replace a file that another program holds open with "access denied", as it
-// does a file that may not be written. Opening the file for deletion tells the two apart: a held
-// file answers with a sharing violation.
+// does a file that may not be written and a folder in the file's place. A folder is told by its
+// attributes; opening the file for deletion tells the other two apart: a held file answers with a
+// sharing violation.
 std::error_code ReplaceError(const fs::path& target) {
     const std::error_code denied = LastError();
     if (denied.value() != ERROR_ACCESS_DENIED) {
         return denied;
+    }
+    const DWORD attributes = ::GetFileAttributesW(target.c_str());
+    if (attributes != INVALID_FILE_ATTRIBUTES && (attributes & FILE_ATTRIBUTE_DIRECTORY) != 0) {
+        return std::make_error_code(std::errc::is_a_directory);
     }
     HANDLE probe = ::CreateFileW(target.c_str(), DELETE, FILE_SHARE_READ | FILE_SHARE_WRITE,
                                  nullptr, OPEN_EXISTING, FILE_ATTRIBUTE_NORMAL, nullptr);

@@ -199,19 +199,25 @@ TEST(MergeCopy, TreeOfManySmallFoldersIsCopiedWholeInTheOrderOfOneAtATime) {
             WriteFile(dir / "src" / name(f) / "sub" / ("s" + std::to_string(i) + ".dds"), "s");
         }
     }
-    // Two names of one file where letter case is ignored: the last in name order wins.
+#ifndef _WIN32
+    // Two names of one file where letter case is ignored (the source lies on a file system that
+    // tells them apart): the last in name order wins.
     WriteFile(dir / "src/f07/T0.DDS", "upper");
+    constexpr int kCollisions = 1;
+#else
+    constexpr int kCollisions = 0;
+#endif
     CopyCount count;
     ASSERT_TRUE(MergeCopy(dir / "src", dir / "dst", &count).ok());
-    EXPECT_EQ(count.copied, 60 * 8 + 1);
+    EXPECT_EQ(count.copied, 60 * 8 + kCollisions);
     EXPECT_EQ(ReadText(dir / "dst/f59/sub/s3.dds"), "s");
     EXPECT_EQ(ReadText(dir / "dst/f31/t2.dds"), "f31");
     // Again: both names now land on the first spelling, and the last in name order wins.
     count = {};
     ASSERT_TRUE(MergeCopy(dir / "src", dir / "dst", &count).ok());
     EXPECT_EQ(count.upToDate, 60 * 8);
-    EXPECT_EQ(count.copied, 1);
-    EXPECT_EQ(ReadText(dir / "dst/f07/T0.DDS"), "f07");
+    EXPECT_EQ(count.copied, kCollisions);
+    EXPECT_EQ(ReadText(dir / (kCollisions ? "dst/f07/T0.DDS" : "dst/f07/t0.dds")), "f07");
 
 #ifndef _WIN32
     // The first failure in that order is reported: a subfolder's file before a later folder's.
