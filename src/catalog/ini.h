@@ -62,7 +62,7 @@ public:
     // The file's bytes in the document's encoding, every line ended by CR LF.
     std::string Serialize() const;
 
-    IniEncoding encoding() const { return encoding_; }
+    IniEncoding Encoding() const { return encoding_; }
 
     // Writes the document over the file found under `file` in any letter case (or creates it),
     // atomically: on failure the previous file stays as it was.

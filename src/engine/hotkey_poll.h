@@ -25,7 +25,7 @@ public:
     // and returns false.
     bool SetHotkey(std::string_view name);
     // The virtual key in use; none until a name that names a key has been set.
-    std::optional<int> key() const { return key_; }
+    std::optional<int> Key() const { return key_; }
 
     // Samples the key once; true when the patches should be applied.
     bool Tick();

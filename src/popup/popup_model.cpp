@@ -219,16 +219,16 @@ void AlertPopupModel::SetCloseActivate(bool value) {
 
 PopupPhase AlertPopupModel::Phase() const {
     if (!shown_) {
-        return PopupPhase::kHidden;
+        return PopupPhase::Hidden;
     }
     if (finished_) {
-        return PopupPhase::kFinished;
+        return PopupPhase::Finished;
     }
     if (ticksLeft_ <= 0) {
-        return PopupPhase::kLeaving;
+        return PopupPhase::Leaving;
     }
     const bool atRest = fadeMode_ ? stepValue_ <= 0 : arrived_;
-    return atRest ? PopupPhase::kResting : PopupPhase::kArriving;
+    return atRest ? PopupPhase::Resting : PopupPhase::Arriving;
 }
 
 PixelRect AlertPopupModel::WindowPixels() const {

@@ -116,11 +116,11 @@ struct PopupFrame {
 };
 
 enum class PopupPhase {
-    kHidden,    // DisplayMessage not called yet
-    kArriving,  // rising (slide) or fading in (fade)
-    kResting,   // at its place, counting down unless sticky
-    kLeaving,   // sliding down or fading out
-    kFinished,  // unloaded: the window closes; the slot is free again
+    Hidden,    // DisplayMessage not called yet
+    Arriving,  // rising (slide) or fading in (fade)
+    Resting,   // at its place, counting down unless sticky
+    Leaving,   // sliding down or fading out
+    Finished,  // unloaded: the window closes; the slot is free again
 };
 
 // How a popup shows itself. The tool's own popups slide, fit their height to the text, and have

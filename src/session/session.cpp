@@ -68,7 +68,7 @@ std::string_view SkipReasonText(catalog::SkipReason reason) {
 
 std::string SkippedLine(const catalog::AddedVariants& added, catalog::GroupId group) {
     std::string line;
-    if (added.folderState(group) == catalog::GroupFolderState::Unreadable) {
+    if (added.FolderState(group) == catalog::GroupFolderState::Unreadable) {
         line =
             "Không đọc được hết thư mục extras\\" + std::string(catalog::GroupFolder(group)) + ".";
     }
@@ -159,16 +159,16 @@ Session::Session(std::filesystem::path toolFolder, std::unique_ptr<platform::Key
 }
 
 void Session::setCategoryOn(int switchIndex, bool on) {
-    settings_.selection.setSwitchValue(switchIndex, on ? 1 : 0);
+    settings_.selection.SetSwitchValue(switchIndex, on ? 1 : 0);
 }
 
 void Session::chooseOption(catalog::OptionArray array, int index) {
-    settings_.selection.setOptionValue(array, index, true);
+    settings_.selection.SetOptionValue(array, index, true);
 }
 
 void Session::ChooseAdded(catalog::GroupId group, std::string_view name) {
     if (added_.Find(group, name)) {
-        settings_.selection.setAddedValue(group, name, true);
+        settings_.selection.SetAddedValue(group, name, true);
     }
 }
 
@@ -176,7 +176,7 @@ Outcome Session::RefreshAddedVariants() {
     added_ = catalog::AddedVariants::List(toolFolder_);
     std::vector<catalog::GoneChoice> gone;
     for (const catalog::VariantGroup& group : catalog::Groups()) {
-        const std::string chosen(settings_.selection.chosenAdded(group.id));
+        const std::string chosen(settings_.selection.ChosenAdded(group.id));
         if (!chosen.empty() && !added_.Find(group.id, chosen)) {
             catalog::ChooseGroupDefault(settings_.selection, group.id);
             gone.push_back({group.id, chosen});

@@ -91,23 +91,23 @@ public:
                      std::unique_ptr<platform::KeySampler> keys = nullptr,
                      Launcher launch = game::LaunchGame);
 
-    const std::filesystem::path& toolFolder() const { return toolFolder_; }
-    const catalog::Settings& settings() const { return settings_; }
+    const std::filesystem::path& ToolFolder() const { return toolFolder_; }
+    const catalog::Settings& Settings() const { return settings_; }
     // Ok when the settings file was read, or is missing or empty (the defaults apply).
-    const Status& settingsRead() const { return settingsRead_; }
+    const Status& SettingsRead() const { return settingsRead_; }
     // For the user, when the settings file could not be read: why, and that the defaults show.
     std::optional<text::Message> SettingsProblem() const;
-    const catalog::PatchSelection& selection() const { return settings_.selection; }
-    bool hasGlobalKeys() const { return keys_ != nullptr; }
+    const catalog::PatchSelection& Selection() const { return settings_.selection; }
+    bool HasGlobalKeys() const { return keys_ != nullptr; }
 
-    void setGameFolder(std::string folder) { settings_.gameFolder = std::move(folder); }
+    void SetGameFolder(std::string folder) { settings_.gameFolder = std::move(folder); }
     // A ticked box is on (1), a cleared one off (0); a stored value other than these is lost.
-    void setCategoryOn(int switchIndex, bool on);
+    void SetCategoryOn(int switchIndex, bool on);
     // Chooses a variant; the others of its group are cleared.
-    void chooseOption(catalog::OptionArray array, int index);
+    void ChooseOption(catalog::OptionArray array, int index);
 
     // The variants the player added to the groups' folders, as listed at start or last refresh.
-    const catalog::AddedVariants& addedVariants() const { return added_; }
+    const catalog::AddedVariants& AddedVariants() const { return added_; }
     // Chooses an added variant of the group; a name that is not listed changes nothing.
     void ChooseAdded(catalog::GroupId group, std::string_view name);
     // Lists the groups' folders again (the window calls it when it comes back from the tray).
@@ -119,14 +119,14 @@ public:
     std::optional<text::Message> TakeGoneNotice();
 
     // Takes the hotkey text as typed; it is saved as it stands. A text that names no key keeps
-    // the key in use as it was; hotkeyValid() says so.
-    void setHotkeyText(std::string text);
-    bool hotkeyValid() const { return hotkeyValid_; }
+    // the key in use as it was; HotkeyValid() says so.
+    void SetHotkeyText(std::string text);
+    bool HotkeyValid() const { return hotkeyValid_; }
     // The name of the key the poll reacts to ("F7"); empty when none.
-    std::string activeHotkey() const;
+    std::string ActiveHotkey() const;
     // For the user, when the hotkey text names no key: what is wrong and which key is in use.
     // Empty when the text names a key.
-    std::string hotkeyProblem() const;
+    std::string HotkeyProblem() const;
 
     // One tick of the hotkey poll: applies the patches when the key was pressed.
     std::optional<ApplyRun> PollHotkey();
@@ -137,13 +137,13 @@ public:
     LaunchRun Launch(LaunchFrom from);
     // Loads from `chosen`, or from the folder chosen last time when the user picked none.
     QuickLoadRun QuickLoad(std::optional<std::filesystem::path> chosen);
-    const std::filesystem::path& quickLoadFolder() const { return quickLoadFolder_; }
+    const std::filesystem::path& QuickLoadFolder() const { return quickLoadFolder_; }
 
-    UpdateState& updates() { return updates_; }
-    const UpdateState& updates() const { return updates_; }
+    UpdateState& Updates() { return updates_; }
+    const UpdateState& Updates() const { return updates_; }
 
     // The game folder of the settings and the tool folder, which failures name paths from.
-    text::ShownFolders shownFolders() const;
+    text::ShownFolders ShownFolders() const;
 
 private:
     std::filesystem::path toolFolder_;

@@ -55,7 +55,7 @@ public:
 };
 }  // namespace
 
-QString FolderDialogStart(const QString& wanted) {
+QString folderDialogStart(const QString& wanted) {
     namespace fs = std::filesystem;
     const QString text = wanted.trimmed();
     if (!text.isEmpty()) {
@@ -65,7 +65,7 @@ QString FolderDialogStart(const QString& wanted) {
         while (folder.is_absolute()) {
             const fs::path existing = platform::ResolveCaseInsensitive(folder);
             if (platform::IsDirectory(existing)) {
-                return QDir::cleanPath(PathToQString(existing));
+                return QDir::cleanPath(pathToQString(existing));
             }
             if (!folder.has_relative_path()) {
                 break;  // the root itself is missing, as an unmapped drive is
@@ -78,13 +78,13 @@ QString FolderDialogStart(const QString& wanted) {
     for (const fs::path& prefix :
          {user.winePrefix, user.home.empty() ? fs::path() : user.home / ".wine"}) {
         if (!prefix.empty() && platform::IsDirectory(prefix / "drive_c")) {
-            return PathToQString(prefix / "drive_c");
+            return pathToQString(prefix / "drive_c");
         }
     }
     return QDir::homePath();
 }
 
-void PrepareFolderDialog(QFileDialog& dialog, const QString& title, const QString& start) {
+void prepareFolderDialog(QFileDialog& dialog, const QString& title, const QString& start) {
     // Qt's own dialog rather than the desktop's, so that every label can be Vietnamese.
     dialog.setOption(QFileDialog::DontUseNativeDialog);
     dialog.setFileMode(QFileDialog::Directory);
@@ -110,13 +110,13 @@ void PrepareFolderDialog(QFileDialog& dialog, const QString& title, const QStrin
         places << QUrl::fromLocalFile(drive.absoluteFilePath());
     }
     dialog.setSidebarUrls(places);
-    dialog.setDirectory(FolderDialogStart(start));
+    dialog.setDirectory(folderDialogStart(start));
 }
 
-std::optional<QString> QtDialogs::PickFolder(QWidget* owner, const QString& title,
+std::optional<QString> QtDialogs::pickFolder(QWidget* owner, const QString& title,
                                              const QString& start) {
     QFileDialog dialog(owner);
-    PrepareFolderDialog(dialog, title, start);
+    prepareFolderDialog(dialog, title, start);
     if (dialog.exec() != QDialog::Accepted || dialog.selectedFiles().isEmpty()) {
         return std::nullopt;
     }
@@ -127,28 +127,28 @@ std::optional<QString> QtDialogs::PickFolder(QWidget* owner, const QString& titl
     return QDir::toNativeSeparators(folder);
 }
 
-void QtDialogs::ShowMessage(QWidget* owner, const QString& title, const QString& text, Icon icon) {
+void QtDialogs::showMessage(QWidget* owner, const QString& title, const QString& text, Icon icon) {
     QMessageBox box(icon == Icon::Warning ? QMessageBox::Warning : QMessageBox::Information, title,
                     text, QMessageBox::Ok, owner);
     box.exec();
 }
 
-void QtDialogs::ShowNotice(QWidget* owner, const QString& title, const QString& text) {
+void QtDialogs::showNotice(QWidget* owner, const QString& title, const QString& text) {
     auto* box = new QMessageBox(QMessageBox::Warning, title, text, QMessageBox::Ok, owner);
     box->setAttribute(Qt::WA_DeleteOnClose);
     box->setModal(false);
     box->show();
 }
 
-void QtDialogs::ShowPopup(const QString& text, int displaySeconds) {
-    AlertPopup::Show(text, displaySeconds);
+void QtDialogs::showPopup(const QString& text, int displaySeconds) {
+    AlertPopup::open(text, displaySeconds);
 }
 
-void QtDialogs::ShowFailureAlert(const QString& text, int displaySeconds,
+void QtDialogs::showFailureAlert(const QString& text, int displaySeconds,
                                  std::function<void()> onClick) {
-    auto* popup = new AlertPopup(AlertPopup::ScreenEnvironment());
+    auto* popup = new AlertPopup(AlertPopup::screenEnvironment());
     QObject::connect(popup, &AlertPopup::clicked, popup, std::move(onClick));
-    popup->DisplayMessage(text, displaySeconds, popup::FailureStyle());
+    popup->displayMessage(text, displaySeconds, popup::FailureStyle());
 }
 
 }  // namespace kickvane::shell

@@ -24,7 +24,7 @@ const QString kTitle = QStringLiteral("Tìm FIFA Online 2");
 const QString kCaption = QStringLiteral("Tì&m");
 
 // The list of several finds; the chosen folder goes into the box.
-void OpenChoice(QWidget* owner, QLineEdit* box, const std::vector<game::FoundGame>& games) {
+void openChoice(QWidget* owner, QLineEdit* box, const std::vector<game::FoundGame>& games) {
     auto* dialog = new QDialog(owner);
     dialog->setAttribute(Qt::WA_DeleteOnClose);
     dialog->setWindowTitle(kTitle);
@@ -34,9 +34,9 @@ void OpenChoice(QWidget* owner, QLineEdit* box, const std::vector<game::FoundGam
     auto* list = new QListWidget(dialog);
     list->setAccessibleName(QStringLiteral("Các thư mục tìm thấy"));
     for (const game::FoundGame& game : games) {
-        auto* item = new QListWidgetItem(PathToQString(game.folder) + QStringLiteral("\n    ") +
-                                         ToQString(game.source));
-        item->setData(Qt::UserRole, PathToQString(game.folder));
+        auto* item = new QListWidgetItem(pathToQString(game.folder) + QStringLiteral("\n    ") +
+                                         toQString(game.source));
+        item->setData(Qt::UserRole, pathToQString(game.folder));
         list->addItem(item);
     }
     list->setCurrentRow(0);
@@ -57,15 +57,15 @@ void OpenChoice(QWidget* owner, QLineEdit* box, const std::vector<game::FoundGam
     dialog->open();
 }
 
-void OpenNothingFound(QWidget* owner, const game::FindOutcome& outcome) {
+void openNothingFound(QWidget* owner, const game::FindOutcome& outcome) {
     QString text = QStringLiteral("Không tìm thấy Gameloader.exe.\n\nĐã tìm trong:");
     for (const std::string& place : outcome.looked) {
-        text += QStringLiteral("\n  ") + ToQString(place);
+        text += QStringLiteral("\n  ") + toQString(place);
     }
     if (!outcome.skipped.empty()) {
         text += QStringLiteral("\n\nBỏ qua (không đọc được):");
         for (const std::string& skipped : outcome.skipped) {
-            text += QStringLiteral("\n  ") + ToQString(skipped);
+            text += QStringLiteral("\n  ") + toQString(skipped);
         }
     }
     auto* box = new QMessageBox(QMessageBox::Information, kTitle, text, QMessageBox::Ok, owner);
@@ -131,16 +131,16 @@ void GameFinderButton::finish(const game::FindOutcome& outcome) {
     setText(kCaption);
     setEnabled(true);
     if (outcome.games.size() == 1) {
-        gameFolderBox_->setText(PathToQString(outcome.games.front().folder));
+        gameFolderBox_->setText(pathToQString(outcome.games.front().folder));
     } else if (outcome.games.size() > 1) {
-        OpenChoice(window(), gameFolderBox_, outcome.games);
+        openChoice(window(), gameFolderBox_, outcome.games);
     } else {
-        OpenNothingFound(window(), outcome);
+        openNothingFound(window(), outcome);
     }
     emit searchFinished();
 }
 
-GameFinderButton* AddGameFinder(QLineEdit* gameFolderBox, QPushButton* browseButton) {
+GameFinderButton* addGameFinder(QLineEdit* gameFolderBox, QPushButton* browseButton) {
     auto* button = new GameFinderButton(gameFolderBox, game::UserFolders::FromEnvironment());
     QRect box = gameFolderBox->geometry();
     box.setWidth(box.width() - kButtonWidth - kGap);

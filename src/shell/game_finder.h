@@ -41,6 +41,6 @@ private:
 
 // Puts a "Tìm" button between the game folder box and the change-folder button (the box gives
 // up the room) and returns it.
-GameFinderButton* AddGameFinder(QLineEdit* gameFolderBox, QPushButton* browseButton);
+GameFinderButton* addGameFinder(QLineEdit* gameFolderBox, QPushButton* browseButton);
 
 }  // namespace kickvane::shell

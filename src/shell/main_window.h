@@ -26,7 +26,7 @@ struct ShellServices {
     Dialogs* dialogs = nullptr;  // not owned
     SoundPlayer playSound;
     // Where the update check asks; tests point it at a server of their own.
-    UpdateCheck::Options updates = UpdateCheck::DefaultOptions();
+    UpdateCheck::Options updates = UpdateCheck::defaultOptions();
     // Makes the tray icon with the window's tray menu; null: the desktop's tray.
     TrayFactory makeTray;
 };

@@ -8,16 +8,17 @@
 
 namespace kickvane::shell {
 
-QString NoticeTitle() {
-    return ToQString(text::VniToUnicodeUtf8(kNoticeTitleVni));
+QString noticeTitle() {
+    return toQString(text::VniToUnicodeUtf8(kNoticeTitleVni));
 }
 
-int ShowMessageW(std::string_view text, std::string_view title, int style, QWidget* owner) {
-    QMessageBox box(style == kStyleInformation ? QMessageBox::Information : QMessageBox::NoIcon,
-                    ToQString(text::VniToUnicodeUtf8(title)),
-                    ToQString(text::VniToUnicodeUtf8(text)), QMessageBox::Ok, owner);
+void showVniMessage(std::string_view text, std::string_view title, MessageIcon icon,
+                    QWidget* owner) {
+    QMessageBox box(
+        icon == MessageIcon::Information ? QMessageBox::Information : QMessageBox::NoIcon,
+        toQString(text::VniToUnicodeUtf8(title)), toQString(text::VniToUnicodeUtf8(text)),
+        QMessageBox::Ok, owner);
     box.exec();
-    return 1;
 }
 
 }  // namespace kickvane::shell

@@ -8,19 +8,19 @@
 // Text between the core (UTF-8 strings, native paths) and Qt.
 namespace kickvane::shell {
 
-inline QString ToQString(std::string_view utf8) {
+inline QString toQString(std::string_view utf8) {
     return QString::fromUtf8(utf8.data(), static_cast<qsizetype>(utf8.size()));
 }
 
-inline std::string ToUtf8(const QString& text) {
+inline std::string toUtf8(const QString& text) {
     return text.toStdString();
 }
 
-inline QString PathToQString(const std::filesystem::path& path) {
-    return ToQString(path.string());
+inline QString pathToQString(const std::filesystem::path& path) {
+    return toQString(path.string());
 }
 
-inline std::filesystem::path QStringToPath(const QString& text) {
+inline std::filesystem::path qStringToPath(const QString& text) {
     return std::filesystem::path(text.toStdString());
 }
 

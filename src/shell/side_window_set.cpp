@@ -13,23 +13,23 @@ void SideWindowSet::show(QPointer<QWidget>& window, QWidget* (*create)(QWidget*)
 }
 
 void SideWindowSet::showPreview(catalog::LabelArray labels, int index) {
-    const std::filesystem::path picture = PreviewPicture(toolFolder_, labels, index);
+    const std::filesystem::path picture = previewPicture(toolFolder_, labels, index);
     if (picture.empty()) {
         return;
     }
-    shownPreview().ShowPicture(picture);
+    shownPreview().showPicture(picture);
 }
 
 void SideWindowSet::showAddedPreview(catalog::GroupId group, std::string_view name) {
-    const std::filesystem::path picture = AddedPreviewPicture(toolFolder_, group, name);
+    const std::filesystem::path picture = addedPreviewPicture(toolFolder_, group, name);
     PreviewWindow& window = shownPreview();
     if (picture.empty()) {
-        window.ShowNoPicture();
+        window.showNoPicture();
         return;
     }
-    window.ShowPicture(picture);
-    if (window.pictureFile() != PathToQString(picture)) {
-        window.ShowNoPicture();  // there but unreadable: never another entry's picture
+    window.showPicture(picture);
+    if (window.pictureFile() != pathToQString(picture)) {
+        window.showNoPicture();  // there but unreadable: never another entry's picture
     }
 }
 

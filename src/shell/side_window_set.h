@@ -15,8 +15,8 @@ public:
     SideWindowSet(QWidget* owner, std::filesystem::path toolFolder)
         : owner_(owner), toolFolder_(std::move(toolFolder)) {}
 
-    void showAbout() { show(about_, CreateAboutWindow); }
-    void showHelp() { show(help_, CreateHelpWindow); }
+    void showAbout() { show(about_, createAboutWindow); }
+    void showHelp() { show(help_, createHelpWindow); }
     // Shows the label's preview picture; a label without one changes nothing.
     void showPreview(catalog::LabelArray labels, int index);
     // Shows the preview of a variant the player added, or the note that it has none.

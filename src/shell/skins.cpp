@@ -14,7 +14,7 @@
 
 namespace kickvane::shell {
 
-void Paint(QWidget* widget, const QColor& background, const QColor& text) {
+void paint(QWidget* widget, const QColor& background, const QColor& text) {
     QPalette palette = widget->palette();
     palette.setColor(QPalette::Window, background);
     palette.setColor(QPalette::WindowText, text);
@@ -22,7 +22,7 @@ void Paint(QWidget* widget, const QColor& background, const QColor& text) {
     widget->setAutoFillBackground(true);
 }
 
-SkinLook LightSkin() {
+SkinLook lightSkin() {
     return {QStringLiteral("skin1"),
             kEntryBackground,
             Qt::black,
@@ -33,7 +33,7 @@ SkinLook LightSkin() {
             QColor(0xF0, 0xF0, 0xF0)};
 }
 
-SkinLook DarkSkin() {
+SkinLook darkSkin() {
     // The labels take the system's menu text colour as their background. The tick boxes and
     // option buttons are drawn on the entries' own dark colour, not on light squares.
     const QColor entry(0x40, 0x40, 0x40);
@@ -47,7 +47,7 @@ SkinLook DarkSkin() {
             QColor(0x30, 0x30, 0x30)};
 }
 
-double ContrastRatio(const QColor& a, const QColor& b) {
+double contrastRatio(const QColor& a, const QColor& b) {
     const auto luminance = [](const QColor& colour) {
         const auto linear = [](double channel) {
             return channel <= 0.04045 ? channel / 12.92 : std::pow((channel + 0.055) / 1.055, 2.4);
@@ -64,13 +64,13 @@ WindowSkins::WindowSkins(std::filesystem::path toolFolder, CatalogPanels& panels
     : toolFolder_(std::move(toolFolder)), panels_(panels) {}
 
 QString WindowSkins::skinFile(const QString& skin, const QString& suffix) const {
-    return PathToQString(
-        platform::ResolveCaseInsensitive(toolFolder_ / "skin" / ToUtf8(skin + suffix)));
+    return pathToQString(
+        platform::ResolveCaseInsensitive(toolFolder_ / "skin" / toUtf8(skin + suffix)));
 }
 
 void WindowSkins::initialise() {
-    panels_.layoutPanels(skinFile(LightSkin().name, QStringLiteral("_panel.jpg")));
-    LoadPicture(background_, skinFile(activeSkin_, QStringLiteral("_bg.jpg")));
+    panels_.layoutPanels(skinFile(lightSkin().name, QStringLiteral("_panel.jpg")));
+    loadPicture(background_, skinFile(activeSkin_, QStringLiteral("_bg.jpg")));
     paintTabs();
 }
 
@@ -80,7 +80,7 @@ void WindowSkins::paintTabs() {
 }
 
 void WindowSkins::apply(const SkinLook& look) {
-    LoadPicture(background_, skinFile(look.name, QStringLiteral("_bg.jpg")));
+    loadPicture(background_, skinFile(look.name, QStringLiteral("_bg.jpg")));
     panels_.layoutPanels(skinFile(look.name, QStringLiteral("_panel.jpg")));
     panels_.recolour(look);
     activeSkin_ = look.name;

@@ -16,7 +16,7 @@ inline const QColor kEntryBackground{0xE0, 0xE0, 0xE0};
 inline const QColor kLabelBackground{0xC0, 0xC0, 0xC0};
 
 // Gives `widget` its own background and text colour.
-void Paint(QWidget* widget, const QColor& background, const QColor& text = Qt::black);
+void paint(QWidget* widget, const QColor& background, const QColor& text = Qt::black);
 
 // The look of one skin: its picture prefix and the colours of the entries.
 struct SkinLook {
@@ -29,12 +29,12 @@ struct SkinLook {
     QColor noteText;       // the red note under a hotkey that names no key
     QColor noteBackground;
 };
-SkinLook LightSkin();
-SkinLook DarkSkin();
+SkinLook lightSkin();
+SkinLook darkSkin();
 
 // The contrast ratio of two colours as WCAG 2 defines it, from 1 (the same) to 21 (black on
 // white); text reads well from 4.5 on.
-double ContrastRatio(const QColor& a, const QColor& b);
+double contrastRatio(const QColor& a, const QColor& b);
 
 // The window's two skins: the active one's background picture, tab and panel pictures and the
 // colours of the entries. The window starts in the light skin.

@@ -22,28 +22,28 @@ namespace kickvane::shell {
 
 namespace {
 
-bool IsWebScheme(const QString& scheme) {
+bool isWebScheme(const QString& scheme) {
     return scheme.compare(u"http", Qt::CaseInsensitive) == 0 ||
            scheme.compare(u"https", Qt::CaseInsensitive) == 0;
 }
 
-int DefaultPort(const QString& scheme) {
+int defaultPort(const QString& scheme) {
     return scheme.compare(u"https", Qt::CaseInsensitive) == 0 ? 443 : 80;
 }
 
-QString Vni(std::string_view text) {
+QString fromVni(std::string_view text) {
     return QString::fromStdString(text::VniToUnicodeUtf8(text));
 }
 
-const QString kTimedOut = FetchProblemText(FetchProblem::TimedOut);
-const QString kTooLarge = FetchProblemText(FetchProblem::TooLarge);
-const QString kRedirectRefused = FetchProblemText(FetchProblem::RedirectRefused);
-const QString kTooManyRedirects = FetchProblemText(FetchProblem::TooManyRedirects);
-const QString kBadHost = FetchProblemText(FetchProblem::BadHost);
+const QString kTimedOut = fetchProblemText(FetchProblem::TimedOut);
+const QString kTooLarge = fetchProblemText(FetchProblem::TooLarge);
+const QString kRedirectRefused = fetchProblemText(FetchProblem::RedirectRefused);
+const QString kTooManyRedirects = fetchProblemText(FetchProblem::TooManyRedirects);
+const QString kBadHost = fetchProblemText(FetchProblem::BadHost);
 
 }  // namespace
 
-bool IsCurrentVersion(std::string_view text) {
+bool isCurrentVersion(std::string_view text) {
     return text.size() == kToolVersion.size() + 2 && text.starts_with(kToolVersion) &&
            text.ends_with("\r\n");
 }
@@ -63,20 +63,20 @@ UpdateCheck::~UpdateCheck() {
     release(File::Link);
 }
 
-QUrl UpdateCheck::DefaultHost() {
+QUrl UpdateCheck::defaultHost() {
     const QString fromEnvironment = qEnvironmentVariable("KICKVANE_UPDATE_HOST").trimmed();
     return QUrl(fromEnvironment.isEmpty() ? QString::fromUtf8(KICKVANE_UPDATE_HOST)
                                           : fromEnvironment);
 }
 
-UpdateCheck::Options UpdateCheck::DefaultOptions() {
+UpdateCheck::Options UpdateCheck::defaultOptions() {
     Options options;
-    options.host = DefaultHost();
+    options.host = defaultHost();
     return options;
 }
 
-bool UpdateCheck::AllowsRedirect(const QUrl& origin, const QUrl& current, const QUrl& target) {
-    if (!target.isValid() || !IsWebScheme(target.scheme()) || target.host().isEmpty() ||
+bool UpdateCheck::allowsRedirect(const QUrl& origin, const QUrl& current, const QUrl& target) {
+    if (!target.isValid() || !isWebScheme(target.scheme()) || target.host().isEmpty() ||
         target.host().compare(origin.host(), Qt::CaseInsensitive) != 0) {
         return false;
     }
@@ -85,8 +85,8 @@ bool UpdateCheck::AllowsRedirect(const QUrl& origin, const QUrl& current, const 
         return false;  // never back to plain http
     }
     if (target.scheme().compare(origin.scheme(), Qt::CaseInsensitive) == 0) {
-        return target.port(DefaultPort(target.scheme())) ==
-               origin.port(DefaultPort(origin.scheme()));
+        return target.port(defaultPort(target.scheme())) ==
+               origin.port(defaultPort(origin.scheme()));
     }
     // From http to https on the same host: the secure service sits on its usual port.
     return toHttps && target.port(443) == 443;
@@ -109,7 +109,7 @@ void UpdateCheck::fetch(File file) {
     Transfer& t = transfer(file);
     const QUrl url = address(file);
     t.deadline.start(options_.timeout);
-    if (!url.isValid() || !IsWebScheme(url.scheme()) || url.host().isEmpty()) {
+    if (!url.isValid() || !isWebScheme(url.scheme()) || url.host().isEmpty()) {
         // Reported from the event loop like every other outcome.
         t.earlyFailure = kBadHost;
         t.deadline.start(0);
@@ -173,7 +173,7 @@ void UpdateCheck::follow(File file, const QUrl& target) {
     const QUrl next = t.current.resolved(target);
     if (++t.redirects > kMaxRedirects) {
         fail(file, kTooManyRedirects);
-    } else if (!AllowsRedirect(address(file), t.current, next)) {
+    } else if (!allowsRedirect(address(file), t.current, next)) {
         fail(file, kRedirectRefused);
     } else {
         drop(t);
@@ -192,11 +192,11 @@ void UpdateCheck::onFinished(File file, QNetworkReply* reply) {
     if (code >= 300 && code < 400 && target.isValid()) {
         follow(file, target.toUrl());
     } else if (status.isValid() && (code < 200 || code >= 300)) {
-        fail(file, FetchProblemText(FetchProblem::HttpStatus, code));
+        fail(file, fetchProblemText(FetchProblem::HttpStatus, code));
     } else if (reply->error() != QNetworkReply::NoError) {
-        fail(file, NetworkErrorText(reply->error()));
+        fail(file, networkErrorText(reply->error()));
     } else if (!status.isValid()) {
-        fail(file, FetchProblemText(FetchProblem::NotHttp));
+        fail(file, fetchProblemText(FetchProblem::NotHttp));
     } else {
         succeed(file);
     }
@@ -291,8 +291,8 @@ void UpdateFlow::onVersion(const QString& text) {
     if (checkButton_) {
         checkButton_->setEnabled(true);
     }
-    if (IsCurrentVersion(version)) {
-        showMessage(Vni("Chu7a co1 phie6n ba3n mo71i"), Dialogs::Icon::Information);
+    if (isCurrentVersion(version)) {
+        showMessage(fromVni("Chu7a co1 phie6n ba3n mo71i"), Dialogs::Icon::Information);
         emit checkFinished();
         return;
     }
@@ -308,7 +308,7 @@ void UpdateFlow::onVersion(const QString& text) {
     if (downloadButton_) {
         downloadButton_->show();
     }
-    showMessage(Vni("D9a4 co1 phie6n ba3n mo71i! " + version), Dialogs::Icon::Information);
+    showMessage(fromVni("D9a4 co1 phie6n ba3n mo71i! " + version), Dialogs::Icon::Information);
     emit checkFinished();
 }
 
@@ -325,7 +325,7 @@ void UpdateFlow::onVersionFailed(const QString& reason) {
 void UpdateFlow::download() {
     const std::optional<std::string> link = DownloadLink(state_.downloadLink);
     const QUrl url = link ? QUrl(QString::fromStdString(*link), QUrl::TolerantMode) : QUrl();
-    if (!url.isValid() || !IsWebScheme(url.scheme()) || url.host().isEmpty()) {
+    if (!url.isValid() || !isWebScheme(url.scheme()) || url.host().isEmpty()) {
         if (link_ == LinkState::Pending) {
             showMessage(
                 QStringLiteral("Chưa nhận được đường dẫn tải về, xin thử lại sau giây lát."),
@@ -344,7 +344,7 @@ void UpdateFlow::download() {
 }
 
 void UpdateFlow::showMessage(const QString& text, Dialogs::Icon icon) {
-    dialogs_.ShowMessage(owner_.data(), NoticeTitle(), text, icon);
+    dialogs_.showMessage(owner_.data(), noticeTitle(), text, icon);
 }
 
 }  // namespace kickvane::shell

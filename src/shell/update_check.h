@@ -33,7 +33,7 @@ using text::IsVersionText;
 using text::ReadFetchedText;
 
 // True when the fetched version text is exactly this tool's version line.
-bool IsCurrentVersion(std::string_view text);
+bool isCurrentVersion(std::string_view text);
 
 // Fetches the version file ("v" at the host's root) and the link file ("vlink") from the update
 // host, each on its own, without blocking. Answers stay in memory and never come from a cache.
@@ -57,12 +57,12 @@ public:
     ~UpdateCheck() override;
 
     // KICKVANE_UPDATE_HOST from the environment when set, else the host the build was made for.
-    static QUrl DefaultHost();
+    static QUrl defaultHost();
     // The options the tool runs with: the default host, 10 s and 64 KiB per fetch.
-    static Options DefaultOptions();
+    static Options defaultOptions();
 
     // Whether a fetch that started at `origin` and now stands at `current` may go on to `target`.
-    static bool AllowsRedirect(const QUrl& origin, const QUrl& current, const QUrl& target);
+    static bool allowsRedirect(const QUrl& origin, const QUrl& current, const QUrl& target);
 
     QUrl address(File file) const;
     bool isFetching(File file) const;

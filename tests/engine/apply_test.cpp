@@ -29,7 +29,7 @@ protected:
     static PatchSelection Only(std::initializer_list<int> categories) {
         PatchSelection selection = PatchSelection::Defaults();
         for (int i = 0; i < catalog::kCategoryCount; ++i) {
-            selection.setSwitchValue(
+            selection.SetSwitchValue(
                 i, static_cast<int>(std::count(categories.begin(), categories.end(), i)));
         }
         return selection;
@@ -105,12 +105,12 @@ TEST_F(ApplyTest, FailedStepsAreListedWithAReasonAndTheRunGoesOn) {
     fs::remove_all(game() / "zdata");
     fs::create_directories(game() / "data2/cmn/base.dds");  // a folder where the file goes
     PatchSelection selection = PatchSelection::Defaults();
-    selection.setSwitchValue(12, 1);
-    selection.setSwitchValue(13, 1);
-    selection.setOptionValue(OptionArray::Other, 5, true);  // pitch Caro
+    selection.SetSwitchValue(12, 1);
+    selection.SetSwitchValue(13, 1);
+    selection.SetOptionValue(OptionArray::Other, 5, true);  // pitch Caro
     const ApplyOutcome outcome = Apply(selection);
 
-    ASSERT_FALSE(outcome.stopped());
+    ASSERT_FALSE(outcome.Stopped());
     for (const StepOutcome& step : outcome.steps) {
         const bool blocked = step.step.target.root == Root::ZData || step.step.category == 5;
         EXPECT_EQ(step.state == StepState::Failed, blocked) << Describe(step.step);
@@ -123,7 +123,7 @@ TEST_F(ApplyTest, FailedStepsAreListedWithAReasonAndTheRunGoesOn) {
 
 TEST_F(ApplyTest, PitchVariantEndsWithTheBaseSetsDirtAndLines) {
     PatchSelection selection = Only({1});
-    selection.setOptionValue(OptionArray::Other, 5, true);
+    selection.SetOptionValue(OptionArray::Other, 5, true);
     // A trailing separator on the game folder names the same folders.
     EXPECT_TRUE(Apply(selection, "/").Failures().empty());
     const fs::path textures = game() / "data2/pitch/textures";

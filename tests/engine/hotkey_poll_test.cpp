@@ -26,7 +26,7 @@ TEST(HotkeyPoll, TicksOnlyForThePressedOrHeldKeyItKeeps) {
     // Names are compared exactly; one that names no key leaves F7 in use.
     for (const char* name : {"f7", "", "F13", "F7 "}) {
         EXPECT_FALSE(poll.SetHotkey(name)) << name;
-        EXPECT_EQ(poll.key(), kF7) << name;
+        EXPECT_EQ(poll.Key(), kF7) << name;
     }
     EXPECT_TRUE(poll.SetHotkey("F9"));
     EXPECT_FALSE(poll.Tick());  // F7 is still held, but no longer the hotkey

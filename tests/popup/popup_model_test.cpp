@@ -51,10 +51,10 @@ TEST_F(PopupTest, Slot1RisesToItsRestingTop_RestsSecondsTimes80Ticks_ThenSlidesO
     EXPECT_EQ(popup->WindowPixels(), (PixelRect{1440, 1000, 160, 133}));  // below the work area
     popup->Tick();
     EXPECT_EQ(popup->TopTwips(), 15000 - 50);
-    EXPECT_EQ(TicksIn(*popup, PopupPhase::kArriving), 40);
+    EXPECT_EQ(TicksIn(*popup, PopupPhase::Arriving), 40);
     EXPECT_EQ(popup->TopTwips(), 15000 - 2000);
-    EXPECT_EQ(TicksIn(*popup, PopupPhase::kResting), 159);  // the arriving tick counts as the first
-    TicksIn(*popup, PopupPhase::kLeaving);
+    EXPECT_EQ(TicksIn(*popup, PopupPhase::Resting), 159);  // the arriving tick counts as the first
+    TicksIn(*popup, PopupPhase::Leaving);
     EXPECT_GT(popup->TopTwips(), 1080 * 15);
     EXPECT_TRUE(popup->Finished());
     EXPECT_EQ(slots_.Mask(), 0);
@@ -62,16 +62,16 @@ TEST_F(PopupTest, Slot1RisesToItsRestingTop_RestsSecondsTimes80Ticks_ThenSlidesO
 
 TEST_F(PopupTest, Slot2RisesTwiceAsFarAndFast_AndFreedSlotsAreReused) {
     auto first = Show("one", 1);
-    TicksIn(*first, PopupPhase::kArriving);
+    TicksIn(*first, PopupPhase::Arriving);
     auto second = Show("two", 1);
     EXPECT_EQ(second->Slot(), 2);
     second->Tick();
     EXPECT_EQ(second->TopTwips(), 15000 - 100);
-    TicksIn(*second, PopupPhase::kArriving);
+    TicksIn(*second, PopupPhase::Arriving);
     EXPECT_EQ(second->TopTwips(), 15000 - 2 * 2000);
 
     first->Click();
-    TicksIn(*first, PopupPhase::kLeaving);
+    TicksIn(*first, PopupPhase::Leaving);
     EXPECT_EQ(Show("three", 1)->Slot(), 1);
     second.reset();  // a popup destroyed before it finished gives its slot back
     EXPECT_EQ(slots_.Mask(), 0);
@@ -86,19 +86,19 @@ TEST_F(PopupTest, ZeroSecondsWaitsForAClick_NegativeSecondsOnlyForCloseActivate)
     auto sticky = Show("Hello", 0);
     EXPECT_EQ(sticky->Text(), "(click here to close)\r\nHello");
     EXPECT_EQ(sticky->LabelPixels().top, 5);
-    EXPECT_EQ(TicksIn(*sticky, PopupPhase::kArriving), 41);
-    EXPECT_EQ(TicksIn(*sticky, PopupPhase::kResting, 5000), 5000);
+    EXPECT_EQ(TicksIn(*sticky, PopupPhase::Arriving), 41);
+    EXPECT_EQ(TicksIn(*sticky, PopupPhase::Resting, 5000), 5000);
     sticky->Click();
-    EXPECT_EQ(sticky->Phase(), PopupPhase::kLeaving);
+    EXPECT_EQ(sticky->Phase(), PopupPhase::Leaving);
 
     auto clickProof = Show("Hello", -1);
     EXPECT_EQ(clickProof->Text(), "Hello");
-    TicksIn(*clickProof, PopupPhase::kArriving);
+    TicksIn(*clickProof, PopupPhase::Arriving);
     clickProof->Click();
     clickProof->SetCloseActivate(false);
-    EXPECT_EQ(TicksIn(*clickProof, PopupPhase::kResting, 500), 500);
+    EXPECT_EQ(TicksIn(*clickProof, PopupPhase::Resting, 500), 500);
     clickProof->SetCloseActivate(true);
-    EXPECT_EQ(clickProof->Phase(), PopupPhase::kLeaving);
+    EXPECT_EQ(clickProof->Phase(), PopupPhase::Leaving);
 }
 
 TEST_F(PopupTest, AutoFitFitsSlot1ToItsLabel_FrameIncluded_HigherSlotsKeepTheirHeight) {
@@ -106,7 +106,7 @@ TEST_F(PopupTest, AutoFitFitsSlot1ToItsLabel_FrameIncluded_HigherSlotsKeepTheirH
     EXPECT_EQ(measuredWidth_, 150);
     EXPECT_EQ(first->HeightTwips(), (10 + 26 + 10) * 15);
     EXPECT_EQ(first->Frame().lines.at(1).y1, 45);  // the frame's bottom line is on the new height
-    TicksIn(*first, PopupPhase::kArriving);
+    TicksIn(*first, PopupPhase::Arriving);
     EXPECT_EQ(first->TopTwips(), 15000 - 46 * 15);
 
     EXPECT_EQ(Show("a\nb", 1, false, true)->HeightTwips(), 2000);
@@ -115,9 +115,9 @@ TEST_F(PopupTest, AutoFitFitsSlot1ToItsLabel_FrameIncluded_HigherSlotsKeepTheirH
 TEST_F(PopupTest, FadeShowsInPlace_TurnsOpaque_ThenFadesToZero_OrJustWaitsWithoutTranslucency) {
     auto popup = Show("Hello", 2, true);
     EXPECT_EQ(popup->TopTwips(), 13000);
-    EXPECT_EQ(TicksIn(*popup, PopupPhase::kArriving), 10);
+    EXPECT_EQ(TicksIn(*popup, PopupPhase::Arriving), 10);
     EXPECT_EQ(popup->Alpha(), 255);
-    EXPECT_EQ(TicksIn(*popup, PopupPhase::kResting), 160);
+    EXPECT_EQ(TicksIn(*popup, PopupPhase::Resting), 160);
 
     std::vector<int> alphas;
     while (!popup->Finished()) {
@@ -141,7 +141,7 @@ TEST_F(PopupTest, FadeShowsInPlace_TurnsOpaque_ThenFadesToZero_OrJustWaitsWithou
 
 TEST_F(PopupTest, ClickWhileRisingSlidesDownFromWhereItIs) {
     auto popup = Show("Hello", 2);
-    TicksIn(*popup, PopupPhase::kArriving, 5);
+    TicksIn(*popup, PopupPhase::Arriving, 5);
     popup->Click();
     popup->Tick();
     EXPECT_EQ(popup->TopTwips(), 15000 - 4 * 50);
@@ -151,7 +151,7 @@ TEST_F(PopupTest, ClickWhileRisingSlidesDownFromWhereItIs) {
 TEST_F(PopupTest, StopsAtItsRestingTop_WhenThatIsNoMultipleOfTheStep) {
     auto popup = Show("one line", 1, false, true);  // (10 + 13 + 10) × 15 = 495 twips high
     int highest = popup->TopTwips();
-    while (popup->Phase() != PopupPhase::kLeaving) {
+    while (popup->Phase() != PopupPhase::Leaving) {
         popup->Tick();
         highest = std::min(highest, popup->TopTwips());
     }
@@ -167,8 +167,8 @@ TEST(PopupModel, ScreenToTwipsHalvesToEven_AndHugeSecondsDoNotOverflow) {
     popup.DisplayMessage("x", INT_MAX,
                          {.fade = false, .autoFit = false, .square = false, .backColour = 0});
     EXPECT_EQ(popup.TopTwips(), 14514);
-    TicksIn(popup, PopupPhase::kArriving);
-    EXPECT_EQ(TicksIn(popup, PopupPhase::kResting, 1000), 1000);
+    TicksIn(popup, PopupPhase::Arriving);
+    EXPECT_EQ(TicksIn(popup, PopupPhase::Resting, 1000), 1000);
 }
 
 }  // namespace

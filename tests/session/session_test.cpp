@@ -34,14 +34,14 @@ protected:
 TEST_F(SessionTest, HotkeyFromTheSettingsAppliesOnPressAndABadTextKeepsTheLastKey) {
     WriteSettings("f7");  // names no key: nothing is in use yet, and the session says so
     auto session = Open();
-    EXPECT_FALSE(session->hotkeyValid());
-    EXPECT_EQ(session->activeHotkey(), "");
-    EXPECT_EQ(session->hotkeyProblem(), "\"f7\" không phải phím F1–F12: phím tắt chưa hoạt động.");
+    EXPECT_FALSE(session->HotkeyValid());
+    EXPECT_EQ(session->ActiveHotkey(), "");
+    EXPECT_EQ(session->HotkeyProblem(), "\"f7\" không phải phím F1–F12: phím tắt chưa hoạt động.");
     keys_->pressed.insert(kF7);
     EXPECT_FALSE(session->PollHotkey());
 
-    session->setHotkeyText("F7");
-    EXPECT_TRUE(session->hotkeyProblem().empty());
+    session->SetHotkeyText("F7");
+    EXPECT_TRUE(session->HotkeyProblem().empty());
     keys_->pressed.insert(kF7);
     const std::optional<ApplyRun> run = session->PollHotkey();
     ASSERT_TRUE(run);
@@ -49,16 +49,16 @@ TEST_F(SessionTest, HotkeyFromTheSettingsAppliesOnPressAndABadTextKeepsTheLastKe
     EXPECT_TRUE(run->shown.messages.empty());
     EXPECT_TRUE(fs::exists(game() / "data2/cmn/base.dds"));
 
-    session->setHotkeyText("F");  // halfway through typing "F9"
-    EXPECT_EQ(session->activeHotkey(), "F7");
-    EXPECT_EQ(session->hotkeyProblem(), "\"F\" không phải phím F1–F12: vẫn dùng F7.");
-    EXPECT_EQ(session->settings().hotkey, "F");  // saved as typed
+    session->SetHotkeyText("F");  // halfway through typing "F9"
+    EXPECT_EQ(session->ActiveHotkey(), "F7");
+    EXPECT_EQ(session->HotkeyProblem(), "\"F\" không phải phím F1–F12: vẫn dùng F7.");
+    EXPECT_EQ(session->Settings().hotkey, "F");  // saved as typed
 }
 
 TEST_F(SessionTest, UnreadableSettingsAreNamedAndNothingIsCopied) {
     WriteFile(tool() / "ThietLap.ini", std::string("\x01\x00\x7F\x00junk", 8));
     auto session = Open();
-    EXPECT_FALSE(session->settingsRead());
+    EXPECT_FALSE(session->SettingsRead());
     ASSERT_TRUE(session->SettingsProblem());
     EXPECT_EQ(session->SettingsProblem()->kind, Kind::Warning);
 
@@ -93,7 +93,7 @@ TEST_F(SessionTest, FailedStepsFollowTheSoundInOneNotice_AStoppedRunHasItsMessag
 
     fs::remove_all(game() / "data2");
     const ApplyRun stopped = session->Apply();
-    EXPECT_TRUE(stopped.apply.stopped());
+    EXPECT_TRUE(stopped.apply.Stopped());
     ASSERT_EQ(stopped.shown.messages.size(), 1u);
     EXPECT_EQ(stopped.shown.messages[0].kind, Kind::Component);
     EXPECT_TRUE(stopped.shown.signalSound.empty());
@@ -102,12 +102,12 @@ TEST_F(SessionTest, FailedStepsFollowTheSoundInOneNotice_AStoppedRunHasItsMessag
 
 TEST_F(SessionTest, SaveConfirmsWithThePopupOrWarnsWithTheReason) {
     auto session = Open();
-    session->setGameFolder("D:\\FO2");
-    session->setCategoryOn(12, true);
-    session->chooseOption(catalog::OptionArray::Other, 9);
+    session->SetGameFolder("D:\\FO2");
+    session->SetCategoryOn(12, true);
+    session->ChooseOption(catalog::OptionArray::Other, 9);
     const Outcome saved = session->Save();
     EXPECT_EQ(saved.popup, (Popup{"Đã lưu thiết lập!", 2}));
-    EXPECT_EQ(catalog::LoadSettings(tool()).settings.selection, session->selection());
+    EXPECT_EQ(catalog::LoadSettings(tool()).settings.selection, session->Selection());
 
     fs::remove(tool() / "ThietLap.ini");
     fs::create_directories(tool() / "ThietLap.ini");  // a folder where the file goes
@@ -155,7 +155,7 @@ TEST_F(SessionTest, QuickLoadRemembersItsFolderAndConfirmsWithThePopup) {
     EXPECT_EQ(session->QuickLoad(dir_ / "faces").shown.popup, (Popup{"Hoàn tất!", 2}));
     const QuickLoadRun again = session->QuickLoad(std::nullopt);
     EXPECT_EQ(again.load.copied, std::vector<std::string>{"face1.dds"});
-    EXPECT_EQ(session->quickLoadFolder(), dir_ / "faces");
+    EXPECT_EQ(session->QuickLoadFolder(), dir_ / "faces");
 }
 
 // A set the player drops beside the catalog's is chosen, saved, applied like the others; when
@@ -164,20 +164,20 @@ TEST_F(SessionTest, AddedBallIsChosenSavedAppliedAndFallsBackWhenItsFolderGoes) 
     WriteSettings("F7");
     WriteFile(tool() / u8"extras/Ball/Bóng Tết/textures/ball10.dds", "tet ball");
     auto session = Open();
-    ASSERT_NE(session->addedVariants().Find(catalog::GroupId::Ball, "Bóng Tết"), nullptr);
+    ASSERT_NE(session->AddedVariants().Find(catalog::GroupId::Ball, "Bóng Tết"), nullptr);
     EXPECT_FALSE(session->TakeGoneNotice());
 
     session->ChooseAdded(catalog::GroupId::Ball, "No such set");  // not listed: nothing changes
-    EXPECT_EQ(session->selection().chosen(catalog::GroupId::Ball), 1);
+    EXPECT_EQ(session->Selection().Chosen(catalog::GroupId::Ball), 1);
     session->ChooseAdded(catalog::GroupId::Ball, "Bóng Tết");
-    EXPECT_EQ(session->selection().chosenAdded(catalog::GroupId::Ball), "Bóng Tết");
+    EXPECT_EQ(session->Selection().ChosenAdded(catalog::GroupId::Ball), "Bóng Tết");
     EXPECT_FALSE(session->Save().popup->text.empty());
     const ApplyRun run = session->Apply();
     EXPECT_TRUE(run.apply.Failures().empty());
     EXPECT_EQ(testing::ReadText(game() / "zdata/data2/ball/textures/ball10.dds"), "tet ball");
 
     // A second start reads the choice back.
-    EXPECT_EQ(Open()->selection().chosenAdded(catalog::GroupId::Ball), "Bóng Tết");
+    EXPECT_EQ(Open()->Selection().ChosenAdded(catalog::GroupId::Ball), "Bóng Tết");
 
     fs::remove_all(tool() / u8"extras/Ball/Bóng Tết");
     WriteFile(tool() / "extras/Ball/Empty one/.hidden", "");
@@ -187,8 +187,8 @@ TEST_F(SessionTest, AddedBallIsChosenSavedAppliedAndFallsBackWhenItsFolderGoes) 
     EXPECT_EQ(refreshed.messages[0].text,
               "Không còn thư mục của bộ đã chọn, đã chọn lại mặc định:\n"
               "• extras\\Ball\\Bóng Tết → Europa League 2011");
-    EXPECT_EQ(session->selection().chosen(catalog::GroupId::Ball), 1);
-    EXPECT_EQ(SkippedLine(session->addedVariants(), catalog::GroupId::Ball),
+    EXPECT_EQ(session->Selection().Chosen(catalog::GroupId::Ball), 1);
+    EXPECT_EQ(SkippedLine(session->AddedVariants(), catalog::GroupId::Ball),
               "Bỏ qua: Empty one (thư mục trống)");
     EXPECT_TRUE(session->RefreshAddedVariants().messages.empty());  // said once
 
@@ -198,7 +198,7 @@ TEST_F(SessionTest, AddedBallIsChosenSavedAppliedAndFallsBackWhenItsFolderGoes) 
     ASSERT_TRUE(notice);
     EXPECT_NE(notice->text.find("Bóng Tết"), std::string::npos);
     EXPECT_FALSE(restarted->TakeGoneNotice());
-    EXPECT_EQ(restarted->selection().chosen(catalog::GroupId::Ball), 1);
+    EXPECT_EQ(restarted->Selection().Chosen(catalog::GroupId::Ball), 1);
 }
 
 }  // namespace

@@ -39,22 +39,22 @@ QByteArray Redirect(const QByteArray& to) {
 }
 
 TEST(UpdateCheckTextTest, OnlyTheExactVersionLineIsCurrent) {
-    EXPECT_TRUE(IsCurrentVersion(ReadFetchedText("v2.0-demo")));
+    EXPECT_TRUE(isCurrentVersion(ReadFetchedText("v2.0-demo")));
     for (const char* other : {"v2.0-demo ", "v2.0-demo\r\nbeta", "v2.0-demo\n", "V2.0-DEMO", ""}) {
-        EXPECT_FALSE(IsCurrentVersion(ReadFetchedText(other))) << other;
+        EXPECT_FALSE(isCurrentVersion(ReadFetchedText(other))) << other;
     }
 }
 
 TEST(UpdateCheckTextTest, RedirectsStayOnTheHostAndNeverLeaveHttps) {
     const QUrl origin(QStringLiteral("http://up.example.net/v"));
     const QUrl secure(QStringLiteral("https://up.example.net/v"));
-    EXPECT_TRUE(UpdateCheck::AllowsRedirect(origin, origin, QUrl("http://up.example.net/v2")));
-    EXPECT_TRUE(UpdateCheck::AllowsRedirect(origin, origin, secure));
-    EXPECT_TRUE(UpdateCheck::AllowsRedirect(origin, secure, QUrl("https://up.example.net/x")));
-    EXPECT_FALSE(UpdateCheck::AllowsRedirect(origin, secure, origin));
-    EXPECT_FALSE(UpdateCheck::AllowsRedirect(origin, origin, QUrl("http://evil.example.net/v")));
-    EXPECT_FALSE(UpdateCheck::AllowsRedirect(origin, origin, QUrl("http://up.example.net:81/v")));
-    EXPECT_FALSE(UpdateCheck::AllowsRedirect(origin, origin, QUrl("file:///etc/passwd")));
+    EXPECT_TRUE(UpdateCheck::allowsRedirect(origin, origin, QUrl("http://up.example.net/v2")));
+    EXPECT_TRUE(UpdateCheck::allowsRedirect(origin, origin, secure));
+    EXPECT_TRUE(UpdateCheck::allowsRedirect(origin, secure, QUrl("https://up.example.net/x")));
+    EXPECT_FALSE(UpdateCheck::allowsRedirect(origin, secure, origin));
+    EXPECT_FALSE(UpdateCheck::allowsRedirect(origin, origin, QUrl("http://evil.example.net/v")));
+    EXPECT_FALSE(UpdateCheck::allowsRedirect(origin, origin, QUrl("http://up.example.net:81/v")));
+    EXPECT_FALSE(UpdateCheck::allowsRedirect(origin, origin, QUrl("file:///etc/passwd")));
 }
 
 // A window with the update buttons, and an HTTP server on 127.0.0.1 that answers each path with

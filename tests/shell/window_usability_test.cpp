@@ -148,26 +148,26 @@ TEST_F(WindowUsabilityTest, FolderDialogStartsAtTheNearestExistingFolderElseInTh
     ScopedEnv prefixEnv("WINEPREFIX", prefix.string());
     const auto native = [](const fs::path& path) { return QString::fromStdString(path.string()); };
 
-    EXPECT_EQ(FolderDialogStart(native(prefix / "drive_c/Program Files/Games")),
+    EXPECT_EQ(folderDialogStart(native(prefix / "drive_c/Program Files/Games")),
               native(prefix / "drive_c/Program Files/Games"));
     // Missing folders below an existing one, in the Wine prefix, in any letter case.
-    EXPECT_EQ(FolderDialogStart(QStringLiteral("c:\\program files\\games\\FIFA Online 2")),
+    EXPECT_EQ(folderDialogStart(QStringLiteral("c:\\program files\\games\\FIFA Online 2")),
               native(prefix / "drive_c/Program Files/Games"));
-    EXPECT_EQ(FolderDialogStart(native(home / "nowhere/deeper")), native(home));
+    EXPECT_EQ(folderDialogStart(native(home / "nowhere/deeper")), native(home));
     // Nothing usable typed: the prefix's drive C, else home.
     for (const char* nothing : {"", "  ", "relative/folder"}) {
-        EXPECT_EQ(FolderDialogStart(QString::fromUtf8(nothing)), native(prefix / "drive_c"))
+        EXPECT_EQ(folderDialogStart(QString::fromUtf8(nothing)), native(prefix / "drive_c"))
             << nothing;
     }
     std::filesystem::remove_all(prefix);
-    EXPECT_EQ(FolderDialogStart(QString()), native(home));
+    EXPECT_EQ(folderDialogStart(QString()), native(home));
 }
 
 TEST_F(WindowUsabilityTest, FolderDialogSpeaksVietnameseAndListsHiddenFolders) {
     std::filesystem::create_directories(dir_ / ".wine");
     std::filesystem::create_directories(dir_ / "Games");
     QFileDialog dialog;
-    PrepareFolderDialog(dialog, QStringLiteral("Ho tro nap nhanh cac file Face va Ball"),
+    prepareFolderDialog(dialog, QStringLiteral("Ho tro nap nhanh cac file Face va Ball"),
                         QString::fromStdString(dir_.path().string()));
     EXPECT_EQ(dialog.proxyModel()->headerData(0, Qt::Horizontal, Qt::DisplayRole).toString(),
               "Tên");
@@ -218,7 +218,7 @@ TEST_F(WindowUsabilityTest, ARunIsSummedUpInTheTrayTooltipAndItsFailedStepsInANo
     EXPECT_LE(tray_->toolTip().size(), 127);
 
     // A line break in the status stays on one line.
-    tray_->SetStatusLine(QStringLiteral("a\nb"));
+    tray_->setStatusLine(QStringLiteral("a\nb"));
     EXPECT_EQ(tray_->toolTip(), "Kickvane v2.0\na b");
 }
 
