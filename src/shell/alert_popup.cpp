@@ -15,11 +15,7 @@ namespace kickvane::shell {
 namespace {
 
 QColor toQColor(popup::Colour colour, const QPalette& palette) {
-    if (colour == popup::kButtonFaceColour) {
-        return palette.color(QPalette::Button);
-    }
-    return QColor(static_cast<int>(colour & 0xFF), static_cast<int>((colour >> 8) & 0xFF),
-                  static_cast<int>((colour >> 16) & 0xFF));
+    return colour.buttonFace ? palette.color(QPalette::Button) : QColor::fromRgb(colour.rgb);
 }
 
 QFont popupFont() {
@@ -43,8 +39,8 @@ popup::PopupEnvironment AlertPopup::screenEnvironment() {
         environment.screen.workAreaRightPx = work.x() + work.width();
         environment.screen.workAreaBottomPx = work.y() + work.height();
         environment.screen.screenHeightPx = screen->geometry().height();
-        environment.screen.twipsPerPixelX = 1440.0 / screen->logicalDotsPerInchX();
-        environment.screen.twipsPerPixelY = 1440.0 / screen->logicalDotsPerInchY();
+        environment.screen.dotsPerInchX = screen->logicalDotsPerInchX();
+        environment.screen.dotsPerInchY = screen->logicalDotsPerInchY();
     }
     environment.translucencySupported =
         QGuiApplication::platformName() != QLatin1String("offscreen");
