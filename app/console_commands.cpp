@@ -5,14 +5,23 @@
 
 namespace kickvane::app {
 
+namespace {
+
+// Asked for something that needs the window: says so and lists what this build can do.
+int NoWindow() {
+    std::cerr << "kickvane: bản này không có cửa sổ; hãy dùng một trong các lệnh dưới đây.\n\n";
+    PrintUsage(std::cerr);
+    return 2;
+}
+
+}  // namespace
+
 int RunWindowCommand(int&, char**, Args) {
-    PrintUsage(std::cout);
-    return 0;
+    return NoWindow();
 }
 
 int RunSkinGallery(Args) {
-    std::cerr << "kickvane: this build has no window system\n";
-    return 2;
+    return NoWindow();
 }
 
 }  // namespace kickvane::app

@@ -121,7 +121,12 @@ TEST_F(ApplyTest, FailedStepsAreListedWithAReasonAndTheRunGoesOn) {
     EXPECT_FALSE(outcome.signalSound.empty());
 }
 
+// A pitch variant leaves its own grass and the shared textures in the main tree, with the base
+// set's dirt and lines over the variant's, and the second tree's pitch back at the base set; it
+// touches nothing else in the game.
 TEST_F(ApplyTest, PitchVariantEndsWithTheBaseSetsDirtAndLines) {
+    // An earlier run's pitch in the second tree is overwritten, not kept.
+    WriteFile(game() / "zdata/data2/pitch/zbase.dds", "earlier variant");
     PatchSelection selection = Only({1});
     selection.SetOptionValue(OptionArray::Other, 5, true);
     // A trailing separator on the game folder names the same folders.
@@ -131,6 +136,19 @@ TEST_F(ApplyTest, PitchVariantEndsWithTheBaseSetsDirtAndLines) {
     EXPECT_EQ(ReadText(textures / "shadow.dds"), "shared shadow");
     EXPECT_EQ(ReadText(textures / "grass_dirt.dds"), "base dirt");
     EXPECT_EQ(ReadText(textures / "grass_pitchlines.dds"), "base lines");
+    EXPECT_EQ(ReadText(game() / "zdata/data2/pitch/zbase.dds"), "zbase pitch");
+
+    std::vector<std::string> files;
+    for (const auto& entry : fs::recursive_directory_iterator(game())) {
+        if (entry.is_regular_file()) {
+            files.push_back(entry.path().lexically_relative(game()).generic_string());
+        }
+    }
+    std::sort(files.begin(), files.end());
+    EXPECT_EQ(files, (std::vector<std::string>{
+                         "data2/pitch/textures/grass.dds", "data2/pitch/textures/grass_dirt.dds",
+                         "data2/pitch/textures/grass_pitchlines.dds",
+                         "data2/pitch/textures/shadow.dds", "zdata/data2/pitch/zbase.dds"}));
 }
 
 // A missing parent of the target fails the copy too; the failed steps above show that.

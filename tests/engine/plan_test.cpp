@@ -49,18 +49,6 @@ TEST(BuildPlan, VariantStepsComeBeforeTheFixedStepsAndAGroupWithoutChoiceHasOnly
         Describe(BuildPlan(adboard)),
         (std::vector<std::string>{"merge ExtrasFolder\\adboard\\WC 2010 -> ZDataRoot\\adboard",
                                   "merge ToolDataRoot\\ingame_ad -> DataRoot\\ingame_ad"}));
-
-    // The pitch variant is followed by the shared textures, then the base set's dirt and lines.
-    PatchSelection pitch = OnlyCategory(1);
-    pitch.SetOptionValue(OptionArray::Other, 6, true);
-    EXPECT_EQ(
-        Describe(BuildPlan(pitch)),
-        (std::vector<std::string>{
-            "merge ExtrasFolder\\pitch\\Oval UCL -> DataRoot\\pitch\\textures",
-            "merge ExtrasFolder\\pitch\\_textures -> DataRoot\\pitch\\textures",
-            "copy ToolDataRoot\\pitch\\textures\\grass_dirt.dds -> DataRoot\\pitch\\textures",
-            "copy ToolDataRoot\\pitch\\textures\\grass_pitchlines.dds -> DataRoot\\pitch\\textures",
-            "merge ToolZDataRoot\\pitch -> ZDataRoot\\pitch"}));
 }
 
 // A variant the player added runs the very steps of the catalog's variants of its group, from its
