@@ -2,6 +2,7 @@
 
 #include "catalog/catalog.h"
 #include "platform/filesystem.h"
+#include "catalog/ini.h"
 #include "platform/text.h"
 #include "text/utf.h"
 
@@ -309,6 +310,26 @@ LaunchRun Session::Launch(LaunchFrom from) {
         run.shown.popup = Popup{std::string(kHiddenPopupText), 2};
     }
     return run;
+}
+
+std::optional<std::string> RunStatusLine(const ApplyRun& run, ClockTime at) {
+    if (run.refused) {
+        return std::nullopt;
+    }
+    return engine::RunSummary(run.apply, at);
+}
+
+GameSearch Session::GameSearchCommand() const {
+    return [folders = searchFolders_.value_or(game::UserFolders::FromEnvironment())](
+               const std::atomic<bool>& cancel) {
+        return game::FindGame(folders, game::SearchLimits{}, &cancel);
+    };
+}
+
+Status Session::RecordNewVersion(std::string version) {
+    updates_.versionText = std::move(version);
+    return catalog::WriteIni(catalog::SettingsFile(toolFolder_), "KiemTra", "PhienBan",
+                             updates_.versionText);
 }
 
 QuickLoadRun Session::QuickLoad(std::optional<std::filesystem::path> chosen) {

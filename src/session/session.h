@@ -1,5 +1,7 @@
 #pragma once
 
+#include <atomic>
+#include <chrono>
 #include <filesystem>
 #include <functional>
 #include <memory>
@@ -14,6 +16,8 @@
 #include "engine/hotkey_poll.h"
 #include "engine/plan.h"
 #include "engine/quick_load.h"
+#include "engine/run_summary.h"
+#include "game/find_game.h"
 #include "game/launcher.h"
 #include "text/failure_text.h"
 #include "text/message.h"
@@ -32,6 +36,9 @@ inline constexpr std::string_view kHiddenPopupText = "Ẩn xuống khay hệ th�
 inline constexpr std::string_view kNoTrayPopupText = "Không có khay hệ thống: đã thu nhỏ cửa sổ!";
 inline constexpr std::string_view kSkinChangedPopupText = "Đã thay đổi giao diện!";
 inline constexpr std::string_view kQuickLoadDonePopupText = "Hoàn tất!";
+
+// How often the user interface runs one tick of the hotkey poll.
+inline constexpr std::chrono::milliseconds kHotkeyPollInterval = engine::HotkeyPoll::kInterval;
 
 struct Popup {
     std::string text;
@@ -82,6 +89,21 @@ struct QuickLoadRun {
 };
 
 using Launcher = std::function<game::LaunchOutcome(std::string_view gameFolder)>;
+
+// A time of day on the user's clock.
+using ClockTime = engine::ClockTime;
+
+// One line for places without room for more (the tray icon's tooltip): when the run was, how many
+// sets it copied and how many steps failed, or why it stopped. Nothing for a run that was
+// refused, which copied nothing and tells the user so itself.
+std::optional<std::string> RunStatusLine(const ApplyRun& run, ClockTime at);
+
+// The game search's answer: the folders that hold the launcher, where it looked, what it skipped.
+using GameSearchOutcome = game::FindOutcome;
+using FoundGame = game::FoundGame;
+// The game search as a command that owns what it needs, so it can run on another thread;
+// setting `cancel` ends it early.
+using GameSearch = std::function<GameSearchOutcome(const std::atomic<bool>& cancel)>;
 
 class Session {
 public:
@@ -139,8 +161,20 @@ public:
     QuickLoadRun QuickLoad(std::optional<std::filesystem::path> chosen);
     const std::filesystem::path& QuickLoadFolder() const { return quickLoadFolder_; }
 
-    UpdateState& Updates() { return updates_; }
+    // Looks for the game's launcher in the Wine prefixes and game managers' folders of the user
+    // (of the folders set with SetGameSearchFolders: tests use homes of their own).
+    GameSearch GameSearchCommand() const;
+    void SetGameSearchFolders(game::UserFolders folders) { searchFolders_ = std::move(folders); }
+
     const UpdateState& Updates() const { return updates_; }
+    // The update host has a version other than this one: keeps it and records it in the settings
+    // file ("KiemTra", "PhienBan"; line breaks dropped). Nothing reads the key back, so a failed
+    // write is only returned.
+    Status RecordNewVersion(std::string version);
+    // Keeps the version text that the update host gave, as fetched.
+    void KeepVersion(std::string version) { updates_.versionText = std::move(version); }
+    // Keeps the download link that the update host gave, as fetched.
+    void RecordDownloadLink(std::string link) { updates_.downloadLink = std::move(link); }
 
     // The game folder of the settings and the tool folder, which failures name paths from.
     text::ShownFolders ShownFolders() const;
@@ -157,6 +191,7 @@ private:
     Launcher launch_;
     std::filesystem::path quickLoadFolder_;
     UpdateState updates_;
+    std::optional<game::UserFolders> searchFolders_;
 };
 
 // The line under a group that names the folders of its added variants that were passed over and

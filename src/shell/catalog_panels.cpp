@@ -4,9 +4,8 @@
 #include <QScrollBar>
 
 #include "platform/text.h"
-#include "shell/game_finder.h"
 #include "shell/qt_text.h"
-#include "shell/skins.h"
+#include "shell/skin_look.h"
 
 namespace kickvane::shell {
 
@@ -94,7 +93,6 @@ void CatalogPanels::buildCategoryPanel(QWidget* panel) {
     browse_ = new QPushButton(QStringLiteral("Đổ&i thư mục"), panel);
     browse_->setGeometry(226, 27, 86, 27);
     connect(browse_, &QPushButton::clicked, this, &CatalogPanels::browseRequested);
-    addGameFinder(gameFolder_, browse_);
 
     for (const catalog::PatchCategory& category : catalog::Categories()) {
         const int i = category.switchIndex;

@@ -1,6 +1,6 @@
 #include "shell/command_buttons.h"
 
-#include "shell/skins.h"
+#include "shell/skin_look.h"
 
 namespace kickvane::shell {
 

@@ -9,7 +9,6 @@
 #include <array>
 #include <filesystem>
 
-#include "game/wine_prefix.h"
 #include "platform/filesystem.h"
 #include "shell/alert_popup.h"
 #include "shell/qt_text.h"
@@ -74,9 +73,9 @@ QString folderDialogStart(const QString& wanted) {
         }
     }
     // Nothing typed yet: where Windows games live here, the Wine prefix's drive C.
-    const game::UserFolders user = game::UserFolders::FromEnvironment();
-    for (const fs::path& prefix :
-         {user.winePrefix, user.home.empty() ? fs::path() : user.home / ".wine"}) {
+    const fs::path home = platform::PathFromUtf8(platform::GetEnv("HOME"));
+    for (const fs::path& prefix : {platform::PathFromUtf8(platform::GetEnv("WINEPREFIX")),
+                                   home.empty() ? fs::path() : home / ".wine"}) {
         if (!prefix.empty() && platform::IsDirectory(prefix / "drive_c")) {
             return pathToQString(prefix / "drive_c");
         }

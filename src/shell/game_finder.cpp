@@ -24,7 +24,7 @@ const QString kTitle = QStringLiteral("Tìm FIFA Online 2");
 const QString kCaption = QStringLiteral("Tì&m");
 
 // The list of several finds; the chosen folder goes into the box.
-void openChoice(QWidget* owner, QLineEdit* box, const std::vector<game::FoundGame>& games) {
+void openChoice(QWidget* owner, QLineEdit* box, const std::vector<session::FoundGame>& games) {
     auto* dialog = new QDialog(owner);
     dialog->setAttribute(Qt::WA_DeleteOnClose);
     dialog->setWindowTitle(kTitle);
@@ -33,7 +33,7 @@ void openChoice(QWidget* owner, QLineEdit* box, const std::vector<game::FoundGam
         new QLabel(QStringLiteral("Tìm thấy nhiều bản FIFA Online 2. Chọn một:"), dialog));
     auto* list = new QListWidget(dialog);
     list->setAccessibleName(QStringLiteral("Các thư mục tìm thấy"));
-    for (const game::FoundGame& game : games) {
+    for (const session::FoundGame& game : games) {
         auto* item = new QListWidgetItem(pathToQString(game.folder) + QStringLiteral("\n    ") +
                                          toQString(game.source));
         item->setData(Qt::UserRole, pathToQString(game.folder));
@@ -57,7 +57,7 @@ void openChoice(QWidget* owner, QLineEdit* box, const std::vector<game::FoundGam
     dialog->open();
 }
 
-void openNothingFound(QWidget* owner, const game::FindOutcome& outcome) {
+void openNothingFound(QWidget* owner, const session::GameSearchOutcome& outcome) {
     QString text = QStringLiteral("Không tìm thấy Gameloader.exe.\n\nĐã tìm trong:");
     for (const std::string& place : outcome.looked) {
         text += QStringLiteral("\n  ") + toQString(place);
@@ -75,12 +75,10 @@ void openNothingFound(QWidget* owner, const game::FindOutcome& outcome) {
 
 }  // namespace
 
-GameFinderButton::GameFinderButton(QLineEdit* gameFolderBox, game::UserFolders folders,
-                                   game::SearchLimits limits)
+GameFinderButton::GameFinderButton(QLineEdit* gameFolderBox, session::GameSearch search)
     : QPushButton(kCaption, gameFolderBox->parentWidget()),
       gameFolderBox_(gameFolderBox),
-      folders_(std::move(folders)),
-      limits_(limits) {
+      search_(std::move(search)) {
     setToolTip(
         QStringLiteral("Tìm thư mục cài FIFA Online 2 trong Wine và các trình quản lý game"));
     setAccessibleName(QStringLiteral("Tìm thư mục game"));
@@ -114,15 +112,14 @@ void GameFinderButton::start() {
     QApplication::setOverrideCursor(Qt::BusyCursor);
     // The search reads folders that may be slow or huge; the window goes on meanwhile. Its
     // result comes back to the window's thread through the event queue.
-    worker_ = std::thread([this, folders = folders_, limits = limits_] {
-        auto outcome =
-            std::make_shared<game::FindOutcome>(game::FindGame(folders, limits, &cancel_));
+    worker_ = std::thread([this, search = search_] {
+        auto outcome = std::make_shared<session::GameSearchOutcome>(search(cancel_));
         QMetaObject::invokeMethod(
             this, [this, outcome] { finish(*outcome); }, Qt::QueuedConnection);
     });
 }
 
-void GameFinderButton::finish(const game::FindOutcome& outcome) {
+void GameFinderButton::finish(const session::GameSearchOutcome& outcome) {
     finished_ = true;
     if (worker_.joinable()) {
         worker_.join();
@@ -140,8 +137,9 @@ void GameFinderButton::finish(const game::FindOutcome& outcome) {
     emit searchFinished();
 }
 
-GameFinderButton* addGameFinder(QLineEdit* gameFolderBox, QPushButton* browseButton) {
-    auto* button = new GameFinderButton(gameFolderBox, game::UserFolders::FromEnvironment());
+GameFinderButton* addGameFinder(QLineEdit* gameFolderBox, QPushButton* browseButton,
+                                session::GameSearch search) {
+    auto* button = new GameFinderButton(gameFolderBox, std::move(search));
     QRect box = gameFolderBox->geometry();
     box.setWidth(box.width() - kButtonWidth - kGap);
     gameFolderBox->setGeometry(box);

@@ -4,7 +4,7 @@
 #include <atomic>
 #include <thread>
 
-#include "game/find_game.h"
+#include "session/session.h"
 
 class QLineEdit;
 
@@ -16,8 +16,8 @@ namespace kickvane::shell {
 class GameFinderButton final : public QPushButton {
     Q_OBJECT
 public:
-    GameFinderButton(QLineEdit* gameFolderBox, game::UserFolders folders,
-                     game::SearchLimits limits = {});
+    // `search` is the session's game search; it runs on a thread of the button's.
+    GameFinderButton(QLineEdit* gameFolderBox, session::GameSearch search);
     ~GameFinderButton() override;
 
     bool searching() const { return worker_.joinable() && !finished_; }
@@ -28,12 +28,11 @@ signals:
 
 private:
     void start();
-    void finish(const game::FindOutcome& outcome);
+    void finish(const session::GameSearchOutcome& outcome);
     void stopWorker();
 
     QLineEdit* gameFolderBox_;
-    game::UserFolders folders_;
-    game::SearchLimits limits_;
+    session::GameSearch search_;
     std::thread worker_;
     std::atomic<bool> cancel_{false};
     bool finished_ = true;
@@ -41,6 +40,7 @@ private:
 
 // Puts a "Tìm" button between the game folder box and the change-folder button (the box gives
 // up the room) and returns it.
-GameFinderButton* addGameFinder(QLineEdit* gameFolderBox, QPushButton* browseButton);
+GameFinderButton* addGameFinder(QLineEdit* gameFolderBox, QPushButton* browseButton,
+                                session::GameSearch search);
 
 }  // namespace kickvane::shell

@@ -5,7 +5,6 @@
 #include <QPainter>
 #include <QTime>
 
-#include "engine/run_summary.h"
 #include "platform/filesystem.h"
 #include "shell/message_box.h"
 #include "shell/qt_text.h"
@@ -73,13 +72,13 @@ MainWindow::MainWindow(session::Session& session, ShellServices services, QWidge
     connectTray();
     tray_->icon().add();
 
-    hotkeyTimer_.setInterval(engine::HotkeyPoll::kInterval);
+    hotkeyTimer_.setInterval(session::kHotkeyPollInterval);
     connect(&hotkeyTimer_, &QTimer::timeout, this, &MainWindow::pollHotkey);
     hotkeyTimer_.start();
 
-    updateFlow_ = std::make_unique<UpdateFlow>(services_.updates, session_.ToolFolder(),
-                                               *services_.dialogs, this, buttons_->checkUpdate(),
-                                               buttons_->download(), session_.Updates());
+    addGameFinder(panels_->gameFolderBox(), panels_->browseButton(), session_.GameSearchCommand());
+    updateFlow_ = std::make_unique<UpdateFlow>(services_.updates, session_, *services_.dialogs,
+                                               this, buttons_->checkUpdate(), buttons_->download());
     showSession();
     connectPanels();
     connectButtons();
@@ -213,11 +212,10 @@ void MainWindow::applyPatchesNow() {
 }
 
 void MainWindow::showRun(const session::ApplyRun& run) {
-    if (!run.refused) {
-        // The tooltip keeps the last result where no sound is heard.
-        const QTime now = QTime::currentTime();
-        tray_->icon().setStatusLine(
-            toQString(engine::RunSummary(run.apply, {now.hour(), now.minute()})));
+    // The tooltip keeps the last result where no sound is heard.
+    const QTime now = QTime::currentTime();
+    if (const auto line = session::RunStatusLine(run, {now.hour(), now.minute()})) {
+        tray_->icon().setStatusLine(toQString(*line));
     }
     if (!run.failureAlert || isActiveWindow()) {
         if (!run.refused) {

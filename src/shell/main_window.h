@@ -10,6 +10,7 @@
 #include "shell/command_buttons.h"
 #include "shell/dialogs.h"
 #include "shell/fade_model.h"
+#include "shell/game_finder.h"
 #include "shell/outcome_view.h"
 #include "shell/side_window_set.h"
 #include "shell/skins.h"

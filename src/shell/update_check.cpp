@@ -7,8 +7,6 @@
 #include <QWidget>
 #include <utility>
 
-#include "catalog/ini.h"
-#include "catalog/settings.h"
 #include "shell/fetch_problem.h"
 #include "shell/message_box.h"
 #include "text/utf.h"
@@ -241,23 +239,21 @@ void UpdateCheck::fail(File file, const QString& reason) {
     }
 }
 
-UpdateFlow::UpdateFlow(UpdateCheck::Options options, std::filesystem::path toolFolder,
-                       Dialogs& dialogs, QWidget* owner, QPushButton* checkButton,
-                       QPushButton* downloadButton, session::UpdateState& state, UrlOpener openUrl,
-                       QObject* parent)
+UpdateFlow::UpdateFlow(UpdateCheck::Options options, session::Session& session, Dialogs& dialogs,
+                       QWidget* owner, QPushButton* checkButton, QPushButton* downloadButton,
+                       UrlOpener openUrl, QObject* parent)
     : QObject(parent),
       updates_(std::move(options)),
-      toolFolder_(std::move(toolFolder)),
+      session_(session),
       dialogs_(dialogs),
       owner_(owner),
       checkButton_(checkButton),
       downloadButton_(downloadButton),
-      state_(state),
       openUrl_(std::move(openUrl)) {
     connect(&updates_, &UpdateCheck::versionFetched, this, &UpdateFlow::onVersion);
     connect(&updates_, &UpdateCheck::versionFailed, this, &UpdateFlow::onVersionFailed);
     connect(&updates_, &UpdateCheck::linkFetched, this, [this](const QString& text) {
-        state_.downloadLink = text.toStdString();
+        session_.RecordDownloadLink(text.toStdString());
         link_ = LinkState::Fetched;
         emit linkFinished();
     });
@@ -287,11 +283,11 @@ void UpdateFlow::onVersion(const QString& text) {
         return;
     }
     checking_ = false;
-    state_.versionText = version;
     if (checkButton_) {
         checkButton_->setEnabled(true);
     }
     if (isCurrentVersion(version)) {
+        session_.KeepVersion(version);
         showMessage(fromVni("Chu7a co1 phie6n ba3n mo71i"), Dialogs::Icon::Information);
         emit checkFinished();
         return;
@@ -302,9 +298,8 @@ void UpdateFlow::onVersion(const QString& text) {
     if (checkButton_) {
         checkButton_->hide();  // until the tool closes
     }
-    // The writer drops the text's line breaks. Nothing reads the key back, so a failed write
-    // must not keep the user from hearing about the new version.
-    (void)catalog::WriteIni(catalog::SettingsFile(toolFolder_), "KiemTra", "PhienBan", version);
+    // A failed write must not keep the user from hearing about the new version.
+    (void)session_.RecordNewVersion(version);
     if (downloadButton_) {
         downloadButton_->show();
     }
@@ -323,7 +318,7 @@ void UpdateFlow::onVersionFailed(const QString& reason) {
 }
 
 void UpdateFlow::download() {
-    const std::optional<std::string> link = DownloadLink(state_.downloadLink);
+    const std::optional<std::string> link = DownloadLink(session_.Updates().downloadLink);
     const QUrl url = link ? QUrl(QString::fromStdString(*link), QUrl::TolerantMode) : QUrl();
     if (!url.isValid() || !isWebScheme(url.scheme()) || url.host().isEmpty()) {
         if (link_ == LinkState::Pending) {

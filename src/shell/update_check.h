@@ -109,16 +109,15 @@ private:
 
 // What the window's update buttons do. The window creates the buttons (check visible, download
 // hidden) and connects their clicks to check() and download(). The fetched version and link go
-// into `state`; buttons and state must outlive the flow.
+// to the session; buttons and session must outlive the flow.
 class UpdateFlow final : public QObject {
     Q_OBJECT
 public:
     using UrlOpener = std::function<bool(const QUrl&)>;
 
-    UpdateFlow(UpdateCheck::Options options, std::filesystem::path toolFolder, Dialogs& dialogs,
+    UpdateFlow(UpdateCheck::Options options, session::Session& session, Dialogs& dialogs,
                QWidget* owner, QPushButton* checkButton, QPushButton* downloadButton,
-               session::UpdateState& state, UrlOpener openUrl = &QDesktopServices::openUrl,
-               QObject* parent = nullptr);
+               UrlOpener openUrl = &QDesktopServices::openUrl, QObject* parent = nullptr);
 
     // Asks the host for its version. The check button stays disabled until the answer is in;
     // a newer version swaps the check button for the download button for good.
@@ -140,12 +139,11 @@ private:
     void showMessage(const QString& text, Dialogs::Icon icon);
 
     UpdateCheck updates_;
-    std::filesystem::path toolFolder_;
+    session::Session& session_;
     Dialogs& dialogs_;
     QPointer<QWidget> owner_;
     QPointer<QPushButton> checkButton_;
     QPointer<QPushButton> downloadButton_;
-    session::UpdateState& state_;
     UrlOpener openUrl_;
     bool checking_ = false;
     LinkState link_ = LinkState::NotAsked;

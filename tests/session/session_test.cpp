@@ -2,6 +2,10 @@
 
 #include <gtest/gtest.h>
 
+#include <atomic>
+#include <thread>
+
+#include "catalog/ini.h"
 #include "support/fake_keys.h"
 #include "support/trees.h"
 
@@ -69,6 +73,8 @@ TEST_F(SessionTest, UnreadableSettingsAreNamedAndNothingIsCopied) {
     ASSERT_EQ(run.shown.messages.size(), 1u);
     EXPECT_EQ(run.shown.messages[0], *session->SettingsProblem());
     EXPECT_FALSE(fs::exists(game() / "data2/cmn/base.dds"));
+    // The tray keeps the last real run's line: a refused run copied nothing.
+    EXPECT_FALSE(RunStatusLine(run, {9, 30}));
 }
 
 TEST_F(SessionTest, FailedStepsFollowTheSoundInOneNotice_AStoppedRunHasItsMessageAndNoSound) {
@@ -199,6 +205,38 @@ TEST_F(SessionTest, AddedBallIsChosenSavedAppliedAndFallsBackWhenItsFolderGoes) 
     EXPECT_NE(notice->text.find("Bóng Tết"), std::string::npos);
     EXPECT_FALSE(restarted->TakeGoneNotice());
     EXPECT_EQ(restarted->Selection().Chosen(catalog::GroupId::Ball), 1);
+}
+
+TEST_F(SessionTest, ANewVersionIsKeptAndRecordedInTheSettingsFileBesideTheUsersChoice) {
+    WriteSettings("F7");
+    auto session = Open();
+    EXPECT_TRUE(session->RecordNewVersion("v2.1\r\n"));
+    session->RecordDownloadLink("https://dl.example.net/kv.zip");
+    EXPECT_EQ(session->Updates().versionText, "v2.1\r\n");
+    EXPECT_EQ(session->Updates().downloadLink, "https://dl.example.net/kv.zip");
+    EXPECT_EQ(catalog::ReadIni(tool() / "ThietLap.ini", "KiemTra", "PhienBan", "-"), "v2.1");
+    EXPECT_EQ(catalog::ReadIni(tool() / "ThietLap.ini", "Thiet lap", "PhimTat", "-"), "F7");
+
+    fs::remove(tool() / "ThietLap.ini");
+    fs::create_directory(tool() / "ThietLap.ini");  // a folder in its place: the write fails
+    EXPECT_FALSE(session->RecordNewVersion("v2.2"));
+    EXPECT_EQ(session->Updates().versionText, "v2.2");
+}
+
+TEST_F(SessionTest, GameSearchRunsOnAnotherThreadInTheFoldersItWasGiven) {
+    auto session = Open();
+    const fs::path home = tool().parent_path() / "home";
+    WriteFile(home / ".wine/system.reg", "WINE REGISTRY Version 2\n");
+    WriteFile(home / ".wine/drive_c/FIFA/Gameloader.exe", "MZ");
+    session->SetGameSearchFolders({home, home / ".config", home / ".local/share", {}});
+    const GameSearch search = session->GameSearchCommand();
+    session.reset();  // the command owns what it needs
+
+    std::atomic<bool> cancel{false};
+    GameSearchOutcome found;
+    std::thread([&] { found = search(cancel); }).join();
+    ASSERT_EQ(found.games.size(), 1u);
+    EXPECT_EQ(fs::canonical(found.games[0].folder), fs::canonical(home / ".wine/drive_c/FIFA"));
 }
 
 }  // namespace

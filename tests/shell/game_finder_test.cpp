@@ -19,11 +19,13 @@ namespace fs = std::filesystem;
 using testing::TempDir;
 using testing::WriteFile;
 
-// A game folder box, and a home folder of its own.
+// A game folder box, and a session whose game search looks in a home folder of its own.
 class GameFinderTest : public ::testing::Test {
 protected:
-    game::UserFolders folders() const {
-        return {dir_ / "home", dir_ / "home/.config", dir_ / "home/.local/share", {}};
+    session::GameSearch search() {
+        session_.SetGameSearchFolders(
+            {dir_ / "home", dir_ / "home/.config", dir_ / "home/.local/share", {}});
+        return session_.GameSearchCommand();
     }
 
     fs::path AddGame(const std::string& prefix) {
@@ -56,12 +58,13 @@ protected:
     }
 
     TempDir dir_;
+    session::Session session_{dir_ / "tool"};
     QWidget panel_;
     QLineEdit* box_ = new QLineEdit(&panel_);
 };
 
 TEST_F(GameFinderTest, OneFindFillsTheBox_SeveralOpenAListWithSources_NoneSaysWhereItLooked) {
-    GameFinderButton button(box_, folders());
+    GameFinderButton button(box_, search());
 
     Search(button);
     auto* message = OpenDialog<QMessageBox>();
@@ -95,7 +98,7 @@ TEST_F(GameFinderTest, ClosingTheWindowDuringASearchEndsItCleanly) {
         WriteFile(dir_ / "home/.wine/drive_c/d" / std::to_string(i) / "f.txt", "x");
     }
     AddGame(".wine");
-    auto* button = new GameFinderButton(box_, folders());
+    auto* button = new GameFinderButton(box_, search());
     QTest::mouseClick(button, Qt::LeftButton);
     delete button;  // stops and joins the search; its late result is dropped
     QApplication::processEvents();

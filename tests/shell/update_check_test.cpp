@@ -99,9 +99,9 @@ protected:
         check_->show();
         download_->hide();
         dialogs_.messages.clear();
-        return std::make_unique<UpdateFlow>(UpdateCheck::Options{QUrl(Root()), timeout},
-                                            dir_.path(), dialogs_, &window_, check_, download_,
-                                            state_, [this](const QUrl& url) {
+        return std::make_unique<UpdateFlow>(UpdateCheck::Options{QUrl(Root()), timeout}, *session_,
+                                            dialogs_, &window_, check_, download_,
+                                            [this](const QUrl& url) {
                                                 opened_ << url;
                                                 return true;
                                             });
@@ -133,7 +133,7 @@ protected:
     QWidget window_;
     QPushButton* check_ = new QPushButton(&window_);
     QPushButton* download_ = new QPushButton(&window_);
-    session::UpdateState state_;
+    std::unique_ptr<session::Session> session_ = std::make_unique<session::Session>(dir_.path());
     QList<QUrl> opened_;
 };
 
@@ -147,7 +147,7 @@ TEST_F(UpdateFlowTest, SameVersionSaysSoAndChangesNothing) {
     ASSERT_TRUE(checked.wait(kWaitMs));
 
     EXPECT_EQ(dialogs_.messages, QStringList{Message("Chưa có phiên bản mới")});
-    EXPECT_EQ(state_.versionText, "v2.0-demo\r\n");
+    EXPECT_EQ(session_->Updates().versionText, "v2.0-demo\r\n");
     EXPECT_TRUE(check_->isEnabled() && Shown(check_) && !Shown(download_));
     EXPECT_EQ(requests_.size(), 1);  // no link fetch
     EXPECT_FALSE(SettingsWritten());
@@ -166,8 +166,8 @@ TEST_F(UpdateFlowTest, NewerVersionIsShownConvertedRecordedAndSwapsTheButtons) {
     Check(*flow);
 
     EXPECT_EQ(dialogs_.messages, QStringList{Message("Đã có phiên bản mới! v2.1 mới\r\n")});
-    EXPECT_EQ(state_.versionText, "v2.1 mo71i\r\n");
-    EXPECT_EQ(state_.downloadLink, "https://dl.example.net/kv-2.1.zip\r\n");
+    EXPECT_EQ(session_->Updates().versionText, "v2.1 mo71i\r\n");
+    EXPECT_EQ(session_->Updates().downloadLink, "https://dl.example.net/kv-2.1.zip\r\n");
     EXPECT_TRUE(!Shown(check_) && Shown(download_));
     const auto ini = dir_ / "Thietlap.ini";
     EXPECT_EQ(catalog::ReadIni(ini, "KiemTra", "PhienBan", "-"), "v2.1 mo71i");
@@ -202,7 +202,7 @@ TEST_F(UpdateFlowTest, FailedChecksAreReportedAndChangeNothing) {
               "không trả về số phiên bản"}}) {
         SCOPED_TRACE(name);
         responses_["/v"] = response;
-        state_.versionText = "v1.9\r\n";
+        session_->KeepVersion("v1.9\r\n");
         const qsizetype requestsBefore = requests_.size();
         // A short limit for the silent server only: any other case must fail for its own reason.
         const bool silent = !response.isNull() && response.isEmpty();
@@ -214,8 +214,8 @@ TEST_F(UpdateFlowTest, FailedChecksAreReportedAndChangeNothing) {
         EXPECT_TRUE(shown.startsWith(Message("Không kiểm tra được phiên bản mới: ")) &&
                     shown.contains(QString::fromUtf8(reason)))
             << shown.toStdString();
-        EXPECT_EQ(state_.versionText, "v1.9\r\n");
-        EXPECT_TRUE(state_.downloadLink.empty());
+        EXPECT_EQ(session_->Updates().versionText, "v1.9\r\n");
+        EXPECT_TRUE(session_->Updates().downloadLink.empty());
         EXPECT_TRUE(check_->isEnabled() && Shown(check_) && !Shown(download_));
         EXPECT_FALSE(SettingsWritten());
         for (qsizetype i = requestsBefore; i < requests_.size(); ++i) {
@@ -233,14 +233,14 @@ TEST_F(UpdateFlowTest, DownloadOpensNothingButAWebAddress) {
     for (const QByteArray& response : {Ok("file:///etc/passwd\r\n"), QByteArray() /* none */}) {
         SCOPED_TRACE(response.toStdString());
         responses_["/vlink"] = response;
-        state_.downloadLink.clear();
+        session_->RecordDownloadLink({});
         flow = Flow();
         Check(*flow);
         dialogs_.messages.clear();
         flow->download();
         EXPECT_EQ(dialogs_.messages.size(), 1);
         if (response.isNull()) {
-            EXPECT_TRUE(state_.downloadLink.empty());
+            EXPECT_TRUE(session_->Updates().downloadLink.empty());
         }
     }
     EXPECT_TRUE(opened_.isEmpty());
