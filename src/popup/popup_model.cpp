@@ -211,10 +211,8 @@ void AlertPopupModel::Click() {
     }
 }
 
-void AlertPopupModel::SetCloseActivate(bool value) {
-    if (value) {
-        ticksLeft_ = 0;
-    }
+void AlertPopupModel::Dismiss() {
+    ticksLeft_ = 0;
 }
 
 PopupPhase AlertPopupModel::Phase() const {

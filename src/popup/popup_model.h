@@ -154,16 +154,15 @@ public:
     AlertPopupModel& operator=(const AlertPopupModel&) = delete;
 
     // Shows `message` (UTF-8). displaySeconds >= 1: stays that many × 80 ticks after arriving;
-    // 0: stays until clicked; negative: stays until CloseActivate.
+    // 0: stays until clicked; negative: stays until dismissed.
     void DisplayMessage(std::string_view message, int displaySeconds, const PopupStyle& style = {});
 
     // One step of the motion; call every kPopupTickInterval while the popup is shown.
     void Tick();
     // A click on the window or its text: the popup leaves unless it ignores clicks.
     void Click();
-    // Setting true sends any popup away at the next tick; reading always gives false.
-    void SetCloseActivate(bool value);
-    bool CloseActivate() const { return false; }
+    // Sends the popup away at the next tick, even one that ignores clicks.
+    void Dismiss();
 
     PopupPhase Phase() const;
     bool Shown() const { return shown_; }

@@ -82,7 +82,7 @@ TEST_F(PopupTest, Slot2RisesTwiceAsFarAndFast_AndFreedSlotsAreReused) {
     }
 }
 
-TEST_F(PopupTest, ZeroSecondsWaitsForAClick_NegativeSecondsOnlyForCloseActivate) {
+TEST_F(PopupTest, ZeroSecondsWaitsForAClick_NegativeSecondsUntilDismissed) {
     auto sticky = Show("Hello", 0);
     EXPECT_EQ(sticky->Text(), "(click here to close)\r\nHello");
     EXPECT_EQ(sticky->LabelPixels().top, 5);
@@ -95,9 +95,8 @@ TEST_F(PopupTest, ZeroSecondsWaitsForAClick_NegativeSecondsOnlyForCloseActivate)
     EXPECT_EQ(clickProof->Text(), "Hello");
     TicksIn(*clickProof, PopupPhase::Arriving);
     clickProof->Click();
-    clickProof->SetCloseActivate(false);
     EXPECT_EQ(TicksIn(*clickProof, PopupPhase::Resting, 500), 500);
-    clickProof->SetCloseActivate(true);
+    clickProof->Dismiss();
     EXPECT_EQ(clickProof->Phase(), PopupPhase::Leaving);
 }
 
