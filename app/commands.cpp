@@ -220,8 +220,8 @@ int RunPlan(Args args) {
 }
 
 int RunList(Args args) {
-    const std::optional<Options> options = ParseOptions(args, false);
-    if (!options || !options->positional.empty()) {
+    const std::optional<Options> options = ParseOptions(args, false, 0);
+    if (!options) {
         PrintUsage(std::cerr);
         return kExitStopped;
     }

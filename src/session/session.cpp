@@ -1,8 +1,8 @@
 #include "session/session.h"
 
 #include "catalog/catalog.h"
-#include "platform/filesystem.h"
 #include "catalog/ini.h"
+#include "platform/filesystem.h"
 #include "platform/text.h"
 #include "text/utf.h"
 
@@ -159,11 +159,11 @@ Session::Session(std::filesystem::path toolFolder, std::unique_ptr<platform::Key
     hotkeyValid_ = poll_.SetHotkey(settings_.hotkey);
 }
 
-void Session::setCategoryOn(int switchIndex, bool on) {
+void Session::SetCategoryOn(int switchIndex, bool on) {
     settings_.selection.SetSwitchValue(switchIndex, on ? 1 : 0);
 }
 
-void Session::chooseOption(catalog::OptionArray array, int index) {
+void Session::ChooseOption(catalog::OptionArray array, int index) {
     settings_.selection.SetOptionValue(array, index, true);
 }
 
@@ -199,13 +199,13 @@ std::optional<text::Message> Session::TakeGoneNotice() {
     return notice;
 }
 
-void Session::setHotkeyText(std::string text) {
+void Session::SetHotkeyText(std::string text) {
     settings_.hotkey = std::move(text);
     hotkeyValid_ = poll_.SetHotkey(settings_.hotkey);
 }
 
-std::string Session::activeHotkey() const {
-    const std::optional<int> key = poll_.key();
+std::string Session::ActiveHotkey() const {
+    const std::optional<int> key = poll_.Key();
     if (!key) {
         return {};
     }
@@ -214,11 +214,11 @@ std::string Session::activeHotkey() const {
     return name;
 }
 
-std::string Session::hotkeyProblem() const {
+std::string Session::HotkeyProblem() const {
     if (hotkeyValid_) {
         return {};
     }
-    const std::string active = activeHotkey();
+    const std::string active = ActiveHotkey();
     return "\"" + settings_.hotkey + "\" không phải phím F1–F12: " +
            (active.empty() ? "phím tắt chưa hoạt động." : "vẫn dùng " + active + ".");
 }
@@ -234,7 +234,7 @@ std::optional<text::Message> Session::SettingsProblem() const {
     if (settingsRead_) {
         return std::nullopt;
     }
-    std::string why = text::Capitalised(text::FailureText(settingsRead_.failure(), shownFolders()));
+    std::string why = text::Capitalised(text::FailureText(settingsRead_.failure(), ShownFolders()));
     if (!why.ends_with('.')) {
         why += '.';
     }
@@ -260,7 +260,7 @@ ApplyRun Session::Apply() {
     run.shown.signalSound = run.apply.signalSound;
     const std::vector<engine::StepOutcome> failures = run.apply.Failures();
     if (!failures.empty()) {
-        const text::ShownFolders folders = shownFolders();
+        const text::ShownFolders folders = ShownFolders();
         std::string text = "Đã chép xong, nhưng ";
         text += std::to_string(failures.size());
         text += " bước không thành công:";
@@ -274,7 +274,7 @@ ApplyRun Session::Apply() {
     return run;
 }
 
-text::ShownFolders Session::shownFolders() const {
+text::ShownFolders Session::ShownFolders() const {
     if (platform::TrimBlanks(settings_.gameFolder).empty()) {
         return {{}, toolFolder_};  // no game folder: nothing is shown from it
     }
@@ -292,7 +292,7 @@ Outcome Session::Save() {
         shown.messages.push_back(
             {text::Message::Kind::Warning,
              "Không lưu được thiết lập!\n" +
-                 text::Capitalised(text::FailureText(saved.failure(), shownFolders())) + ".",
+                 text::Capitalised(text::FailureText(saved.failure(), ShownFolders())) + ".",
              std::string(kNoticeTitle)});
     } else {
         shown.popup = Popup{std::string(kSavedPopupText), 2};
@@ -347,7 +347,7 @@ QuickLoadRun Session::QuickLoad(std::optional<std::filesystem::path> chosen) {
         std::string text = "Một số file không chép được:";
         for (const engine::QuickLoadFailure& failure : run.load.failures) {
             text += "\n• " + failure.pattern + ": " +
-                    text::FailureText(failure.failure, shownFolders());
+                    text::FailureText(failure.failure, ShownFolders());
         }
         run.shown.messages.push_back(Notice(std::move(text)));
     }
