@@ -22,6 +22,8 @@ namespace fs = std::filesystem;
 constexpr int kExitOk = 0;
 constexpr int kExitFailedSteps = 1;
 constexpr int kExitStopped = 2;
+// `trigger`: a copy of the window runs but took nothing.
+constexpr int kExitNoAnswer = 3;
 
 // The command line's face of a command's outcome: messages on standard error, the popup on
 // standard output, no sound.
@@ -310,11 +312,22 @@ int RunTrigger(Args args) {
         PrintUsage(std::cerr);
         return kExitStopped;
     }
-    if (!platform::SendToRunningInstance("trigger")) {
-        std::cerr << "kickvane: Kickvane chưa chạy, không có gì để kích hoạt.\n";
-        return 1;
+    switch (platform::SendToRunningInstance("trigger")) {
+        case platform::Delivery::Delivered:
+            return kExitOk;
+        case platform::Delivery::Queued:
+            std::cout << "Kickvane đang bận, lần chép sẽ chạy khi xong.\n";
+            return kExitOk;
+        case platform::Delivery::NoAnswer:
+            std::cerr << "kickvane: Kickvane đang chạy nhưng không trả lời; lần chép chưa được "
+                         "nhận, hãy thử lại.\n";
+            return kExitNoAnswer;
+        case platform::Delivery::NotRunning:
+        case platform::Delivery::Refused:
+            break;
     }
-    return kExitOk;
+    std::cerr << "kickvane: Kickvane chưa chạy, không có gì để kích hoạt.\n";
+    return 1;
 }
 
 }  // namespace kickvane::app

@@ -57,7 +57,7 @@ int RunFindGame(Args args) {
     const game::FindOutcome outcome =
         game::FindGame(game::UserFolders::FromEnvironment(), game::SearchLimits{});
     for (const game::FoundGame& game : outcome.games) {
-        std::cout << game.folder.string() << '\t' << game.source << '\n';
+        std::cout << platform::PathToUtf8(game.folder) << '\t' << game.source << '\n';
     }
     for (const std::string& skipped : outcome.skipped) {
         std::cerr << "skipped: " << skipped << '\n';

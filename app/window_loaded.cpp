@@ -32,7 +32,7 @@ std::optional<WindowEntry> FindWindowEntry(std::string& error) {
     const fs::path file = ModuleFile(programFolder);
     if (file.empty()) {
         error = std::string(KICKVANE_WINDOW_MODULE_NAME) + " is missing beside the program in " +
-                programFolder.string();
+                platform::PathToUtf8(programFolder);
         return std::nullopt;
     }
     static platform::Module module(file);  // loaded once, kept for the process's life

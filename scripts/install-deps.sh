@@ -8,6 +8,8 @@ packages=(
   cmake ninja-build g++ pkg-config clang-format g++-mingw-w64-x86-64-posix
   # libraries
   qt6-base-dev libqt6network6 libgl-dev
+  # Qt's translation tools: the Vietnamese words of Qt's own dialogs are compiled at build time
+  qt6-l10n-tools qt6-tools-dev
   libx11-dev libxi-dev libxtst-dev libcanberra-dev
   libgtest-dev libgmock-dev
   # run and test: virtual X server, key presses, a tray host, screenshots

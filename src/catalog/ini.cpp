@@ -9,6 +9,7 @@
 #include "platform/filesystem.h"
 #include "platform/text_encoding.h"
 #include "text/utf.h"
+#include "text/windows1258.h"
 
 namespace kickvane::catalog {
 
@@ -37,10 +38,14 @@ std::string Utf16BytesToUtf8(std::string_view bytes, bool bigEndian) {
 }
 
 // A line that is not UTF-8 was written by an older tool in the ANSI code page of its system: on
-// Windows that is this system's; elsewhere Windows-1252 is the best guess.
+// Windows that is this system's; elsewhere Windows-1258 (the tool's users are Vietnamese) when
+// the line reads as Vietnamese, else Windows-1252.
 std::string LineToUtf8(std::string_view bytes) {
     if (!text::IsValidUtf8(bytes)) {
         if (std::optional<std::string> decoded = platform::AnsiTextToUtf8(bytes)) {
+            return *std::move(decoded);
+        }
+        if (std::optional<std::string> decoded = text::VietnameseWindowsTextToUtf8(bytes)) {
             return *std::move(decoded);
         }
     }
@@ -146,13 +151,15 @@ std::optional<IniDocument> IniDocument::Parse(std::string_view bytes) {
     if (bytes.find('\0') != std::string_view::npos) {
         return std::nullopt;
     }
+    const bool eightBit = decoded.empty() && document.encoding_ != IniEncoding::Utf16Le &&
+                          document.encoding_ != IniEncoding::Utf16Be;
     size_t start = 0;
     while (start < bytes.size()) {
         size_t end = bytes.find_first_of("\r\n", start);
         if (end == std::string_view::npos) {
             end = bytes.size();
         }
-        document.lines_.push_back(LineToUtf8(bytes.substr(start, end - start)));
+        const std::string_view content = bytes.substr(start, end - start);
         start = end;
         if (start < bytes.size() && bytes[start] == '\r') {
             ++start;
@@ -160,6 +167,11 @@ std::optional<IniDocument> IniDocument::Parse(std::string_view bytes) {
         if (start < bytes.size() && bytes[start] == '\n') {
             ++start;
         }
+        Line line{LineToUtf8(content), std::nullopt, std::string(bytes.substr(end, start - end))};
+        if (eightBit) {
+            line.bytes = std::string(content);
+        }
+        document.lines_.push_back(std::move(line));
     }
     return document;
 }
@@ -178,14 +190,14 @@ Status IniDocument::Read(const fs::path& file, IniDocument* document) {
                 *document = std::move(*parsed);
                 return Status::Ok();
             }
-            return Status::Fail("Tệp thiết lập " + name + " không phải là văn bản.");
+            return Status::Fail("File thiết lập " + name + " không phải là văn bản.");
         case Result::Folder:
-            return Status::Fail("Tệp thiết lập " + name + " là một thư mục, không phải tệp.");
+            return Status::Fail("File thiết lập " + name + " là một thư mục, không phải file.");
         case Result::NotRegular:
-            return Status::Fail("Tệp thiết lập " + name +
-                                " không phải tệp thường (có thể là thiết bị hoặc ống dẫn).");
+            return Status::Fail("File thiết lập " + name +
+                                " không phải file thường (có thể là thiết bị hoặc ống dẫn).");
         case Result::TooLarge:
-            return Status::Fail("Tệp thiết lập " + name + " quá lớn (hơn " +
+            return Status::Fail("File thiết lập " + name + " quá lớn (hơn " +
                                 std::to_string(kMaxIniBytes >> 10) + " KiB).");
         case Result::Unreadable:
             break;
@@ -198,8 +210,8 @@ std::optional<std::string> IniDocument::Get(std::string_view section, std::strin
     const std::string wanted_key = NormalizeName(key);
     // Lines before the first section line form the section with the empty name.
     bool in_section = wanted_section.empty();
-    for (const std::string& line : lines_) {
-        const ParsedLine parsed = ParseLine(line);
+    for (const Line& line : lines_) {
+        const ParsedLine parsed = ParseLine(line.text);
         if (parsed.kind == LineKind::kSection) {
             if (in_section) {
                 return std::nullopt;  // the first such section has ended; later ones do not count
@@ -219,8 +231,8 @@ std::vector<std::pair<std::string, std::string>> IniDocument::Entries(
     const std::string wanted_section = NormalizeName(section);
     std::vector<std::pair<std::string, std::string>> entries;
     bool in_section = wanted_section.empty();
-    for (const std::string& line : lines_) {
-        const ParsedLine parsed = ParseLine(line);
+    for (const Line& line : lines_) {
+        const ParsedLine parsed = ParseLine(line.text);
         if (parsed.kind == LineKind::kSection) {
             if (in_section) {
                 break;
@@ -260,7 +272,7 @@ Status IniDocument::Set(std::string_view section, std::string_view key, std::str
         insert_at = 0;
     }
     for (size_t i = 0; i < lines_.size(); ++i) {
-        const ParsedLine parsed = ParseLine(lines_[i]);
+        const ParsedLine parsed = ParseLine(lines_[i].text);
         if (parsed.kind == LineKind::kSection) {
             if (in_section) {
                 break;
@@ -278,7 +290,8 @@ Status IniDocument::Set(std::string_view section, std::string_view key, std::str
         if (parsed.kind == LineKind::kEntry &&
             platform::NamesEqualIgnoringCase(parsed.name, key_name)) {
             // Keep the key's spelling as the file has it.
-            lines_[i] = std::string(parsed.name) + "=" + new_value;
+            lines_[i].text = std::string(parsed.name) + "=" + new_value;
+            lines_[i].bytes.reset();
             return Status::Ok();
         }
         // Blank lines and comments at the end of a section usually belong to the next one.
@@ -287,11 +300,11 @@ Status IniDocument::Set(std::string_view section, std::string_view key, std::str
         }
     }
 
-    std::string entry = key_name + "=" + new_value;
+    Line entry{key_name + "=" + new_value, std::nullopt, "\r\n"};
     if (insert_at) {
         lines_.insert(lines_.begin() + static_cast<std::ptrdiff_t>(*insert_at), std::move(entry));
     } else {
-        lines_.push_back("[" + section_name + "]");
+        lines_.push_back(Line{"[" + section_name + "]", std::nullopt, "\r\n"});
         lines_.push_back(std::move(entry));
     }
     return Status::Ok();
@@ -299,9 +312,11 @@ Status IniDocument::Set(std::string_view section, std::string_view key, std::str
 
 std::string IniDocument::Serialize() const {
     std::string text;
-    for (const std::string& line : lines_) {
-        text += line;
-        text += "\r\n";
+    for (size_t i = 0; i < lines_.size(); ++i) {
+        const Line& line = lines_[i];
+        text += line.bytes ? *line.bytes : line.text;
+        // A last line without its end gets one when a line was added after it.
+        text += line.end.empty() && i + 1 < lines_.size() ? "\r\n" : line.end;
     }
     switch (encoding_) {
         case IniEncoding::Utf8:
@@ -318,7 +333,14 @@ std::string IniDocument::Serialize() const {
 
 Status IniDocument::Save(const fs::path& file) const {
     const fs::path resolved = platform::ResolveCaseInsensitive(file);
-    Status saved = platform::WriteFileAtomically(resolved, Serialize());
+    const std::string bytes = Serialize();
+    // A file the reader would refuse loses every setting at the next start: keep the old one.
+    if (bytes.size() > kMaxIniBytes) {
+        return Status::Fail("Tệp thiết lập " + DisplayName(resolved) + " sẽ quá lớn (hơn " +
+                            std::to_string(kMaxIniBytes >> 10) +
+                            " KiB): thay đổi này không được ghi.");
+    }
+    Status saved = platform::WriteFileAtomically(resolved, bytes);
     // What saves killed half-way left behind goes now, once the new file is in place.
     platform::RemoveStaleTemporaries(resolved.parent_path().empty() ? fs::path(".")
                                                                     : resolved.parent_path());
@@ -345,6 +367,9 @@ std::string ReadIni(const fs::path& file, std::string_view section, std::string_
 Status WriteIni(const fs::path& file, std::string_view section, std::string_view key,
                 std::string_view value) {
     try {
+        // Another process's write of the same file between this read and this write would be
+        // lost: the two take turns.
+        const platform::FileUpdateLock turn(platform::ResolveCaseInsensitive(file));
         IniDocument document;
         if (Status loaded = IniDocument::Read(file, &document); !loaded) {
             return loaded;

@@ -22,8 +22,10 @@
 //
 // Text is UTF-8 in memory. A file that starts with a UTF-16 byte-order mark (either byte order)
 // is read as UTF-16 and written back in it, as the platform's profile functions do. A line of
-// any other file that is not valid UTF-8 was written in the Windows ANSI code page and is read as
-// Windows-1252, so no byte is ever dropped.
+// any other file that is not valid UTF-8 was written in a Windows ANSI code page: on Windows it
+// is read in the system's; elsewhere as Windows-1258 when it reads as Vietnamese, else as
+// Windows-1252, so no byte is ever dropped. A write changes only the lines it sets: every other
+// line of such a file keeps its bytes and its line end.
 namespace kickvane::catalog {
 
 // Largest settings file read; anything bigger is no settings file of ours.
@@ -59,18 +61,26 @@ public:
     // ';', a section containing ']'.
     Status Set(std::string_view section, std::string_view key, std::string_view value);
 
-    // The file's bytes in the document's encoding, every line ended by CR LF.
+    // The file's bytes in the document's encoding: lines read from the file as they were (in a
+    // UTF-16 file, as text), set and added lines in UTF-8 ended by CR LF.
     std::string Serialize() const;
 
     IniEncoding Encoding() const { return encoding_; }
 
     // Writes the document over the file found under `file` in any letter case (or creates it),
-    // atomically: on failure the previous file stays as it was.
+    // atomically: on failure the previous file stays as it was. A document larger than the
+    // reader accepts (kMaxIniBytes) is not written.
     Status Save(const std::filesystem::path& file) const;
 
 private:
+    struct Line {
+        std::string text;                  // UTF-8, without the line end
+        std::optional<std::string> bytes;  // as read from a file of 8-bit text; unset once set
+        std::string end = "\r\n";          // as read; empty for a last line without one
+    };
+
     IniEncoding encoding_ = IniEncoding::Utf8;
-    std::vector<std::string> lines_;  // UTF-8, without line ends
+    std::vector<Line> lines_;
 };
 
 // Reads one value as the platform's profile reader does; `defaultValue` (without its trailing

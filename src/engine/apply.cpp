@@ -43,6 +43,10 @@ StepOutcome RunStep(const PlanStep& step, const Roots& roots) {
                 return outcome;
             }
             status = MakeFolder(roots.Resolve(step.target));
+            if (!status && FolderExists(roots.Resolve(step.target))) {
+                outcome.state = StepState::NotNeeded;  // another program made it meanwhile
+                return outcome;
+            }
             break;
     }
     if (!status) {
@@ -65,11 +69,12 @@ std::vector<StepOutcome> ApplyOutcome::Failures() const {
 }
 
 std::string ToolDataMissingText(const Roots& roots) {
-    return "Khong tim thay: " + roots.toolData.string() + "\r\nKiem tra lai duong dan";
+    return "Không tìm thấy: " + platform::PathToUtf8(roots.toolData) + "\r\nKiểm tra lại đường dẫn";
 }
 
 std::string ToolDataTooLongText(const Roots& roots) {
-    return "Duong dan qua dai: " + roots.toolData.string() + "\r\nKiem tra lai duong dan";
+    return "Đường dẫn quá dài: " + platform::PathToUtf8(roots.toolData) +
+           "\r\nKiểm tra lại đường dẫn";
 }
 
 std::filesystem::path SignalSoundPath(const std::filesystem::path& toolFolder) {

@@ -37,8 +37,8 @@ struct ApplyOutcome {
     std::vector<StepOutcome> Failures() const;
 };
 
-// Messages of the two folder checks, as stored (the second one VNI-typed).
-inline constexpr std::string_view kToolDataMissingTitle = "Thu muc nguon";
+// Messages of the two folder checks (the second one stored VNI-typed).
+inline constexpr std::string_view kToolDataMissingTitle = "Thư mục nguồn";
 std::string ToolDataMissingText(const Roots& roots);
 std::string ToolDataTooLongText(const Roots& roots);
 inline constexpr std::string_view kDataMissingVni =

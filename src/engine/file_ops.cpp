@@ -2,6 +2,9 @@
 
 #include <algorithm>
 #include <atomic>
+#include <condition_variable>
+#include <cstdint>
+#include <memory>
 #include <mutex>
 #include <system_error>
 #include <thread>
@@ -26,7 +29,7 @@ public:
     explicit FolderIndex(const fs::path& folder) : names_(platform::EntriesByFoldedName(folder)) {
         std::erase_if(names_, [&folder](const auto& entry) {
             return platform::IsTemporaryName(entry.second) &&
-                   platform::RemoveIfStale(folder / entry.second);
+                   platform::RemoveIfStale(folder / platform::PathFromUtf8(entry.second));
         });
     }
 
@@ -44,6 +47,19 @@ private:
     std::unordered_map<std::string, std::string> names_;
 };
 
+// Creates one folder. Another program (a second apply on the same game) may have created it
+// since the caller looked: a folder there now is what was wanted.
+Status MakeFolderIfMissing(const fs::path& folder) {
+    Status made = platform::MakeDirectory(folder);
+    return made || platform::IsDirectory(folder) ? Status::Ok() : made;
+}
+
+// A copy that failed because another program replaced the target meanwhile (a second apply of
+// the same sets) has nothing left to do when the target now equals its source.
+bool ReplacedByAnEqualCopy(const fs::path& source, const fs::path& target) {
+    return platform::IsUpToDateCopy(source, target);
+}
+
 Status CopyOne(const fs::path& source, const fs::path& target, CopyCount* count) {
     if (platform::IsUpToDateCopy(source, target)) {
         if (count) {
@@ -52,124 +68,239 @@ Status CopyOne(const fs::path& source, const fs::path& target, CopyCount* count)
         return Status::Ok();
     }
     Status status = platform::ReplaceFile(source, target);
+    if (!status && ReplacedByAnEqualCopy(source, target)) {
+        status = Status::Ok();
+    }
     if (status && count) {
         ++count->copied;
     }
     return status;
 }
 
-// One file of a folder to copy, and whether the target folder holds its name already.
+// One file to copy, and whether the target folder holds its name already.
 struct FileJob {
     std::string sourceName;
     std::string targetName;
     bool targetExists = false;
 };
 
-// How many files of one folder are copied at once. A copy is mostly the kernel's work, which runs
-// on as many cores as there are copies under way; a folder of a few files is not worth a thread.
-unsigned CopyWorkers(size_t files) {
-    constexpr size_t kFilesPerWorker = 32;
-    const unsigned cores = std::clamp(std::thread::hardware_concurrency(), 1u, 4u);
-    return static_cast<unsigned>(std::clamp<size_t>(files / kFilesPerWorker, 1, cores));
-}
+// The files of one folder of the tree. Its two folders are opened by the first copy that needs
+// them and closed once its last file is done, so that a tree of thousands of folders keeps only
+// a few open at a time.
+struct FolderJobs {
+    fs::path source;
+    fs::path target;
+    std::vector<FileJob> files;
+    bool oneByOne = false;  // two names differ only in letter case: copy them in name order
 
-// Copies the files of one folder, several at once where there are many. On a failure no further
-// file is started, and the failure of the first file in name order among those tried is returned.
-Status CopyFiles(platform::FolderCopy& files, const std::vector<FileJob>& jobs, bool oneByOne,
-                 CopyCount* count) {
-    std::atomic<size_t> next{0};
-    std::atomic<bool> stop{false};
-    std::atomic<int> copied{0};
-    std::atomic<int> upToDate{0};
-    std::mutex failureMutex;
-    size_t failedAt = jobs.size();
-    Status failure = Status::Ok();
-    const auto work = [&] {
-        while (!stop.load(std::memory_order_relaxed)) {
-            const size_t i = next.fetch_add(1, std::memory_order_relaxed);
-            if (i >= jobs.size()) {
-                return;
-            }
-            bool wasCopied = false;
-            Status status = files.Copy(jobs[i].sourceName, jobs[i].targetName, jobs[i].targetExists,
-                                       &wasCopied);
-            if (!status) {
-                const std::lock_guard lock(failureMutex);
-                if (i < failedAt) {
-                    failedAt = i;
-                    failure = std::move(status);
-                }
-                stop = true;
-                return;
-            }
-            ++(wasCopied ? copied : upToDate);
+    std::mutex openMutex;
+    std::unique_ptr<platform::FolderCopy> opened;
+    std::atomic<size_t> left{0};
+
+    platform::FolderCopy& Open() {
+        const std::lock_guard lock(openMutex);
+        if (!opened) {
+            opened = std::make_unique<platform::FolderCopy>(source, target);
         }
-    };
-    {
-        const unsigned workers = oneByOne ? 1 : CopyWorkers(jobs.size());
-        std::vector<std::jthread> helpers;
-        try {
-            while (helpers.size() + 1 < workers) {
-                helpers.emplace_back(work);
-            }
-        } catch (const std::system_error&) {
-            // No more threads to be had: the ones there are do the work.
-        }
-        work();
-    }  // the helpers are joined here
-    if (count) {
-        count->copied += copied;
-        count->upToDate += upToDate;
+        return *opened;
     }
-    return failure;
-}
+    void Done(size_t files) {
+        if (left.fetch_sub(files) == files) {
+            const std::lock_guard lock(openMutex);
+            opened.reset();
+        }
+    }
+};
+
+// A share of the work that one thread takes at a time: one file, or every file of a folder whose
+// names collide. Shares are numbered in the order the copy has always taken: a folder's files in
+// name order, then its subfolders in name order, depth first.
+struct Share {
+    FolderJobs* folder;
+    size_t first;
+    size_t count;
+};
+
+// Copies a tree. The calling thread walks it (reading each folder once and creating the target's
+// folders) and hands out its files as shares; copying threads join as the shares pile up, so the
+// first file is copied at once and a tree of a few files needs no thread. On a failure no further
+// share is started or folder walked, and the failure of the first share in order among those tried
+// is returned; the walk's own failure comes after every share handed out before it.
+class TreeCopy {
+public:
+    Status Run(const fs::path& source, const fs::path& target, CopyCount* count) {
+        {
+            Walk(source, target);
+            const std::lock_guard lock(mutex_);
+            walkDone_ = true;
+        }
+        ready_.notify_all();
+        Work();            // the walking thread copies what is left
+        helpers_.clear();  // joins them
+        if (count) {
+            count->copied += copied_;
+            count->upToDate += upToDate_;
+        }
+        return failure_ ? std::move(walkFailure_) : std::move(failure_);
+    }
+
+private:
+    // A copying thread for every this many files waiting, up to the cores (at most four).
+    static constexpr size_t kFilesPerWorker = 32;
+
+    void Walk(const fs::path& source, const fs::path& target) {
+        if (stop_.load(std::memory_order_relaxed)) {
+            return;
+        }
+        auto folder = std::make_unique<FolderJobs>();
+        folder->source = source;
+        folder->target = target;
+        std::vector<std::string> subfolders;
+        // Two files that would land on one name on a file system that ignores letter case are
+        // copied one after the other, so that the last in name order wins as it always has.
+        std::unordered_set<std::string> foldedNames;
+        std::error_code ec;
+        const FolderIndex index(target);
+        for (fs::directory_iterator it(source, ec), end; !ec && it != end; it.increment(ec)) {
+            std::string name = platform::PathToUtf8(it->path().filename());
+            std::error_code typeError;
+            if (it->is_directory(typeError)) {
+                subfolders.push_back(std::move(name));
+                continue;
+            }
+            std::string folded = platform::FoldCase(name);
+            auto [targetName, exists] = index.Name(name, folded);
+            folder->oneByOne = !foldedNames.insert(std::move(folded)).second || folder->oneByOne;
+            folder->files.push_back({std::move(name), std::move(targetName), exists});
+        }
+        if (ec) {
+            walkFailure_ = Status::Fail(FailedAction::ReadFolder, source, ec);
+            return;
+        }
+        std::sort(folder->files.begin(), folder->files.end(),
+                  [](const FileJob& a, const FileJob& b) { return a.sourceName < b.sourceName; });
+        std::sort(subfolders.begin(), subfolders.end());
+        HandOut(std::move(folder));
+        for (const std::string& name : subfolders) {
+            const auto [targetName, exists] = index.Name(name);
+            const fs::path into = target / platform::PathFromUtf8(targetName);
+            if (!exists || !platform::IsDirectory(into)) {
+                if (Status made = MakeFolderIfMissing(into); !made) {
+                    walkFailure_ = std::move(made);
+                    return;
+                }
+            }
+            Walk(source / platform::PathFromUtf8(name), into);
+            if (!walkFailure_) {
+                return;
+            }
+        }
+    }
+
+    void HandOut(std::unique_ptr<FolderJobs> folder) {
+        const size_t files = folder->files.size();
+        if (files == 0) {
+            return;
+        }
+        folder->left = files;
+        size_t waiting = 0;
+        {
+            const std::lock_guard lock(mutex_);
+            if (folder->oneByOne) {
+                shares_.push_back({folder.get(), 0, files});
+            } else {
+                for (size_t i = 0; i < files; ++i) {
+                    shares_.push_back({folder.get(), i, 1});
+                }
+            }
+            waitingFiles_ += files;
+            waiting = waitingFiles_;
+            folders_.push_back(std::move(folder));
+        }
+        ready_.notify_all();
+        AddHelpers(waiting);
+    }
+
+    void AddHelpers(size_t waitingFiles) {
+        static const unsigned cores = std::clamp(std::thread::hardware_concurrency(), 1u, 4u);
+        // The walking thread copies too once the walk is done, so it counts as one.
+        while (helpers_.size() + 1 < cores && waitingFiles / kFilesPerWorker > helpers_.size()) {
+            try {
+                helpers_.emplace_back([this] { Work(); });
+            } catch (const std::system_error&) {
+                return;  // no more threads to be had: the ones there are do the work
+            }
+        }
+    }
+
+    // Takes the next share; false when there is none left or the run stopped.
+    bool Take(size_t& index, Share& share) {
+        std::unique_lock lock(mutex_);
+        ready_.wait(lock, [this] {
+            return stop_.load(std::memory_order_relaxed) || next_ < shares_.size() || walkDone_;
+        });
+        if (stop_.load(std::memory_order_relaxed) || next_ >= shares_.size()) {
+            return false;
+        }
+        index = next_++;
+        share = shares_[index];
+        waitingFiles_ -= share.count;
+        return true;
+    }
+
+    void Work() {
+        size_t index = 0;
+        Share share{};
+        while (Take(index, share)) {
+            platform::FolderCopy& files = share.folder->Open();
+            Status status = Status::Ok();
+            size_t done = 0;
+            for (; done < share.count && status; ++done) {
+                const FileJob& job = share.folder->files[share.first + done];
+                bool wasCopied = false;
+                status = files.Copy(job.sourceName, job.targetName, job.targetExists, &wasCopied);
+                if (!status && ReplacedByAnEqualCopy(
+                                   share.folder->source / platform::PathFromUtf8(job.sourceName),
+                                   share.folder->target / platform::PathFromUtf8(job.targetName))) {
+                    status = Status::Ok();
+                }
+                if (status) {
+                    ++(wasCopied ? copied_ : upToDate_);
+                }
+            }
+            if (!status) {
+                // The folder stays open; the run ends, and its folders close with it.
+                const std::lock_guard lock(mutex_);
+                if (index < failedAt_) {
+                    failedAt_ = index;
+                    failure_ = std::move(status);
+                }
+                stop_ = true;
+                ready_.notify_all();
+                return;
+            }
+            share.folder->Done(done);
+        }
+    }
+
+    std::mutex mutex_;
+    std::condition_variable ready_;
+    std::vector<std::unique_ptr<FolderJobs>> folders_;
+    std::vector<Share> shares_;
+    size_t next_ = 0;
+    size_t waitingFiles_ = 0;
+    bool walkDone_ = false;
+    std::atomic<bool> stop_{false};
+    size_t failedAt_ = SIZE_MAX;
+    Status failure_ = Status::Ok();
+    Status walkFailure_ = Status::Ok();
+    std::atomic<int> copied_{0};
+    std::atomic<int> upToDate_{0};
+    std::vector<std::jthread> helpers_;  // last: joined before the rest goes
+};
 
 Status CopyTree(const fs::path& source, const fs::path& target, CopyCount* count) {
-    std::vector<FileJob> jobs;
-    std::vector<std::string> folders;
-    // Two files that would land on one name on a file system that ignores letter case are
-    // copied one after the other, so that the last in name order wins as it always has.
-    std::unordered_set<std::string> foldedNames;
-    bool namesCollide = false;
-    std::error_code ec;
-    const FolderIndex index(target);
-    for (fs::directory_iterator it(source, ec), end; !ec && it != end; it.increment(ec)) {
-        std::string name = it->path().filename().string();
-        std::error_code typeError;
-        if (it->is_directory(typeError)) {
-            folders.push_back(std::move(name));
-            continue;
-        }
-        std::string folded = platform::FoldCase(name);
-        auto [targetName, exists] = index.Name(name, folded);
-        namesCollide = !foldedNames.insert(std::move(folded)).second || namesCollide;
-        jobs.push_back({std::move(name), std::move(targetName), exists});
-    }
-    if (ec) {
-        return Status::Fail(FailedAction::ReadFolder, source, ec);
-    }
-    std::sort(jobs.begin(), jobs.end(),
-              [](const FileJob& a, const FileJob& b) { return a.sourceName < b.sourceName; });
-    std::sort(folders.begin(), folders.end());
-    {
-        platform::FolderCopy files(source, target);  // both folders opened once for all files
-        if (Status copied = CopyFiles(files, jobs, namesCollide, count); !copied) {
-            return copied;
-        }
-    }
-    for (const std::string& name : folders) {
-        const auto [targetName, exists] = index.Name(name);
-        const fs::path into = target / platform::PathFromUtf8(targetName);
-        if (!exists || !platform::IsDirectory(into)) {
-            if (Status made = platform::MakeDirectory(into); !made) {
-                return made;
-            }
-        }
-        if (Status copied = CopyTree(source / platform::PathFromUtf8(name), into, count); !copied) {
-            return copied;
-        }
-    }
-    return Status::Ok();
+    return TreeCopy().Run(source, target, count);
 }
 
 // `path` is missing, or the system refuses it for its length.
@@ -193,7 +324,7 @@ Status MergeCopy(const fs::path& source, const fs::path& target, CopyCount* coun
         if (!platform::IsDirectory(into.parent_path())) {
             return NotFound(FailedAction::CopyInto, into);
         }
-        if (Status made = platform::MakeDirectory(into); !made) {
+        if (Status made = MakeFolderIfMissing(into); !made) {
             return made;
         }
     }
@@ -209,8 +340,9 @@ Status CopyFileInto(const fs::path& file, const fs::path& folder, CopyCount* cou
     if (!platform::IsDirectory(into)) {
         return NotFound(FailedAction::CopyInto, into);
     }
-    const fs::path target = platform::FindEntryIgnoringCase(into, from.filename().string())
-                                .value_or(into / from.filename());
+    const fs::path target =
+        platform::FindEntryIgnoringCase(into, platform::PathToUtf8(from.filename()))
+            .value_or(into / from.filename());
     return CopyOne(from, target, count);
 }
 

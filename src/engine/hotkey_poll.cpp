@@ -25,7 +25,13 @@ bool HotkeyPoll::SetHotkey(std::string_view name) {
 }
 
 bool HotkeyPoll::Tick() {
-    return key_ && sampler_ && sampler_->Sample(*key_).any();
+    if (!key_ || !sampler_) {
+        heldAtLastTick_ = false;
+        return false;
+    }
+    const platform::KeySample sample = sampler_->Sample(*key_);
+    heldAtLastTick_ = sample.down;
+    return sample.any();
 }
 
 }  // namespace kickvane::engine

@@ -34,7 +34,7 @@ constexpr std::array<Pattern, 7> kPatterns{{
 std::vector<fs::path> MatchingFiles(const fs::path& folder, std::string_view pattern) {
     std::vector<fs::path> matches;
     for (const fs::path& file : platform::ListPlainFiles(folder)) {
-        if (MatchesWildcard(file.filename().string(), pattern)) {
+        if (MatchesWildcard(platform::PathToUtf8(file.filename()), pattern)) {
             matches.push_back(file);
         }
     }

@@ -24,10 +24,14 @@ struct FindOutcome {
     bool cancelled = false;
 };
 
-// Looks for "Gameloader.exe" where Linux players keep Windows games: $WINEPREFIX, ~/.wine, Lutris,
-// Bottles, Heroic, PlayOnLinux, Steam's prefixes, Wine's menu entries. In each prefix the install
-// folders that its registry records come first, then a bounded search of drive_c. Nothing is
-// written anywhere. `cancel`, when given, ends the search early.
+// Looks for "Gameloader.exe". On Linux, where players keep Windows games: $WINEPREFIX, ~/.wine,
+// Lutris, Bottles, Heroic, PlayOnLinux, Steam's prefixes, Wine's menu entries; in each prefix the
+// install folders that its registry records come first, then a bounded search of drive_c. On
+// Windows (`folders` unused): the install folders of the registry's uninstall entries, the
+// shortcuts on the desktop and in the Start menu that start a Gameloader.exe, then every fixed
+// drive's top folders (Program Files and those named like "Games" first), four levels deep, within
+// `limits`' time and entries, skipping Windows and links. Nothing is written anywhere. `cancel`,
+// when given, ends the search early.
 FindOutcome FindGame(const UserFolders& folders, const SearchLimits& limits,
                      const std::atomic<bool>* cancel = nullptr);
 

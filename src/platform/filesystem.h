@@ -1,6 +1,7 @@
 #pragma once
 
 #include <atomic>
+#include <chrono>
 #include <cstdint>
 #include <filesystem>
 #include <optional>
@@ -77,6 +78,21 @@ private:
 // On failure the previous file is left as it was.
 Status WriteFileAtomically(const fs::path& path, std::string_view content);
 
+// Keeps other processes from updating the file at `path` while it lives: two read-change-write
+// cycles of one file (two `kickvane ini set` at once) then follow each other instead of the later
+// write undoing the earlier one. Holds nothing where the file does not exist yet, where the
+// system has no such locks, or when another holder keeps it for more than a few seconds.
+class FileUpdateLock {
+public:
+    explicit FileUpdateLock(const fs::path& path);
+    ~FileUpdateLock();
+    FileUpdateLock(const FileUpdateLock&) = delete;
+    FileUpdateLock& operator=(const FileUpdateLock&) = delete;
+
+private:
+    int fd_ = -1;
+};
+
 // The temporary files of ReplaceFile and WriteFileAtomically are named ".NAME.kv-XXXXXX" (six
 // letters or digits), NAME being the final name cut short where the whole would pass the limit
 // of 255 bytes for one name.
@@ -85,11 +101,16 @@ std::string TemporaryNamePrefix(std::string_view fileName);  // ".NAME.kv-"
 bool IsTemporaryName(std::string_view name);
 
 // Removes `file`, a temporary file of ours, when no save or copy writes it any more (its writer
-// was killed or crashed). True when it was removed.
-bool RemoveIfStale(const fs::path& file);
+// was killed or crashed): nothing holds its lock and it has not changed for `minimumAge`. A
+// writer keeps its file locked from just after its creation until it has been renamed into
+// place; the age spares the moment before the lock, and writers that hold no lock (the Windows
+// program under Wine writing the same folder). True when it was removed.
+inline constexpr std::chrono::seconds kStaleTemporaryAge{5};
+bool RemoveIfStale(const fs::path& file, std::chrono::seconds minimumAge = kStaleTemporaryAge);
 
 // RemoveIfStale for every temporary file of ours directly inside `folder`.
-void RemoveStaleTemporaries(const fs::path& folder);
+void RemoveStaleTemporaries(const fs::path& folder,
+                            std::chrono::seconds minimumAge = kStaleTemporaryAge);
 
 // True when the system refuses `path` for its length: the whole path, or one of its names.
 bool IsTooLong(const fs::path& path);

@@ -16,7 +16,7 @@ std::unordered_map<std::string, std::string> EntriesByFoldedName(const fs::path&
     std::error_code ec;
     for (fs::directory_iterator it(folder.empty() ? fs::path(".") : folder, ec), end;
          !ec && it != end; it.increment(ec)) {
-        std::string name = it->path().filename().string();
+        std::string name = PathToUtf8(it->path().filename());
         auto [pos, inserted] = names.emplace(FoldCase(name), name);
         if (!inserted && name < pos->second) {
             pos->second = std::move(name);
@@ -36,7 +36,7 @@ std::optional<fs::path> FindEntryIgnoringCase(const fs::path& folder, std::strin
     if (found == names.end()) {
         return std::nullopt;
     }
-    return folder / found->second;
+    return folder / PathFromUtf8(found->second);
 }
 
 bool IsDirectory(const fs::path& path) {
@@ -104,7 +104,7 @@ std::vector<fs::path> ListPlainFiles(const fs::path& folder) {
     std::vector<fs::path> files;
     std::error_code ec;
     for (fs::directory_iterator it(folder, ec), end; !ec && it != end; it.increment(ec)) {
-        const std::string name = it->path().filename().string();
+        const std::string name = PathToUtf8(it->path().filename());
         std::error_code typeError;
         if (!name.empty() && name.front() != '.' && it->is_regular_file(typeError)) {
             files.push_back(it->path());
@@ -139,11 +139,11 @@ bool IsTemporaryName(std::string_view name) {
     });
 }
 
-void RemoveStaleTemporaries(const fs::path& folder) {
+void RemoveStaleTemporaries(const fs::path& folder, std::chrono::seconds minimumAge) {
     std::error_code ec;
     for (fs::directory_iterator it(folder, ec), end; !ec && it != end; it.increment(ec)) {
-        if (IsTemporaryName(it->path().filename().string())) {
-            RemoveIfStale(it->path());
+        if (IsTemporaryName(PathToUtf8(it->path().filename()))) {
+            RemoveIfStale(it->path(), minimumAge);
         }
     }
 }

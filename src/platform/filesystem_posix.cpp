@@ -9,10 +9,13 @@
 #include <array>
 #include <atomic>
 #include <cerrno>
+#include <chrono>
 #include <cstdint>
 #include <cstring>
+#include <ctime>
 #include <random>
 #include <string>
+#include <thread>
 
 #include "platform/filesystem.h"
 #include "platform/posix_fd.h"
@@ -54,6 +57,24 @@ int OpenFolder(const fs::path& folder) {
     return ::open(folder.empty() ? "." : folder.c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC);
 }
 
+// Gives the unnamed file `fd` the name `targetName` in the folder `dirFd`. Linking by descriptor
+// needs a privilege on kernels before 6.10; the descriptor's entry under /proc does not. Once
+// refused, the process goes to /proc straight away.
+bool LinkUnnamed(int fd, int dirFd, const std::string& targetName) {
+    static std::atomic<bool> byDescriptor{true};
+    if (byDescriptor.load(std::memory_order_relaxed)) {
+        if (::linkat(fd, "", dirFd, targetName.c_str(), AT_EMPTY_PATH) == 0) {
+            return true;
+        }
+        if (errno != EPERM && errno != ENOENT) {
+            return false;
+        }
+        byDescriptor.store(false, std::memory_order_relaxed);
+    }
+    const std::string self = "/proc/self/fd/" + std::to_string(fd);
+    return ::linkat(AT_FDCWD, self.c_str(), dirFd, targetName.c_str(), AT_SYMLINK_FOLLOW) == 0;
+}
+
 // A temporary file beside its final place, in the folder `dirFd`; removed unless it was renamed
 // into place. It holds an exclusive lock for its life, which tells RemoveIfStale that its writer
 // still runs.
@@ -61,6 +82,22 @@ class TempFile {
 public:
     TempFile(int dirFd, const std::string& targetName, mode_t mode) : dirFd_(dirFd) {
         const std::string prefix = TemporaryNamePrefix(targetName);
+        // Where the file system has unnamed files, the file is locked before it gets its name,
+        // so that no cleaner ever sees it unlocked.
+        if (Fd unnamed(::openat(dirFd, ".", O_TMPFILE | O_WRONLY | O_CLOEXEC, mode));
+            unnamed.valid() && ::flock(unnamed.get(), LOCK_EX) == 0) {
+            for (int attempt = 0; attempt < 16; ++attempt) {
+                std::string name = prefix + UniqueSuffix();
+                if (LinkUnnamed(unnamed.get(), dirFd, name)) {
+                    fd_ = unnamed.Release();
+                    name_ = std::move(name);
+                    return;
+                }
+                if (errno != EEXIST) {
+                    break;
+                }
+            }
+        }
         for (int attempt = 0; attempt < 16; ++attempt) {
             std::string name = prefix + UniqueSuffix();
             const int fd =
@@ -99,17 +136,19 @@ public:
     bool valid() const { return fd_ >= 0; }
     int fd() const { return fd_; }
 
-    // Closes the file and renames it over `targetName`; `target` names it in messages.
+    // Renames the file over `targetName`, then closes it; `target` names it in messages. The lock
+    // is held until the rename is done: a file closed first would look abandoned to a cleaner in
+    // another process, which could delete it before it reaches its place.
     Status CommitAs(const std::string& targetName, const fs::path& target) {
-        int fd = fd_;
-        fd_ = -1;
-        if (::close(fd) != 0) {
-            return Failed(FailedAction::Write, target, errno);
-        }
         if (::renameat(dirFd_, name_.c_str(), dirFd_, targetName.c_str()) != 0) {
             return Failed(FailedAction::Replace, target, errno);
         }
         committed_ = true;
+        const int fd = fd_;
+        fd_ = -1;
+        if (::close(fd) != 0) {
+            return Failed(FailedAction::Write, target, errno);
+        }
         return Status::Ok();
     }
 
@@ -226,24 +265,6 @@ void TakeModeAndTimes(int out, const struct stat& st) {
     }
     const struct timespec times[2] = {st.st_atim, st.st_mtim};
     ::futimens(out, times);
-}
-
-// Gives the unnamed file `fd` the name `targetName` in the folder `dirFd`. Linking by descriptor
-// needs a privilege on kernels before 6.10; the descriptor's entry under /proc does not. Once
-// refused, the process goes to /proc straight away.
-bool LinkUnnamed(int fd, int dirFd, const std::string& targetName) {
-    static std::atomic<bool> byDescriptor{true};
-    if (byDescriptor.load(std::memory_order_relaxed)) {
-        if (::linkat(fd, "", dirFd, targetName.c_str(), AT_EMPTY_PATH) == 0) {
-            return true;
-        }
-        if (errno != EPERM && errno != ENOENT) {
-            return false;
-        }
-        byDescriptor.store(false, std::memory_order_relaxed);
-    }
-    const std::string self = "/proc/self/fd/" + std::to_string(fd);
-    return ::linkat(AT_FDCWD, self.c_str(), dirFd, targetName.c_str(), AT_SYMLINK_FOLLOW) == 0;
 }
 
 enum class NewFile { Written, Failed, Unsupported };
@@ -407,14 +428,60 @@ Status WriteFileAtomically(const fs::path& path, std::string_view content) {
     return temp.CommitAs(path.filename().string(), path);
 }
 
-bool RemoveIfStale(const fs::path& file) {
+FileUpdateLock::FileUpdateLock(const fs::path& path) {
+    // A writer replaces the file by renaming a new one over it, so the file locked may have been
+    // replaced by the time the lock is granted: then the new one is locked instead.
+    const auto giveUp = std::chrono::steady_clock::now() + std::chrono::seconds(5);
+    while (std::chrono::steady_clock::now() < giveUp) {
+        Fd fd(::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NOFOLLOW | O_NONBLOCK));
+        struct stat held {};
+        if (!fd.valid() || ::fstat(fd.get(), &held) != 0 || !S_ISREG(held.st_mode)) {
+            return;
+        }
+        while (::flock(fd.get(), LOCK_EX | LOCK_NB) != 0) {
+            if (errno != EWOULDBLOCK || std::chrono::steady_clock::now() >= giveUp) {
+                return;
+            }
+            std::this_thread::sleep_for(std::chrono::milliseconds(1));
+        }
+        struct stat named {};
+        if (::stat(path.c_str(), &named) == 0 && named.st_dev == held.st_dev &&
+            named.st_ino == held.st_ino) {
+            fd_ = fd.Release();
+            return;
+        }
+    }
+}
+
+FileUpdateLock::~FileUpdateLock() {
+    if (fd_ >= 0) {
+        ::close(fd_);
+    }
+}
+
+bool RemoveIfStale(const fs::path& file, std::chrono::seconds minimumAge) {
     Fd fd(::open(file.c_str(), O_RDONLY | O_CLOEXEC | O_NOFOLLOW | O_NONBLOCK));
     struct stat st {};
     if (fd.get() < 0 || ::fstat(fd.get(), &st) != 0 || !S_ISREG(st.st_mode)) {
         return false;
     }
+    // A writer creates its file and only then locks it: a file changed lately may be one whose
+    // lock is still to come. The change time counts, as a copy sets the modification time to its
+    // source's.
+    struct timespec now {};
+    ::clock_gettime(CLOCK_REALTIME, &now);
+    if (now.tv_sec - st.st_ctim.tv_sec < minimumAge.count()) {
+        return false;
+    }
     // The writer's lock goes with its process: a lock that can be taken has no writer.
     if (::flock(fd.get(), LOCK_EX | LOCK_NB) != 0) {
+        return false;
+    }
+    // The writer renames its file before it lets go of the lock, so the file locked here may
+    // since have reached its final name: then the temporary name is gone or names another file.
+    struct stat named {};
+    if (::lstat(file.c_str(), &named) != 0 || named.st_dev != st.st_dev ||
+        named.st_ino != st.st_ino) {
         return false;
     }
     return ::unlink(file.c_str()) == 0;

@@ -166,9 +166,15 @@ Status FolderCopy::Copy(const std::string& sourceName, const std::string& target
     return *copied ? ReplaceFile(source, target) : Status::Ok();
 }
 
-bool RemoveIfStale(const fs::path& file) {
+// Windows' sharing rules keep the file replaceable only when it is not held open: nothing is
+// held here.
+FileUpdateLock::FileUpdateLock(const fs::path&) {}
+FileUpdateLock::~FileUpdateLock() = default;
+
+bool RemoveIfStale(const fs::path& file, std::chrono::seconds minimumAge) {
     // A file that its writer still holds open cannot be deleted. Between the writer's close and
-    // its rename the file is free, so only files last written some time ago count as stale.
+    // its rename the file is free, so only files made and last written some time ago count as
+    // stale (a copy takes its source's modification time, so the creation time counts too).
     WIN32_FILE_ATTRIBUTE_DATA data{};
     if (!::GetFileAttributesExW(file.c_str(), GetFileExInfoStandard, &data) ||
         (data.dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY)) {
@@ -179,8 +185,13 @@ bool RemoveIfStale(const fs::path& file) {
     const auto ticks = [](const FILETIME& time) {
         return (static_cast<unsigned long long>(time.dwHighDateTime) << 32) | time.dwLowDateTime;
     };
-    constexpr unsigned long long kMinuteTicks = 60ULL * 10'000'000ULL;
-    if (ticks(now) < ticks(data.ftLastWriteTime) + kMinuteTicks) {
+    // Never less than a minute here: the writer holds no lock over its rename.
+    const unsigned long long age =
+        std::max<unsigned long long>(60, static_cast<unsigned long long>(minimumAge.count())) *
+        10'000'000ULL;
+    const unsigned long long changed =
+        std::max(ticks(data.ftLastWriteTime), ticks(data.ftCreationTime));
+    if (ticks(now) < changed + age) {
         return false;
     }
     return ::DeleteFileW(file.c_str()) != 0;

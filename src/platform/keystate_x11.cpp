@@ -3,9 +3,10 @@
 // also while another program holds a keyboard grab (since XInput 2.1), and listening takes no key
 // away from the program that has the focus. Nothing is grabbed.
 //
-// There is no thread: each sample asks the server for the keyboard map (a round trip, after which
-// every raw event sent before it is in the queue) and then drains the queued events, so a press
-// that went down and up between two samples is still seen.
+// There is no thread: each sample drains the queued events, so a press that went down and up
+// between two samples is still seen, and asks the server for the keyboard map only while the key
+// looks held. The connection's descriptor becomes readable when an event arrives: an event loop
+// samples then, and needs a timer only while the key is held.
 #include "platform/keystate.h"
 
 #include <X11/Xlib.h>
@@ -87,6 +88,10 @@ public:
     X11KeySampler(const X11KeySampler&) = delete;
     X11KeySampler& operator=(const X11KeySampler&) = delete;
     ~X11KeySampler() override { XCloseDisplay(display_); }
+
+    // With raw events every press and release arrives on the connection; without them the state
+    // must be polled.
+    int WakeDescriptor() const override { return opcode_ < 0 ? -1 : ConnectionNumber(display_); }
 
     KeySample Sample(int virtualKey) override {
         if (virtualKey < kVirtualKeyF1 || virtualKey > kVirtualKeyF12) {

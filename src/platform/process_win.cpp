@@ -7,6 +7,7 @@
 #include <string_view>
 #include <system_error>
 
+#include "platform/filesystem.h"
 #include "platform/process.h"
 #include "platform/win_text.h"
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <chrono>
 #include <memory>
 #include <optional>
 #include <string>
@@ -16,9 +17,10 @@ public:
     // A descriptor that becomes readable when a command is waiting (for an event loop's notifier).
     // -1 where there is none: on Windows, or when no private runtime folder was available. Then
     // TakeCommand is polled from a timer (it returns nullopt at once when nothing waits).
-    virtual int commandDescriptor() const = 0;
+    virtual int CommandDescriptor() const = 0;
 
-    // The next waiting command, or nullopt when none is waiting. Never blocks.
+    // The next waiting command, or nullopt when none is waiting. Never blocks. Its sender
+    // hears that it was taken.
     virtual std::optional<std::string> TakeCommand() = 0;
 };
 
@@ -26,7 +28,20 @@ public:
 // `name` separates unrelated uses (tests pass their own).
 std::unique_ptr<SingleInstance> AcquireSingleInstance(const std::string& name = "kickvane");
 
-// Sends a command to the running copy. False when no copy is running or it did not take it.
-bool SendToRunningInstance(const std::string& command, const std::string& name = "kickvane");
+// How a command sent to the running copy fared.
+enum class Delivery {
+    Delivered,   // the running copy took it
+    Queued,      // a copy runs and holds the command, but is busy: it takes it when done
+    NotRunning,  // no copy listens
+    NoAnswer,    // a copy runs but accepted nothing in time (stopped, or hung): the command is lost
+    Refused,     // not a command that can be sent (empty, too long, several lines)
+};
+
+// How long a sender waits for the running copy to take its command before it calls it busy.
+inline constexpr std::chrono::milliseconds kAnswerWait{1500};
+
+// Sends a command to the running copy and waits up to `answerWait` for it to be taken.
+Delivery SendToRunningInstance(const std::string& command, const std::string& name = "kickvane",
+                               std::chrono::milliseconds answerWait = kAnswerWait);
 
 }  // namespace kickvane::platform

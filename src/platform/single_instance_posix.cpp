@@ -13,6 +13,7 @@
 #include <sys/un.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <cerrno>
 #include <chrono>
 #include <cstdlib>
@@ -35,6 +36,11 @@ constexpr size_t kMaxCommandLength = 256;
 constexpr auto kCommandReadTimeout = std::chrono::milliseconds(200);
 // How long a sender waits for a running copy that does not accept.
 constexpr int kSendTimeoutSeconds = 2;
+// Connections the running copy holds while it is busy. Each waiting trigger is kept, and the
+// copy runs once for all of them when it is free.
+constexpr int kBacklog = 64;
+// What the running copy answers once it has read a command.
+constexpr std::string_view kTakenAnswer = "ok\n";
 
 // True when `st` describes a folder that only the current user can change.
 bool IsPrivateFolder(const struct stat& st) {
@@ -178,7 +184,7 @@ public:
         }
     }
 
-    int commandDescriptor() const override { return listener_.get(); }
+    int CommandDescriptor() const override { return listener_.get(); }
 
     std::optional<std::string> TakeCommand() override {
         if (!listener_.valid()) {
@@ -197,6 +203,9 @@ public:
                 continue;
             }
             if (auto command = ReadCommandLine(client.get())) {
+                // The sender may have gone already (it stops waiting when the copy is busy).
+                (void)::send(client.get(), kTakenAnswer.data(), kTakenAnswer.size(),
+                             MSG_NOSIGNAL | MSG_DONTWAIT);
                 return command;
             }
         }
@@ -223,7 +232,7 @@ Fd Listen(const fs::path& socketPath) {
     // copy is listening on it.
     ::unlink(socketPath.c_str());
     if (::bind(fd.get(), reinterpret_cast<const sockaddr*>(&address), sizeof address) != 0 ||
-        ::listen(fd.get(), 8) != 0) {
+        ::listen(fd.get(), kBacklog) != 0) {
         return {};
     }
     return fd;
@@ -255,25 +264,29 @@ std::unique_ptr<SingleInstance> AcquireSingleInstance(const std::string& name) {
     return std::make_unique<PosixSingleInstance>(std::move(lock), std::move(listener), socketPath);
 }
 
-bool SendToRunningInstance(const std::string& command, const std::string& name) {
+Delivery SendToRunningInstance(const std::string& command, const std::string& name,
+                               std::chrono::milliseconds answerWait) {
     if (command.empty() || command.size() > kMaxCommandLength ||
         command.find_first_of("\r\n") != std::string::npos) {
-        return false;
+        return Delivery::Refused;
     }
     const fs::path folder = RuntimeFolder();
     sockaddr_un address;
     if (folder.empty() || !SocketAddress(folder / (SafeName(name) + ".sock"), address)) {
-        return false;
+        return Delivery::NotRunning;
     }
     Fd fd(::socket(AF_UNIX, SOCK_STREAM | SOCK_CLOEXEC, 0));
     if (!fd.valid()) {
-        return false;
+        return Delivery::NotRunning;
     }
     // Bounds connect (a full backlog) and send (a copy that never reads) alike.
     timeval timeout{kSendTimeoutSeconds, 0};
     ::setsockopt(fd.get(), SOL_SOCKET, SO_SNDTIMEO, &timeout, sizeof timeout);
     if (::connect(fd.get(), reinterpret_cast<const sockaddr*>(&address), sizeof address) != 0) {
-        return false;
+        // No socket, or nothing listening on it: no copy runs. A connection that timed out
+        // found a copy whose queue of waiting connections is full.
+        return errno == EAGAIN || errno == EWOULDBLOCK || errno == EINTR ? Delivery::NoAnswer
+                                                                         : Delivery::NotRunning;
     }
     const std::string line = command + "\n";
     size_t sent = 0;
@@ -284,11 +297,35 @@ bool SendToRunningInstance(const std::string& command, const std::string& name) 
             continue;
         }
         if (n <= 0) {
-            return false;
+            return Delivery::NoAnswer;
         }
         sent += static_cast<size_t>(n);
     }
-    return true;
+    // The line waits in the connection until the copy reads it; it answers then. A copy that is
+    // busy (applying the sets, or stopped) reads it once it is free.
+    const auto deadline = std::chrono::steady_clock::now() + answerWait;
+    for (;;) {
+        const auto left = std::chrono::duration_cast<std::chrono::milliseconds>(
+            deadline - std::chrono::steady_clock::now());
+        pollfd readable{fd.get(), POLLIN, 0};
+        const int ready =
+            ::poll(&readable, 1, static_cast<int>(std::max<long long>(0, left.count())));
+        if (ready < 0 && errno == EINTR) {
+            continue;
+        }
+        if (ready <= 0) {
+            return Delivery::Queued;
+        }
+        char answer[8];
+        const ssize_t got = ::recv(fd.get(), answer, sizeof answer, 0);
+        if (got < 0 && errno == EINTR) {
+            continue;
+        }
+        // An answer means taken. A copy that closed without one dropped a connection it
+        // could not read in time: a full line was sent, so it went to a copy that is gone or
+        // refused it.
+        return got > 0 ? Delivery::Delivered : Delivery::NoAnswer;
+    }
 }
 
 }  // namespace kickvane::platform

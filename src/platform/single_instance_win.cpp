@@ -59,7 +59,7 @@ public:
         }
     }
 
-    int commandDescriptor() const override { return -1; }
+    int CommandDescriptor() const override { return -1; }
 
     std::optional<std::string> TakeCommand() override {
         if (pipe_ == INVALID_HANDLE_VALUE) {
@@ -126,22 +126,28 @@ std::unique_ptr<SingleInstance> AcquireSingleInstance(const std::string& name) {
     return std::make_unique<WinSingleInstance>(mutex, PipeName(name));
 }
 
-bool SendToRunningInstance(const std::string& command, const std::string& name) {
+Delivery SendToRunningInstance(const std::string& command, const std::string& name,
+                               std::chrono::milliseconds) {
     if (command.empty() || command.size() > kMaxCommandLength ||
         command.find_first_of("\r\n") != std::string::npos) {
-        return false;
+        return Delivery::Refused;
     }
     const std::wstring pipeName = PipeName(name);
     HANDLE pipe = INVALID_HANDLE_VALUE;
     for (int attempt = 0; attempt < 2 && pipe == INVALID_HANDLE_VALUE; ++attempt) {
         pipe = CreateFileW(pipeName.c_str(), GENERIC_WRITE, 0, nullptr, OPEN_EXISTING, 0, nullptr);
-        if (pipe == INVALID_HANDLE_VALUE &&
-            (GetLastError() != ERROR_PIPE_BUSY || !WaitNamedPipeW(pipeName.c_str(), 2000))) {
-            return false;
+        if (pipe == INVALID_HANDLE_VALUE) {
+            if (GetLastError() != ERROR_PIPE_BUSY) {
+                return Delivery::NotRunning;
+            }
+            // The copy's one pipe instance holds another sender: it has not taken that yet.
+            if (!WaitNamedPipeW(pipeName.c_str(), 2000)) {
+                return Delivery::NoAnswer;
+            }
         }
     }
     if (pipe == INVALID_HANDLE_VALUE) {
-        return false;
+        return Delivery::NoAnswer;
     }
     const std::string line = command + "\n";
     // What was written stays readable after the handle closes; no flush, which would wait for
@@ -151,7 +157,7 @@ bool SendToRunningInstance(const std::string& command, const std::string& name) 
         WriteFile(pipe, line.data(), static_cast<DWORD>(line.size()), &written, nullptr) &&
         written == line.size();
     CloseHandle(pipe);
-    return ok;
+    return ok ? Delivery::Delivered : Delivery::NoAnswer;
 }
 
 }  // namespace kickvane::platform

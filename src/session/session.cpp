@@ -241,7 +241,7 @@ std::optional<text::Message> Session::SettingsProblem() const {
     return text::Message{text::Message::Kind::Warning,
                          why +
                              "\nĐang dùng thiết lập mặc định; phím tắt sẽ không chép gì cho đến "
-                             "khi tệp được sửa hoặc xoá và chương trình được mở lại.",
+                             "khi file được sửa hoặc xoá và chương trình được mở lại.",
                          std::string(kNoticeTitle)};
 }
 
@@ -288,15 +288,36 @@ std::vector<engine::PlanStep> Session::Plan() const {
 
 Outcome Session::Save() {
     Outcome shown;
-    if (const Status saved = catalog::SaveSettings(toolFolder_, settings_, added_); !saved) {
+    const auto refuse = [&](const Failure& failure, const std::string& before) {
         shown.messages.push_back(
             {text::Message::Kind::Warning,
-             "Không lưu được thiết lập!\n" +
-                 text::Capitalised(text::FailureText(saved.failure(), ShownFolders())) + ".",
+             "Không lưu được thiết lập!\n" + before +
+                 text::Capitalised(text::FailureText(failure, ShownFolders())) + ".",
              std::string(kNoticeTitle)});
-    } else {
-        shown.popup = Popup{std::string(kSavedPopupText), 2};
+        return shown;
+    };
+    // The settings in use are defaults standing in for a file that could not be read; that file
+    // may still hold the user's choice, so it is copied aside before it is written over.
+    bool keptOld = false;
+    if (!settingsRead_) {
+        const std::filesystem::path file = catalog::SettingsFile(toolFolder_);
+        if (platform::IsRegularFile(file)) {
+            const std::filesystem::path backup =
+                platform::FindEntryIgnoringCase(toolFolder_, kSettingsBackupName)
+                    .value_or(toolFolder_ / kSettingsBackupName);
+            if (const Status kept = platform::ReplaceFile(file, backup); !kept) {
+                return refuse(kept.failure(), "Không giữ lại được tệp cũ thành " +
+                                                  std::string(kSettingsBackupName) + ":\n");
+            }
+            keptOld = true;
+        }
     }
+    if (const Status saved = catalog::SaveSettings(toolFolder_, settings_, added_); !saved) {
+        return refuse(saved.failure(), "");
+    }
+    settingsRead_ = Status::Ok();  // the file holds the settings in use now
+    shown.popup = keptOld ? Popup{std::string(kSavedKeepingOldPopupText), 4}
+                          : Popup{std::string(kSavedPopupText), 2};
     return shown;
 }
 

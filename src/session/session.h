@@ -31,6 +31,10 @@ std::string FailureAlertText(size_t failures);
 
 // Texts of the corner popups that confirm an action.
 inline constexpr std::string_view kSavedPopupText = "Đã lưu thiết lập!";
+// After a save over a settings file that could not be read: the old file was kept beside it.
+inline constexpr std::string_view kSavedKeepingOldPopupText =
+    "Đã lưu thiết lập!\nTệp cũ không đọc được, đã giữ lại thành ThietLap.ini.bak";
+inline constexpr std::string_view kSettingsBackupName = "ThietLap.ini.bak";
 inline constexpr std::string_view kHiddenPopupText = "Ẩn xuống khay hệ thống!";
 // Said instead where no tray is up: the window minimises, since hidden it could not come back.
 inline constexpr std::string_view kNoTrayPopupText = "Không có khay hệ thống: đã thu nhỏ cửa sổ!";
@@ -152,9 +156,16 @@ public:
 
     // One tick of the hotkey poll: applies the patches when the key was pressed.
     std::optional<ApplyRun> PollHotkey();
+    // When to tick: on every readable event of the descriptor (-1: none), and on the poll's
+    // interval while HotkeyNeedsTicks() says so.
+    int HotkeyWakeDescriptor() const { return poll_.WakeDescriptor(); }
+    bool HotkeyNeedsTicks() const { return poll_.NeedsTicks(); }
 
     ApplyRun Apply();
     std::vector<engine::PlanStep> Plan() const;
+    // Writes the settings file. When it could not be read at the start, the first save keeps
+    // the old file as "ThietLap.ini.bak" (replacing an older one) and says so; without that copy
+    // nothing is written.
     Outcome Save();
     LaunchRun Launch(LaunchFrom from);
     // Loads from `chosen`, or from the folder chosen last time when the user picked none.

@@ -17,6 +17,10 @@ using catalog::OptionArray;
 constexpr std::array<int, kTabCount> kTabTops{65, 110, 156, 202};
 constexpr int kTabLeft = 9;
 constexpr QRect kPanelRect(104, 46, 321, 357);
+// The category labels of the first tab: the left column ends before the right one's check boxes,
+// the right one at the panel's edge.
+constexpr int kLeftLabelWidth = 130;
+constexpr int kRightLabelWidth = 134;
 const std::array<QString, kTabCount> kTabCaptions{QStringLiteral("Chung"), QStringLiteral("Bóng"),
                                                   QStringLiteral("Tỉ số"), QStringLiteral("Khác")};
 
@@ -108,7 +112,15 @@ void CatalogPanels::buildCategoryPanel(QWidget* panel) {
         });
         checks_[static_cast<size_t>(i)] = check;
 
-        auto* label = makeLabel(category.label, panel, QRect(x + 22, y, 128, 24));
+        // As wide as the column allows. A label that does not fit on one line in the font at
+        // hand (Tahoma, Segoe UI, a wider stand-in) wraps between its words instead of losing
+        // its end, in a taller box centred on its check box.
+        const int width = i < 7 ? kLeftLabelWidth : kRightLabelWidth;
+        auto* label = makeLabel(category.label, panel, QRect(x + 22, y, width, 24));
+        label->setWordWrap(true);
+        if (label->fontMetrics().horizontalAdvance(label->text()) > label->contentsRect().width()) {
+            label->setGeometry(x + 22, y - 6, width, 36);
+        }
         connect(label, &ClickableLabel::clicked, this,
                 [this, i] { emit labelClicked(catalog::LabelArray::Category, i); });
         categoryLabels_[static_cast<size_t>(i)] = label;

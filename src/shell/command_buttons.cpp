@@ -20,8 +20,7 @@ QPushButton* makeButton(const QString& caption, QWidget* parent, const QRect& ge
 CommandButtons::CommandButtons(QWidget* window) : QObject(window) {
     hotkeyLabel_ = new QLabel(QStringLiteral("&Phím tắt:"), window);
     hotkeyLabel_->setGeometry(9, 446, 60, 22);
-    hotkey_ = new QComboBox(window);
-    hotkey_->setEditable(true);
+    hotkey_ = new HotkeyBox(window);
     hotkey_->setMaxVisibleItems(12);
     hotkey_->setGeometry(62, 445, 60, 24);
     for (int key = 1; key <= 12; ++key) {
@@ -29,13 +28,14 @@ CommandButtons::CommandButtons(QWidget* window) : QObject(window) {
     }
     hotkey_->setCurrentIndex(6);
     hotkeyLabel_->setBuddy(hotkey_);
-    connect(hotkey_, &QComboBox::currentTextChanged, this, &CommandButtons::hotkeyEdited);
+    connect(hotkey_, &HotkeyBox::nameChosen, this, &CommandButtons::hotkeyEdited);
     // Above the hotkey box, in the free band under the panels.
     hotkeyProblem_ = new QLabel(window);
     hotkeyProblem_->setGeometry(9, 408, 410, 30);
     hotkeyProblem_->setWordWrap(true);
     hotkeyProblem_->setMargin(2);
     paintNote(lightSkin());
+    hotkeyProblem_->setTextFormat(Qt::PlainText);  // it quotes the text from the settings file
     hotkeyProblem_->hide();
 
     save_ = makeButton(QStringLiteral("&Lưu thiết lập"), window, {130, 442, 92, 30});

@@ -5,6 +5,8 @@
 #include <QObject>
 #include <QPushButton>
 
+#include "shell/widgets.h"
+
 namespace kickvane::shell {
 
 struct SkinLook;
@@ -21,7 +23,7 @@ public:
     void showHotkey(const QString& text, const QString& problem);
     void recolour(const SkinLook& look);
 
-    QComboBox* hotkeyBox() const { return hotkey_; }
+    HotkeyBox* hotkeyBox() const { return hotkey_; }
     QLabel* hotkeyProblem() const { return hotkeyProblem_; }
     QPushButton* save() const { return save_; }
     QPushButton* launch() const { return launch_; }
@@ -35,12 +37,13 @@ public:
     QPushButton* skin(int number) const { return number == 1 ? skin1_ : skin2_; }
 
 signals:
+    // The user has finished typing or choosing a hotkey name.
     void hotkeyEdited(const QString& text);
 
 private:
     void paintNote(const SkinLook& look);
     QLabel* hotkeyLabel_;
-    QComboBox* hotkey_;
+    HotkeyBox* hotkey_;
     QLabel* hotkeyProblem_;
     QPushButton* save_;
     QPushButton* launch_;

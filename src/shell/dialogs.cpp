@@ -1,16 +1,23 @@
 #include "shell/dialogs.h"
 
+#include <QCoreApplication>
 #include <QDateTime>
 #include <QDir>
 #include <QFileDialog>
 #include <QFileSystemModel>
+#include <QHeaderView>
 #include <QIdentityProxyModel>
 #include <QMessageBox>
+#include <QTranslator>
+#include <QTreeView>
+#include <algorithm>
 #include <array>
 #include <filesystem>
+#include <memory>
 
 #include "platform/filesystem.h"
 #include "shell/alert_popup.h"
+#include "shell/message_box.h"
 #include "shell/qt_text.h"
 
 namespace kickvane::shell {
@@ -52,7 +59,32 @@ public:
         return QIdentityProxyModel::data(index, role);
     }
 };
+// The chooser's own boxes (a typed folder that does not exist) quote what the user typed: shown
+// as written, never as markup.
+class PlainTextBoxes final : public QObject {
+public:
+    using QObject::QObject;
+
+    bool eventFilter(QObject* watched, QEvent* event) override {
+        if (event->type() == QEvent::ChildPolished) {
+            if (auto* box = qobject_cast<QMessageBox*>(static_cast<QChildEvent*>(event)->child())) {
+                box->setTextFormat(Qt::PlainText);
+            }
+        }
+        return QObject::eventFilter(watched, event);
+    }
+};
+
 }  // namespace
+
+bool useVietnameseQtTexts() {
+    auto* translator = new QTranslator(QCoreApplication::instance());
+    if (!translator->load(QStringLiteral(":/translations/qtbase_vi.qm"))) {
+        delete translator;
+        return false;
+    }
+    return QCoreApplication::installTranslator(translator);
+}
 
 QString folderDialogStart(const QString& wanted) {
     namespace fs = std::filesystem;
@@ -60,7 +92,7 @@ QString folderDialogStart(const QString& wanted) {
     if (!text.isEmpty()) {
         // A relative text would name a folder under the program's working folder, which is
         // nowhere the user has been.
-        fs::path folder = platform::NativePathFromUserText(text.toStdString());
+        fs::path folder = platform::NativePathFromUserText(toUtf8(text));
         while (folder.is_absolute()) {
             const fs::path existing = platform::ResolveCaseInsensitive(folder);
             if (platform::IsDirectory(existing)) {
@@ -94,8 +126,17 @@ void prepareFolderDialog(QFileDialog& dialog, const QString& title, const QStrin
     dialog.setLabelText(QFileDialog::FileName, QStringLiteral("Thư mục:"));
     dialog.setLabelText(QFileDialog::FileType, QStringLiteral("Loại:"));
     dialog.setLabelText(QFileDialog::Accept, QStringLiteral("Chọn"));
-    dialog.setLabelText(QFileDialog::Reject, QStringLiteral("Hủy"));
+    dialog.setLabelText(QFileDialog::Reject, QStringLiteral("Huỷ"));
     dialog.setProxyModel(new VietnameseColumns(&dialog));
+    dialog.installEventFilter(new PlainTextBoxes(&dialog));
+    // Qt sizes the detail view's columns for English heads; the Vietnamese ones need more room.
+    if (auto* details = dialog.findChild<QTreeView*>(QStringLiteral("treeView"))) {
+        QHeaderView* header = details->header();
+        for (int column = 0; column < header->count(); ++column) {
+            header->resizeSection(
+                column, std::max(header->sectionSize(column), header->sectionSizeHint(column)));
+        }
+    }
     // A folder picker has no file types to choose ("Directories" only).
     for (const char* name : {"fileTypeCombo", "fileTypeLabel"}) {
         if (auto* widget = dialog.findChild<QWidget*>(QString::fromLatin1(name))) {
@@ -127,13 +168,14 @@ std::optional<QString> QtDialogs::pickFolder(QWidget* owner, const QString& titl
 }
 
 void QtDialogs::showMessage(QWidget* owner, const QString& title, const QString& text, Icon icon) {
-    QMessageBox box(icon == Icon::Warning ? QMessageBox::Warning : QMessageBox::Information, title,
-                    text, QMessageBox::Ok, owner);
-    box.exec();
+    const std::unique_ptr<QMessageBox> box(
+        newPlainMessageBox(icon == Icon::Warning ? QMessageBox::Warning : QMessageBox::Information,
+                           title, text, owner));
+    box->exec();
 }
 
 void QtDialogs::showNotice(QWidget* owner, const QString& title, const QString& text) {
-    auto* box = new QMessageBox(QMessageBox::Warning, title, text, QMessageBox::Ok, owner);
+    QMessageBox* box = newPlainMessageBox(QMessageBox::Warning, title, text, owner);
     box->setAttribute(Qt::WA_DeleteOnClose);
     box->setModal(false);
     box->show();

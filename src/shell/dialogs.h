@@ -37,6 +37,11 @@ public:
                                   std::function<void()> onClick) = 0;
 };
 
+// Installs the Vietnamese words of Qt's own dialogs, menus and buttons (the folder chooser, a
+// text box's context menu, the standard buttons); false when the translation cannot be loaded.
+// Called once the application object exists.
+bool useVietnameseQtTexts();
+
 // Where a folder picker opens: the folder named by `wanted` (a native path or a Windows path in
 // the Wine prefix) or its nearest parent that exists, else the home folder.
 QString folderDialogStart(const QString& wanted);

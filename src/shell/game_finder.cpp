@@ -10,6 +10,7 @@
 #include <QVBoxLayout>
 #include <memory>
 
+#include "shell/message_box.h"
 #include "shell/qt_text.h"
 
 namespace kickvane::shell {
@@ -23,6 +24,29 @@ const QString kTitle = QStringLiteral("Tìm FIFA Online 2");
 // The button's caption; "m" is its mnemonic.
 const QString kCaption = QStringLiteral("Tì&m");
 
+// A found folder is kept only once the settings are saved; the finder says so.
+const QString kSaveToKeep = QStringLiteral("Bấm \"Lưu thiết lập\" để giữ thư mục này.");
+
+// A message box is some 500 pixels wide at most; the paths in it are laid out narrower, so that
+// the box never breaks them itself.
+constexpr int kPlaceWidth = 420;
+
+// A path laid out for `widget`'s font in lines of at most `width` pixels, continued lines
+// indented.
+QString brokenPath(const QString& path, const QWidget& widget, int width) {
+    const QFontMetrics metrics = widget.fontMetrics();
+    return pathLines(path, width,
+                     [&](const QString& text) { return metrics.horizontalAdvance(text); })
+        .join(QStringLiteral("\n    "));
+}
+
+// A box that does not hold up the window; its text is shown as written.
+void openInformation(QWidget* owner, const QString& text) {
+    QMessageBox* box = newPlainMessageBox(QMessageBox::Information, kTitle, text, owner);
+    box->setAttribute(Qt::WA_DeleteOnClose);
+    box->open();
+}
+
 // The list of several finds; the chosen folder goes into the box.
 void openChoice(QWidget* owner, QLineEdit* box, const std::vector<session::FoundGame>& games) {
     auto* dialog = new QDialog(owner);
@@ -33,15 +57,17 @@ void openChoice(QWidget* owner, QLineEdit* box, const std::vector<session::Found
         new QLabel(QStringLiteral("Tìm thấy nhiều bản FIFA Online 2. Chọn một:"), dialog));
     auto* list = new QListWidget(dialog);
     list->setAccessibleName(QStringLiteral("Các thư mục tìm thấy"));
+    list->setMinimumWidth(520);
+    const int pathWidth = list->minimumWidth() - 48;  // the frame, the margins, a scroll bar
     for (const session::FoundGame& game : games) {
-        auto* item = new QListWidgetItem(pathToQString(game.folder) + QStringLiteral("\n    ") +
-                                         toQString(game.source));
+        auto* item = new QListWidgetItem(brokenPath(pathToQString(game.folder), *list, pathWidth) +
+                                         QStringLiteral("\n    ") + toQString(game.source));
         item->setData(Qt::UserRole, pathToQString(game.folder));
         list->addItem(item);
     }
     list->setCurrentRow(0);
-    list->setMinimumWidth(520);
     layout->addWidget(list);
+    layout->addWidget(new QLabel(kSaveToKeep, dialog));
     auto* buttons = new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel, dialog);
     buttons->button(QDialogButtonBox::Ok)->setText(QStringLiteral("Chọn"));
     buttons->button(QDialogButtonBox::Cancel)->setText(QStringLiteral("Huỷ"));
@@ -60,17 +86,15 @@ void openChoice(QWidget* owner, QLineEdit* box, const std::vector<session::Found
 void openNothingFound(QWidget* owner, const session::GameSearchOutcome& outcome) {
     QString text = QStringLiteral("Không tìm thấy Gameloader.exe.\n\nĐã tìm trong:");
     for (const std::string& place : outcome.looked) {
-        text += QStringLiteral("\n  ") + toQString(place);
+        text += QStringLiteral("\n  ") + brokenPath(toQString(place), *owner, kPlaceWidth);
     }
     if (!outcome.skipped.empty()) {
         text += QStringLiteral("\n\nBỏ qua (không đọc được):");
         for (const std::string& skipped : outcome.skipped) {
-            text += QStringLiteral("\n  ") + toQString(skipped);
+            text += QStringLiteral("\n  ") + brokenPath(toQString(skipped), *owner, kPlaceWidth);
         }
     }
-    auto* box = new QMessageBox(QMessageBox::Information, kTitle, text, QMessageBox::Ok, owner);
-    box->setAttribute(Qt::WA_DeleteOnClose);
-    box->open();
+    openInformation(owner, text);
 }
 
 }  // namespace
@@ -128,13 +152,45 @@ void GameFinderButton::finish(const session::GameSearchOutcome& outcome) {
     setText(kCaption);
     setEnabled(true);
     if (outcome.games.size() == 1) {
-        gameFolderBox_->setText(pathToQString(outcome.games.front().folder));
+        const QString folder = pathToQString(outcome.games.front().folder);
+        gameFolderBox_->setText(folder);
+        openInformation(window(), QStringLiteral("Đã tìm thấy FIFA Online 2:\n    ") +
+                                      brokenPath(folder, *this, kPlaceWidth) +
+                                      QStringLiteral("\n\n") + kSaveToKeep);
     } else if (outcome.games.size() > 1) {
         openChoice(window(), gameFolderBox_, outcome.games);
     } else {
         openNothingFound(window(), outcome);
     }
     emit searchFinished();
+}
+
+QStringList pathLines(const QString& path, int width,
+                      const std::function<int(const QString&)>& measure) {
+    QStringList lines;
+    QString line;
+    qsizetype start = 0;
+    while (start < path.size()) {
+        // One name with the separator after it.
+        qsizetype end = start;
+        while (end < path.size() && path[end] != u'/' && path[end] != u'\\') {
+            ++end;
+        }
+        while (end < path.size() && (path[end] == u'/' || path[end] == u'\\')) {
+            ++end;
+        }
+        const QString piece = path.mid(start, end - start);
+        if (!line.isEmpty() && measure(line + piece) > width) {
+            lines << line;
+            line.clear();
+        }
+        line += piece;
+        start = end;
+    }
+    if (!line.isEmpty() || lines.isEmpty()) {
+        lines << line;
+    }
+    return lines;
 }
 
 GameFinderButton* addGameFinder(QLineEdit* gameFolderBox, QPushButton* browseButton,

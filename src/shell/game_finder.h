@@ -1,7 +1,9 @@
 #pragma once
 
 #include <QPushButton>
+#include <QStringList>
 #include <atomic>
+#include <functional>
 #include <thread>
 
 #include "session/session.h"
@@ -37,6 +39,12 @@ private:
     std::atomic<bool> cancel_{false};
     bool finished_ = true;
 };
+
+// A path in lines no wider than `width` (as `measure` gives a text's width) that break only
+// after a folder separator, never inside a name; a name wider than the width keeps a line of its
+// own.
+QStringList pathLines(const QString& path, int width,
+                      const std::function<int(const QString&)>& measure);
 
 // Puts a "Tìm" button between the game folder box and the change-folder button (the box gives
 // up the room) and returns it.

@@ -4,6 +4,8 @@
 #include <QCloseEvent>
 #include <QPainter>
 #include <QTime>
+#include <QTimer>
+#include <utility>
 
 #include "platform/filesystem.h"
 #include "shell/message_box.h"
@@ -67,14 +69,21 @@ MainWindow::MainWindow(session::Session& session, ShellServices services, QWidge
     const QIcon icon = toolIcon(session_.ToolFolder());
     setWindowIcon(icon);
     skins_.initialise();
+    sideWindows_.keepClearFrom(buttons_->save());
 
     tray_ = std::make_unique<TrayMenu>(icon, services_.makeTray);
     connectTray();
     tray_->icon().add();
 
+    // The hotkey is sampled when a key event arrives and, while it is held (or where no events
+    // come), on the poll's interval; an idle tool sleeps.
     hotkeyTimer_.setInterval(session::kHotkeyPollInterval);
     connect(&hotkeyTimer_, &QTimer::timeout, this, &MainWindow::pollHotkey);
-    hotkeyTimer_.start();
+    if (const int wake = session_.HotkeyWakeDescriptor(); wake >= 0) {
+        hotkeyWake_ = std::make_unique<QSocketNotifier>(wake, QSocketNotifier::Read);
+        connect(hotkeyWake_.get(), &QSocketNotifier::activated, this, &MainWindow::pollHotkey);
+    }
+    pollHotkey();
 
     addGameFinder(panels_->gameFolderBox(), panels_->browseButton(), session_.GameSearchCommand());
     updateFlow_ = std::make_unique<UpdateFlow>(services_.updates, session_, *services_.dialogs,
@@ -82,6 +91,7 @@ MainWindow::MainWindow(session::Session& session, ShellServices services, QWidge
     showSession();
     connectPanels();
     connectButtons();
+    panels_->tabHead(panels_->currentTab())->setFocus(Qt::OtherFocusReason);
     if (std::optional<text::Message> problem = session_.SettingsProblem()) {
         // Once the window is up, so the box has its owner on screen.
         QTimer::singleShot(
@@ -99,6 +109,7 @@ void MainWindow::connectPanels() {
     connect(panels_, &CatalogPanels::tabSelected, this, [this] {
         skins_.paintTabs();
         update();
+        moveFocusOffHotkey();
     });
     connect(panels_, &CatalogPanels::categoryToggled, this,
             [this](int switchIndex, bool on) { session_.SetCategoryOn(switchIndex, on); });
@@ -195,20 +206,44 @@ void MainWindow::pollHotkey() {
     if (applying_) {
         return;
     }
-    if (std::optional<session::ApplyRun> run = session_.PollHotkey()) {
-        applying_ = true;
-        showRun(*run);
-        applying_ = false;
+    std::optional<session::ApplyRun> run = session_.PollHotkey();
+    if (session_.HotkeyNeedsTicks() != hotkeyTimer_.isActive()) {
+        session_.HotkeyNeedsTicks() ? hotkeyTimer_.start() : hotkeyTimer_.stop();
+    }
+    if (run) {
+        showRunAlone(*run);
+    }
+}
+
+void MainWindow::runAgainIfAsked() {
+    if (std::exchange(applyAgain_, false)) {
+        QTimer::singleShot(0, this, [this] { applyPatchesNow(); });
     }
 }
 
 void MainWindow::applyPatchesNow() {
     if (applying_) {
-        return;  // A run and its messages finish before the next one starts.
+        // A run and its messages finish before the next one starts; a request meanwhile (the
+        // messages' dialogs keep events flowing) runs once after it, however many came.
+        applyAgain_ = true;
+        return;
     }
+    showRunAlone(session_.Apply());
+}
+
+void MainWindow::showRunAlone(const session::ApplyRun& run) {
+    // A run's box may wait for the user; key events meanwhile stay queued (the wake is off, or it
+    // would fire again and again), and a press among them counts once the box is closed.
     applying_ = true;
-    showRun(session_.Apply());
+    if (hotkeyWake_) {
+        hotkeyWake_->setEnabled(false);
+    }
+    showRun(run);
+    if (hotkeyWake_) {
+        hotkeyWake_->setEnabled(true);
+    }
     applying_ = false;
+    runAgainIfAsked();
 }
 
 void MainWindow::showRun(const session::ApplyRun& run) {
@@ -259,7 +294,7 @@ void MainWindow::launchGame(session::LaunchFrom from) {
 
 void MainWindow::browseGameFolder() {
     if (auto folder = services_.dialogs->pickFolder(
-            this, QStringLiteral("Chon thu muc cai dat FIFA Online 2"),
+            this, QStringLiteral("Chọn thư mục cài đặt FIFA Online 2"),
             toQString(session_.Settings().gameFolder))) {
         panels_->showGameFolder(*folder);
     }
@@ -268,7 +303,7 @@ void MainWindow::browseGameFolder() {
 void MainWindow::quickLoad() {
     std::optional<std::filesystem::path> chosen;
     if (auto folder = services_.dialogs->pickFolder(
-            this, QStringLiteral("Ho tro nap nhanh cac file Face va Ball"),
+            this, QStringLiteral("Hỗ trợ nạp nhanh các file Face và Ball"),
             pathToQString(session_.QuickLoadFolder()))) {
         chosen = qStringToPath(*folder);
     }
@@ -296,22 +331,42 @@ void MainWindow::startFade(int target, int step) {
 
 void MainWindow::fadeTick() {
     const FadeModel::Tick tick = fade_.advance();
-    setWindowOpacity(tick.alpha / 255.0);
+    setAlpha(tick.alpha);
     if (tick.ended) {
         fadeTimer_.stop();
         QApplication::beep();
     }
 }
 
+void MainWindow::setAlpha(int alpha) {
+    // On Windows a window at full opacity stops being a layered window, and Wine without a window
+    // manager then draws another kind of title bar than for the translucent one. Full opacity
+    // stays a hair below 1 there, which the system rounds to opaque, so the window stays layered
+    // and keeps one title bar.
+    static const bool staysLayered = QGuiApplication::platformName() == QLatin1String("windows");
+    setWindowOpacity(alpha >= 255 && staysLayered ? 0.999 : alpha / 255.0);
+}
+
 TranslucentResult MainWindow::makeTranslucent(int alpha) {
     if (alpha < 0 || alpha > 255) {
         return TranslucentResult::OutOfRange;
     }
-    setWindowOpacity(alpha / 255.0);
+    setAlpha(alpha);
     return TranslucentResult::Applied;
 }
 
+void MainWindow::moveFocusOffHotkey() {
+    // The focus rests in the hotkey box only while the user works in it: where it stayed, a key
+    // or the wheel meant for something else would change the hotkey silently.
+    const QWidget* focused = focusWidget();
+    HotkeyBox* box = buttons_->hotkeyBox();
+    if (focused && (focused == box || box->isAncestorOf(focused))) {
+        panels_->tabHead(panels_->currentTab())->setFocus(Qt::OtherFocusReason);
+    }
+}
+
 bool MainWindow::hideToTray() {
+    moveFocusOffHotkey();
     // Without a tray host the window could not come back from hiding; it minimises instead.
     if (tray_->icon().shown()) {
         hide();
@@ -335,6 +390,7 @@ void MainWindow::runHidden() {
 }
 
 void MainWindow::showFromTray() {
+    moveFocusOffHotkey();
     showNormal();
     raise();
     activateWindow();

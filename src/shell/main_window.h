@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QSocketNotifier>
 #include <QTimer>
 #include <QWidget>
 #include <filesystem>
@@ -50,8 +51,11 @@ public:
     UpdateFlow& updateFlow() { return *updateFlow_; }
     const FadeModel& fade() const { return fade_; }
 
-    // Applies the chosen sets now, as a hotkey press does; ignored while a run and its messages
-    // are still going on.
+    // Ends the tool as "Thoát" in the tray menu does: the tray icon goes, nothing is saved.
+    void exitFromTray();
+
+    // Applies the chosen sets now, as a hotkey press does. Asked while a run and its messages
+    // are still going on, it runs once after them.
     void applyPatchesNow();
     // One tick of the hotkey poll.
     void pollHotkey();
@@ -77,20 +81,24 @@ private:
     // window is in front; over another program (the game) they show as the corner alert, which
     // takes no focus and whose click, like the tray entry, opens the list.
     void showRun(const session::ApplyRun& run);
+    void showRunAlone(const session::ApplyRun& run);  // no other run starts meanwhile
     // The failures of the last run that reported them by the corner alert.
     void showLastFailures();
+    // Starts the run that applyPatchesNow was asked for during the one that just ended.
+    void runAgainIfAsked();
     void saveSettings();
     void launchGame(session::LaunchFrom from);
     void quickLoad();
     void browseGameFolder();
     // Starts a fade of the window's opacity towards `target` by `step` every 20 ms.
     void startFade(int target, int step);
+    // Sets the window's opacity, 0 to 255.
+    void setAlpha(int alpha);
     // "Chạy ẩn": fades towards 150, hides to the tray and says so.
     void runHidden();
     // "Hiện chương trình": shows the window and fades it in.
     void showFromTray();
     // "Thoát": the tray icon goes first, then the program ends.
-    void exitFromTray();
 
     void connectPanels();
     void connectButtons();
@@ -102,6 +110,8 @@ private:
     // hideToTray, then says what happened: `popup` when hidden, the lack of a tray otherwise.
     void hideAndSay(const session::Popup& popup);
     void showAddedVariants();
+    // Moves the focus from the hotkey box, if it is there, to the current tab head.
+    void moveFocusOffHotkey();
 
     session::Session& session_;
     ShellServices services_;
@@ -115,9 +125,11 @@ private:
 
     FadeModel fade_;
     QTimer fadeTimer_;
-    QTimer hotkeyTimer_;
+    QTimer hotkeyTimer_;  // runs only while the key needs polling (held, or no key events)
+    std::unique_ptr<QSocketNotifier> hotkeyWake_;  // key events; null where none come
     bool applying_ = false;
     std::optional<text::Message> lastFailures_;
+    bool applyAgain_ = false;  // applyPatchesNow was asked for during a run
 };
 
 }  // namespace kickvane::shell

@@ -2,6 +2,7 @@
 
 #include <QMessageBox>
 #include <QWidget>
+#include <memory>
 
 #include "shell/qt_text.h"
 #include "text/vni.h"
@@ -12,13 +13,20 @@ QString noticeTitle() {
     return toQString(text::VniToUnicodeUtf8(kNoticeTitleVni));
 }
 
+QMessageBox* newPlainMessageBox(QMessageBox::Icon icon, const QString& title, const QString& text,
+                                QWidget* owner) {
+    auto* box = new QMessageBox(icon, title, QString(), QMessageBox::Ok, owner);
+    box->setTextFormat(Qt::PlainText);
+    box->setText(text);
+    return box;
+}
+
 void showVniMessage(std::string_view text, std::string_view title, MessageIcon icon,
                     QWidget* owner) {
-    QMessageBox box(
+    const std::unique_ptr<QMessageBox> box(newPlainMessageBox(
         icon == MessageIcon::Information ? QMessageBox::Information : QMessageBox::NoIcon,
-        toQString(text::VniToUnicodeUtf8(title)), toQString(text::VniToUnicodeUtf8(text)),
-        QMessageBox::Ok, owner);
-    box.exec();
+        toQString(text::VniToUnicodeUtf8(title)), toQString(text::VniToUnicodeUtf8(text)), owner));
+    box->exec();
 }
 
 }  // namespace kickvane::shell

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QMessageBox>
 #include <QString>
 #include <string_view>
 
@@ -18,5 +19,10 @@ void showVniMessage(std::string_view text, std::string_view title, MessageIcon i
                     QWidget* owner);
 
 QString noticeTitle();
+
+// A message box with one OK button whose text is shown as written: the paths, fetched answers
+// and settings values in it are never read as markup.
+QMessageBox* newPlainMessageBox(QMessageBox::Icon icon, const QString& title, const QString& text,
+                                QWidget* owner);
 
 }  // namespace kickvane::shell

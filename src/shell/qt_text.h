@@ -5,7 +5,11 @@
 #include <string>
 #include <string_view>
 
-// Text between the core (UTF-8 strings, native paths) and Qt.
+#include "platform/filesystem.h"
+
+// Text between the core (UTF-8 strings, native paths) and Qt. Paths go through their UTF-8 form:
+// a path made from or read as a plain string is in the ANSI code page on Windows, which has no
+// room for most Vietnamese letters.
 namespace kickvane::shell {
 
 inline QString toQString(std::string_view utf8) {
@@ -17,11 +21,11 @@ inline std::string toUtf8(const QString& text) {
 }
 
 inline QString pathToQString(const std::filesystem::path& path) {
-    return toQString(path.string());
+    return toQString(platform::PathToUtf8(path));
 }
 
 inline std::filesystem::path qStringToPath(const QString& text) {
-    return std::filesystem::path(text.toStdString());
+    return platform::PathFromUtf8(text.toStdString());
 }
 
 }  // namespace kickvane::shell

@@ -8,7 +8,9 @@
 
 #include "platform/single_instance.h"
 #include "platform/sound.h"
+#include "platform/stop_signals.h"
 #include "popup/popup_model.h"
+#include "shell/dialogs.h"
 #include "shell/main_window.h"
 #include "shell/message_box.h"
 #include "shell/qt_text.h"
@@ -58,6 +60,7 @@ int runWindow(int& argc, char** argv, const std::filesystem::path& toolFolder) {
     QApplication app(argc, argv);
     QApplication::setApplicationName(QStringLiteral("Kickvane"));
     useReadableFonts();
+    useVietnameseQtTexts();
 
     const std::unique_ptr<platform::SingleInstance> instance = platform::AcquireSingleInstance();
     if (!instance) {
@@ -81,22 +84,34 @@ int runWindow(int& argc, char** argv, const std::filesystem::path& toolFolder) {
 
     // Commands from later starts: "kickvane trigger" applies the sets as the hotkey does. Where
     // the command channel has no descriptor to watch, it is asked on a timer instead.
+    // Triggers that waited together (sent while the window was busy) make one run.
     auto takeCommands = [&] {
+        bool triggered = false;
         while (const std::optional<std::string> command = instance->TakeCommand()) {
-            if (*command == kTriggerCommand) {
-                window.applyPatchesNow();
-            }
+            triggered = triggered || *command == kTriggerCommand;
+        }
+        if (triggered) {
+            window.applyPatchesNow();
         }
     };
     std::unique_ptr<QSocketNotifier> commandNotifier;
     QTimer commandTimer;
-    if (instance->commandDescriptor() >= 0) {
+    if (instance->CommandDescriptor() >= 0) {
         commandNotifier =
-            std::make_unique<QSocketNotifier>(instance->commandDescriptor(), QSocketNotifier::Read);
+            std::make_unique<QSocketNotifier>(instance->CommandDescriptor(), QSocketNotifier::Read);
         QObject::connect(commandNotifier.get(), &QSocketNotifier::activated, &window, takeCommands);
     } else {
         QObject::connect(&commandTimer, &QTimer::timeout, &window, takeCommands);
         commandTimer.start(200);
+    }
+
+    // SIGTERM, SIGINT and SIGHUP end the tool as "Thoát" does: the tray icon and the command
+    // socket go, nothing is saved.
+    std::unique_ptr<QSocketNotifier> stopNotifier;
+    if (const int stopRequests = platform::WatchStopRequests(); stopRequests >= 0) {
+        stopNotifier = std::make_unique<QSocketNotifier>(stopRequests, QSocketNotifier::Read);
+        QObject::connect(stopNotifier.get(), &QSocketNotifier::activated, &window,
+                         [&window] { window.exitFromTray(); });
     }
 
     centreOnScreen(window);

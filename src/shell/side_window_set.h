@@ -15,6 +15,10 @@ public:
     SideWindowSet(QWidget* owner, std::filesystem::path toolFolder)
         : owner_(owner), toolFolder_(std::move(toolFolder)) {}
 
+    // The owner's widgets from this one down stay visible when a text window must open over the
+    // owner (the command buttons along its bottom).
+    void keepClearFrom(QWidget* topOfClearArea) { keepClear_ = topOfClearArea; }
+
     void showAbout() { show(about_, createAboutWindow); }
     void showHelp() { show(help_, createHelpWindow); }
     // Shows the label's preview picture; a label without one changes nothing.
@@ -29,6 +33,7 @@ private:
     PreviewWindow& shownPreview();
 
     QWidget* owner_;
+    QPointer<QWidget> keepClear_;
     std::filesystem::path toolFolder_;
     QPointer<QWidget> about_;
     QPointer<QWidget> help_;

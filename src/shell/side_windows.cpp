@@ -72,6 +72,27 @@ protected:
 
 }  // namespace
 
+QPoint sideWindowPosition(const QRect& area, const QRect& ownerFrame, int keepClearTop,
+                          const QSize& size) {
+    constexpr int kGap = 8;
+    const auto inside = [&](QPoint at) {
+        // The top left corner wins over the bottom right one when the window is too large.
+        at.setX(std::max(std::min(at.x(), area.right() + 1 - size.width()), area.left()));
+        at.setY(std::max(std::min(at.y(), area.bottom() + 1 - size.height()), area.top()));
+        return at;
+    };
+    const int top = inside(ownerFrame.topLeft()).y();
+    for (const int x : {ownerFrame.right() + 1 + kGap, ownerFrame.left() - kGap - size.width()}) {
+        const QRect beside(QPoint(x, top), size);
+        if (area.contains(beside)) {
+            return beside.topLeft();
+        }
+    }
+    const int centredX = ownerFrame.center().x() - size.width() / 2;
+    const int centredY = ownerFrame.center().y() - size.height() / 2;
+    return inside(QPoint(centredX, std::min(centredY, keepClearTop - kGap - size.height())));
+}
+
 std::filesystem::path previewPicture(const std::filesystem::path& toolFolder,
                                      catalog::LabelArray labels, int index) {
     int tab = 0;
@@ -105,7 +126,8 @@ std::filesystem::path previewPicture(const std::filesystem::path& toolFolder,
 PreviewWindow::PreviewWindow(QWidget* owner)
     : QWidget(owner, Qt::Tool), picture_(new QLabel(this)) {
     setAttribute(Qt::WA_DeleteOnClose);
-    setWindowTitle(QStringLiteral("Xem truoc"));
+    setFocusPolicy(Qt::StrongFocus);  // so that Escape reaches it
+    setWindowTitle(QStringLiteral("Xem trước"));
     setFixedSize(kPreviewSize);
     picture_->setGeometry(0, 0, kPreviewSize.width(), kPreviewSize.height());
     picture_->setAlignment(Qt::AlignCenter);
@@ -161,7 +183,7 @@ std::filesystem::path addedPreviewPicture(const std::filesystem::path& toolFolde
 
 QWidget* createAboutWindow(QWidget* owner) {
     return new TextWindow(
-        owner, QStringLiteral("Thong tin"),
+        owner, QStringLiteral("Thông tin"),
         {QStringLiteral("<b>Kickvane</b> phiên bản 2.0"),
          QStringLiteral("Công cụ thay đổi đồ hoạ cho FIFA Online 2: bóng, mặt cỏ, biển quảng cáo, "
                         "bảng tỉ số, Mark, ngoại hình, giày, áo đấu, lưới, cổ động viên và sân "
@@ -206,7 +228,7 @@ QString helpText() {
 }
 
 QWidget* createHelpWindow(QWidget* owner) {
-    return new TextWindow(owner, QStringLiteral("Huong dan"),
+    return new TextWindow(owner, QStringLiteral("Hướng dẫn"),
                           {helpText().replace(QStringLiteral("\r\n"), QStringLiteral("\n"))},
                           Qt::PlainText, 520);
 }

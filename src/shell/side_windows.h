@@ -21,7 +21,7 @@ std::filesystem::path previewPicture(const std::filesystem::path& toolFolder,
 std::filesystem::path addedPreviewPicture(const std::filesystem::path& toolFolder,
                                           catalog::GroupId group, std::string_view name);
 
-// "Xem truoc": one picture scaled to the window, which opens centred on the main window's
+// "Xem trước": one picture scaled to the window, which opens centred on the main window's
 // screen. A picture that cannot be loaded leaves the one shown before (or a short note when there
 // was none).
 class PreviewWindow final : public QWidget {
@@ -41,11 +41,18 @@ private:
     QString pictureFile_;
 };
 
-// "Thong tin": the tool's name and version. It and the help window close with their button
+// Where a side window opens, as the top left corner of its frame of `size`: beside the owner's
+// frame on the right, else on the left, when it fits in the work area `area`; otherwise centred
+// over the owner, its bottom above `keepClearTop` (the top of the owner's command buttons) when
+// there is room. Always inside the work area as far as the window's size allows.
+QPoint sideWindowPosition(const QRect& area, const QRect& ownerFrame, int keepClearTop,
+                          const QSize& size);
+
+// "Thông tin": the tool's name and version. It and the help window close with their button
 // "Đóng" or with Escape.
 QWidget* createAboutWindow(QWidget* owner);
 
-// "Huong dan": the user guide.
+// "Hướng dẫn": the user guide.
 QWidget* createHelpWindow(QWidget* owner);
 QString helpText();
 

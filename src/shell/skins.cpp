@@ -12,7 +12,7 @@ WindowSkins::WindowSkins(std::filesystem::path toolFolder, CatalogPanels& panels
 
 QString WindowSkins::skinFile(const QString& skin, const QString& suffix) const {
     return pathToQString(
-        platform::ResolveCaseInsensitive(toolFolder_ / "skin" / toUtf8(skin + suffix)));
+        platform::ResolveCaseInsensitive(toolFolder_ / "skin" / qStringToPath(skin + suffix)));
 }
 
 void WindowSkins::initialise() {

@@ -9,6 +9,7 @@
 
 #include "shell/fetch_problem.h"
 #include "shell/message_box.h"
+#include "shell/qt_text.h"
 #include "text/utf.h"
 #include "text/vni.h"
 
@@ -33,6 +34,16 @@ QString fromVni(std::string_view text) {
     return QString::fromStdString(text::VniToUnicodeUtf8(text));
 }
 
+// A failure's reason with its last two words joined by a no-break space: a box that wraps it
+// carries the last word over together with the one before.
+QString withLastWordsHeld(const QString& reason) {
+    QString held = reason.trimmed();
+    if (const qsizetype lastBlank = held.lastIndexOf(QLatin1Char(' ')); lastBlank > 0) {
+        held[lastBlank] = QChar::Nbsp;
+    }
+    return held;
+}
+
 const QString kTimedOut = fetchProblemText(FetchProblem::TimedOut);
 const QString kTooLarge = fetchProblemText(FetchProblem::TooLarge);
 const QString kRedirectRefused = fetchProblemText(FetchProblem::RedirectRefused);
@@ -42,8 +53,17 @@ const QString kBadHost = fetchProblemText(FetchProblem::BadHost);
 }  // namespace
 
 bool isCurrentVersion(std::string_view text) {
-    return text.size() == kToolVersion.size() + 2 && text.starts_with(kToolVersion) &&
-           text.ends_with("\r\n");
+    return VersionFromAnswer(text) == kToolVersion;
+}
+
+QString checkFailedText(const QString& reason) {
+    return QStringLiteral("Không kiểm tra được phiên bản mới:\n") + withLastWordsHeld(reason);
+}
+
+QString newerVersionText(std::string_view version) {
+    // Only the tool's own VNI-typed words are converted: a fetched "beta1" must not become
+    // "betá".
+    return fromVni("D9a4 co1 phie6n ba3n mo71i! ") + toQString(version);
 }
 
 UpdateCheck::UpdateCheck(Options options, QObject* parent)
@@ -276,18 +296,24 @@ void UpdateFlow::check() {
 }
 
 void UpdateFlow::onVersion(const QString& text) {
-    const std::string version = text.toStdString();
-    // An empty answer, a web page or binary data is no version: nothing to announce or record.
-    if (!IsVersionText(version)) {
-        onVersionFailed(QStringLiteral("máy chủ không trả về số phiên bản"));
+    // An empty answer, a web page or words are no version: nothing to announce or record.
+    const std::optional<std::string> version = VersionFromAnswer(text.toStdString());
+    if (!version) {
+        checking_ = false;
+        if (checkButton_) {
+            checkButton_->setEnabled(true);
+        }
+        showMessage(QStringLiteral("Máy chủ cập nhật trả lời không phải số phiên bản"),
+                    Dialogs::Icon::Warning);
+        emit checkFinished();
         return;
     }
     checking_ = false;
     if (checkButton_) {
         checkButton_->setEnabled(true);
     }
-    if (isCurrentVersion(version)) {
-        session_.KeepVersion(version);
+    if (*version == kToolVersion) {
+        session_.KeepVersion(*version);
         showMessage(fromVni("Chu7a co1 phie6n ba3n mo71i"), Dialogs::Icon::Information);
         emit checkFinished();
         return;
@@ -298,12 +324,13 @@ void UpdateFlow::onVersion(const QString& text) {
     if (checkButton_) {
         checkButton_->hide();  // until the tool closes
     }
-    // A failed write must not keep the user from hearing about the new version.
-    (void)session_.RecordNewVersion(version);
+    // Nothing reads the key back, so a failed write must not keep the user from hearing about
+    // the new version.
+    (void)session_.RecordNewVersion(*version);
     if (downloadButton_) {
         downloadButton_->show();
     }
-    showMessage(fromVni("D9a4 co1 phie6n ba3n mo71i! " + version), Dialogs::Icon::Information);
+    showMessage(newerVersionText(*version), Dialogs::Icon::Information);
     emit checkFinished();
 }
 
@@ -312,8 +339,7 @@ void UpdateFlow::onVersionFailed(const QString& reason) {
     if (checkButton_) {
         checkButton_->setEnabled(true);
     }
-    showMessage(QStringLiteral("Không kiểm tra được phiên bản mới: %1").arg(reason),
-                Dialogs::Icon::Warning);
+    showMessage(checkFailedText(reason), Dialogs::Icon::Warning);
     emit checkFinished();
 }
 
@@ -326,7 +352,8 @@ void UpdateFlow::download() {
                 QStringLiteral("Chưa nhận được đường dẫn tải về, xin thử lại sau giây lát."),
                 Dialogs::Icon::Information);
         } else if (link_ == LinkState::Failed) {
-            showMessage(QStringLiteral("Không lấy được đường dẫn tải về: %1").arg(linkFailure_),
+            showMessage(QStringLiteral("Không lấy được đường dẫn tải về:\n") +
+                            withLastWordsHeld(linkFailure_),
                         Dialogs::Icon::Warning);
         } else {
             showMessage(QStringLiteral("Đường dẫn tải về không hợp lệ."), Dialogs::Icon::Warning);

@@ -29,11 +29,19 @@ namespace kickvane::shell {
 inline constexpr std::string_view kToolVersion = "v2.0-demo";
 
 using text::DownloadLink;
-using text::IsVersionText;
 using text::ReadFetchedText;
+using text::VersionFromAnswer;
 
-// True when the fetched version text is exactly this tool's version line.
+// True when the fetched answer names this tool's version (blanks and line ends around it do not
+// count).
 bool isCurrentVersion(std::string_view text);
+
+// The message for a check that could not be done. Its reason starts a line of its own, and the
+// reason's last two words are held together, so that no word stands alone on the last line.
+QString checkFailedText(const QString& reason);
+
+// The message for a newer version: the tool's own words, then the version exactly as it came.
+QString newerVersionText(std::string_view version);
 
 // Fetches the version file ("v" at the host's root) and the link file ("vlink") from the update
 // host, each on its own, without blocking. Answers stay in memory and never come from a cache.

@@ -2,6 +2,7 @@
 
 #include <QAccessible>
 #include <QAccessibleWidget>
+#include <QLineEdit>
 #include <QMouseEvent>
 #include <QPainter>
 #include <QPixmapCache>
@@ -151,6 +152,23 @@ void ClickableLabel::mouseReleaseEvent(QMouseEvent* event) {
         emit clicked();
     }
     QLabel::mouseReleaseEvent(event);
+}
+
+HotkeyBox::HotkeyBox(QWidget* parent) : QComboBox(parent) {
+    setEditable(true);
+    setInsertPolicy(QComboBox::NoInsert);  // a typed name does not join the list
+    setFocusPolicy(Qt::StrongFocus);
+    connect(lineEdit(), &QLineEdit::editingFinished, this,
+            [this] { emit nameChosen(currentText()); });
+    connect(this, &QComboBox::textActivated, this, &HotkeyBox::nameChosen);
+}
+
+void HotkeyBox::wheelEvent(QWheelEvent* event) {
+    if (hasFocus()) {
+        QComboBox::wheelEvent(event);
+    } else {
+        event->ignore();  // the window under it gets the wheel
+    }
 }
 
 bool PictureBox::setPictureFile(const QString& file) {

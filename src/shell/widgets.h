@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QComboBox>
 #include <QKeyEvent>
 #include <QLabel>
 #include <QPixmap>
@@ -48,6 +49,23 @@ protected:
 
 private:
     FocusCue focusCue_;
+};
+
+// The hotkey box: a name typed or chosen from its list. It reports a name only once the user has
+// finished with it (Enter, the focus leaving, a choice from the list), never a text half typed
+// ("F1" on the way to "F13"). It takes the focus by a click, Tab or its label's mnemonic, and the
+// wheel turns it only while it has the focus, so that the pointer passing over it changes
+// nothing.
+class HotkeyBox final : public QComboBox {
+    Q_OBJECT
+public:
+    explicit HotkeyBox(QWidget* parent);
+
+signals:
+    void nameChosen(const QString& name);
+
+protected:
+    void wheelEvent(QWheelEvent* event) override;
 };
 
 // A surface with a background colour and a picture drawn unscaled at its top-left corner.

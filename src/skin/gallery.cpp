@@ -484,9 +484,11 @@ int runSkinGallery(const std::filesystem::path& outPng, std::ostream& err) {
         }
         return 1;
     }
-    const QString path = QString::fromStdString(outPng.string());
+    const std::u8string utf8 = outPng.u8string();
+    const QString path = QString::fromUtf8(reinterpret_cast<const char*>(utf8.data()),
+                                           static_cast<qsizetype>(utf8.size()));
     if (!image.copy(0, 0, kSheetWidth, height).save(path, "PNG")) {
-        err << "skin-gallery: cannot write " << outPng.string() << '\n';
+        err << "skin-gallery: cannot write " << path.toStdString() << '\n';
         return 1;
     }
     return 0;

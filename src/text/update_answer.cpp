@@ -39,33 +39,33 @@ std::string ReadFetchedText(std::string_view bytes) {
     return text;
 }
 
-bool IsVersionText(std::string_view text) {
-    if (text.ends_with("\r\n")) {
-        text.remove_suffix(2);
+std::optional<std::string> VersionFromAnswer(std::string_view text) {
+    const auto isBlank = [](char c) { return c == ' ' || c == '\t' || c == '\r' || c == '\n'; };
+    while (!text.empty() && isBlank(text.front())) {
+        text.remove_prefix(1);
     }
-    if (text.ends_with('\n')) {
-        text.remove_suffix(1);  // a file written with Unix line ends: "v2.1" LF
+    while (!text.empty() && isBlank(text.back())) {
+        text.remove_suffix(1);
     }
-    if (text.empty() || text.size() > kMaxVersionLength * 4 || !IsValidUtf8(text)) {
-        return false;
+    if (text.size() > kMaxVersionLength) {
+        return std::nullopt;
     }
-    const std::u16string units = Utf8ToUtf16(text);
-    size_t characters = 0;
-    bool blank = true;
-    for (const char16_t unit : units) {
-        const bool control = unit < 0x20 || (unit >= 0x7F && unit <= 0x9F);
-        const bool unassigned = unit == 0xFFFD || (unit >= 0xFDD0 && unit <= 0xFDEF) ||
-                                unit == 0xFFFE || unit == 0xFFFF || unit == 0xFEFF ||
-                                (unit >= 0x2028 && unit <= 0x2029);
-        if (control || unassigned) {
-            return false;
+    const auto isDigit = [](char c) { return c >= '0' && c <= '9'; };
+    const auto isLetter = [](char c) { return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z'); };
+    std::string_view rest = text;
+    if (rest.starts_with('v')) {
+        rest.remove_prefix(1);
+    }
+    if (rest.empty() || !isDigit(rest.front())) {
+        return std::nullopt;
+    }
+    // The digits and dots, then the suffix: both only use characters of the suffix's set.
+    for (const char c : rest) {
+        if (!isDigit(c) && !isLetter(c) && c != '.' && c != '-') {
+            return std::nullopt;
         }
-        blank = blank && (unit == ' ' || unit == 0xA0);
-        if (unit < 0xDC00 || unit > 0xDFFF) {
-            ++characters;  // a low surrogate completes a character already counted
-        }
     }
-    return !blank && characters <= kMaxVersionLength;
+    return std::string(text);
 }
 
 std::optional<std::string> DownloadLink(std::string_view text) {

@@ -13,14 +13,14 @@ namespace kickvane::text {
 // (the ANSI code page the update host's files were written in). The result is UTF-8.
 std::string ReadFetchedText(std::string_view bytes);
 
-// Longest version text taken, in characters.
-inline constexpr size_t kMaxVersionLength = 64;
+// Longest version taken, in characters.
+inline constexpr size_t kMaxVersionLength = 32;
 
-// True when a fetched text (as ReadFetchedText gives it) can be a version: without its final
-// CR LF (and a line feed before it, from a file with Unix line ends), one line of 1 to
-// kMaxVersionLength printable characters, not all blanks. An empty answer, a lone line feed, a
-// web page or binary data is no version.
-bool IsVersionText(std::string_view text);
+// The version a fetched answer names: the text without the blanks and line ends around it, when
+// that is at most kMaxVersionLength characters of an optional "v", a digit, further digits and
+// dots, and an optional suffix of letters, digits, "-" and "." ("v2.1", "2.1.3", "v2.0-beta1").
+// Anything else (an empty answer, a web page, words, several lines) names no version: nullopt.
+std::optional<std::string> VersionFromAnswer(std::string_view text);
 
 // The fetched link without surrounding blanks and line breaks, when it is an http or https
 // address with a host; nullopt for anything else the browser must not be handed (local files,

@@ -76,7 +76,7 @@ TEST_F(IniTest, ReadsNamesInAnyCase_OneQuotePair_TheFirstKey_AndOldLinesAsWindow
     EXPECT_EQ(Read("Thiet lap", "DuongDan"), path);  // whole, however long
 }
 
-// The byte-order mark stays; old lines are written back as UTF-8 with CR LF.
+// The byte-order mark stays; lines the write does not set keep their bytes and their line ends.
 TEST_F(IniTest, WriteReplacesValuesInPlace_AddsKeysAndSections_KeepsTheRest) {
     WriteFile(file_,
               "\xEF\xBB\xBF; settings\r\n[Thiet lap]\r\n  duongdan = old \r\nPhimTat=F7\n\r\n"
@@ -87,11 +87,42 @@ TEST_F(IniTest, WriteReplacesValuesInPlace_AddsKeysAndSections_KeepsTheRest) {
     ASSERT_TRUE(WriteIni(file_, "Khac", "QcaoUCL", "True").ok());
     ASSERT_TRUE(WriteIni(file_, "Bong", "MacDinh", "False").ok());
 
-    EXPECT_EQ(
-        ReadText(file_),
-        "\xEF\xBB\xBF; settings\r\n[Thiet lap]\r\nduongdan=D:\\New\r\nPhimTat=F7\r\nExtra=1\r\n"
-        "\r\n; adboards\r\n[Khac]\r\nQcaoVN=C:\\Caf\xC3\xA9\r\nQcaoUCL=True\r\n"
-        "[Bong]\r\nMacDinh=False\r\n");
+    EXPECT_EQ(ReadText(file_),
+              "\xEF\xBB\xBF; settings\r\n[Thiet lap]\r\nduongdan=D:\\New\r\nPhimTat=F7\nExtra=1\r\n"
+              "\r\n; adboards\r\n[Khac]\r\nQcaoVN=C:\\Caf\xE9\nQcaoUCL=True\r\n"
+              "[Bong]\r\nMacDinh=False\r\n");
+}
+
+// A game folder that a Vietnamese Windows wrote in its code page (1258: "Trò" is "Tro" and a
+// combining grave accent, "ơ" is 0xF5) reads as Vietnamese; a write of another key leaves that
+// line, and every other line it does not set, byte for byte as it was.
+TEST_F(IniTest, VietnameseWindowsLinesReadAsSuch_AndAWriteKeepsTheLinesItDoesNotSet) {
+    const std::string folderLine = "DuongDan=C:\\Tro\xCC ch\xF5i";
+    WriteFile(file_, "[Thiet lap]\r\n" + folderLine + "\r\nPhimTat=F7\n; Caf\xE9 \xA9\r\n");
+#ifndef _WIN32  // Windows reads such lines in its own code page
+    EXPECT_EQ(Read("Thiet lap", "DuongDan"), "C:\\Tr\xC3\xB2 ch\xC6\xA1i");
+#endif
+    ASSERT_TRUE(WriteIni(file_, "Thiet lap", "PhimTat", "F9").ok());
+    ASSERT_TRUE(WriteIni(file_, "Khac", "QcaoVN", "True").ok());
+    EXPECT_EQ(ReadText(file_), "[Thiet lap]\r\n" + folderLine +
+                                   "\r\nPhimTat=F9\n; Caf\xE9 \xA9\r\n[Khac]\r\nQcaoVN=True\r\n");
+}
+
+// The writer never makes a file that the reader would refuse for its size.
+TEST_F(IniTest, AWriteThatWouldMakeTheFileTooLargeIsRefusedAndChangesNothing) {
+    const std::string value(120 * 1024, 'v');
+    int written = 0;
+    while (written < 20 && WriteIni(file_, "S", "K" + std::to_string(written), value).ok()) {
+        ++written;
+    }
+    EXPECT_EQ(written, 8);
+    const std::string before = ReadText(file_);
+    const Status refused = WriteIni(file_, "S", "K8", value);
+    ASSERT_FALSE(refused.ok());
+    EXPECT_NE(refused.reason().find("1024 KiB"), std::string::npos) << refused.reason();
+    EXPECT_EQ(ReadText(file_), before);
+    EXPECT_EQ(Read("S", "K7"), value);  // what was written reads back
+    EXPECT_TRUE(OnlyTheFirstFile());
 }
 
 TEST_F(IniTest, TheFileIsFoundWhateverTheLetterCaseOfItsName) {

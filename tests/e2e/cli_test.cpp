@@ -71,7 +71,7 @@ TEST_F(CliTest, PlanListsTheStepsAndApplyExitsZeroOneOrTwo) {
     fs::remove_all(tool() / "data");
     const Result noBase = Kickvane(apply);
     EXPECT_EQ(noBase.exitCode, 2);
-    EXPECT_NE(noBase.err.find("Thu muc nguon: Khong tim thay: "), std::string::npos);
+    EXPECT_NE(noBase.err.find("Thư mục nguồn: Không tìm thấy: "), std::string::npos);
 }
 
 // "list" shows every category and group, the chosen variants, the added ones and the skipped

@@ -1,12 +1,13 @@
 // The program killed (SIGKILL) at random moments while it saves its settings: the file is
-// always the whole old or the whole new one, and what a killed save leaves behind is gone once
-// the next save has run.
+// always the whole old or the whole new one, and what killed saves leave behind is gone after the
+// next save once it has lain untouched for a few seconds.
 #include <gtest/gtest.h>
 #include <signal.h>
 #include <spawn.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <chrono>
 #include <random>
 #include <set>
@@ -98,17 +99,14 @@ TEST(SaveKill, TheSettingsFileIsAlwaysWholeAndLeftoversGoWithTheNextSave) {
         }
         ASSERT_FALSE(completed && lastWhole != save) << "save " << save;
         killed += completed ? 0 : 1;
-        leftoversSeen += before.size();
-        if (completed) {
-            // Everything that killed saves had left before this one started is gone.
-            for (const std::string& name : Leftovers(dir.path())) {
-                EXPECT_EQ(before.count(name), 0u) << name << " outlived save " << save;
-            }
-        }
+        leftoversSeen = std::max(leftoversSeen, before.size());
     }
+    // A temporary file is only taken for abandoned once it has lain unchanged for a while: until
+    // then it may be one whose writer is about to lock it.
+    std::this_thread::sleep_for(std::chrono::seconds(6));
     ASSERT_TRUE(SaveAndMaybeKill(file, 202, std::chrono::seconds(10)));
     EXPECT_TRUE(Leftovers(dir.path()).empty());
-    std::cout << "[ figures  ] 200 saves, " << killed << " killed, " << leftoversSeen
+    std::cout << "[ figures  ] 200 saves, " << killed << " killed, at most " << leftoversSeen
               << " leftover files seen before a save, one save takes about " << saveTime.count()
               << " us\n";
 }

@@ -2,6 +2,8 @@
 // a hotkey text that names no key, a second start, the trigger command and the tray.
 #include <gtest/gtest.h>
 
+#include <signal.h>
+
 #include <sstream>
 
 #include "support/temp_dir.h"
@@ -49,21 +51,33 @@ protected:
             (dir_ / log).string());
     }
 
-    static std::string FindWindow(const std::string& title) {
-        std::string ids = Capture("xdotool search --name '^" + title + "$' 2>/dev/null");
+    // A window by its title and, where given, the process that shows it (_NET_WM_PID), so that
+    // another program's window of the same title is never taken for it. xmessage names no
+    // process: its window goes by title alone.
+    static std::string FindWindow(const std::string& title, const ChildProcess* owner) {
+        const std::string byOwner =
+            owner ? " --pid " + std::to_string(owner->pid()) : std::string();
+        std::string ids =
+            Capture("xdotool search --all" + byOwner + " --name '^" + title + "$' 2>/dev/null");
         return ids.substr(0, ids.find('\n'));
     }
+    static std::string FindWindow(const std::string& title, const ChildProcess& owner) {
+        return FindWindow(title, &owner);
+    }
 
-    static bool WindowShown(const std::string& title) {
-        return WaitFor([&] { return !FindWindow(title).empty(); });
+    static bool WindowShown(const std::string& title, const ChildProcess* owner) {
+        return WaitFor([&] { return !FindWindow(title, owner).empty(); });
+    }
+    static bool WindowShown(const std::string& title, const ChildProcess& owner) {
+        return WindowShown(title, &owner);
     }
 
     // Another program's window takes the keyboard focus, as the game would.
     std::unique_ptr<ChildProcess> FocusOtherWindow() {
         auto other = std::make_unique<ChildProcess>(
             std::vector<std::string>{"xmessage", "-title", "the game", "at the login screen"});
-        EXPECT_TRUE(WindowShown("the game"));
-        Capture("xdotool windowfocus --sync " + FindWindow("the game"));
+        EXPECT_TRUE(WindowShown("the game", nullptr));
+        Capture("xdotool windowfocus --sync " + FindWindow("the game", nullptr));
         return other;
     }
 
@@ -82,8 +96,8 @@ XServer* WindowTest::display_ = nullptr;
 TEST_F(WindowTest, HotkeyPressedInAnotherWindowAppliesThePatches) {
     WriteSettings("F7");
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle)) << ReadText(dir_ / "kickvane.log");
-    SaveScreenshot(FindWindow(kWindowTitle), "window-after-start.png");
+    ASSERT_TRUE(WindowShown(kWindowTitle, *kickvane)) << ReadText(dir_ / "kickvane.log");
+    SaveScreenshot(FindWindow(kWindowTitle, *kickvane), "window-after-start.png");
     auto focused = FocusOtherWindow();
     Capture("xdotool key F7");
     EXPECT_TRUE(WaitFor([&] { return fs::exists(applied()); }));
@@ -96,28 +110,29 @@ TEST_F(WindowTest, FailedStepsOverTheGameShowTheAlertAndItsClickTheList) {
     fs::remove_all(game() / "zdata");  // the ball's copy has nowhere to go
     WriteSettings("F7");
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle)) << ReadText(dir_ / "kickvane.log");
+    ASSERT_TRUE(WindowShown(kWindowTitle, *kickvane)) << ReadText(dir_ / "kickvane.log");
     auto focused = FocusOtherWindow();
-    const std::string gameWindow = FindWindow("the game");
+    const std::string gameWindow = FindWindow("the game", nullptr);
     Capture("xdotool key F7");
-    ASSERT_TRUE(WindowShown("Alert")) << ReadText(dir_ / "kickvane.log");
-    EXPECT_TRUE(fs::exists(applied()));  // the other steps went through
+    ASSERT_TRUE(WindowShown("Alert", *kickvane)) << ReadText(dir_ / "kickvane.log");
+    EXPECT_TRUE(fs::exists(applied()))
+        << ReadText(dir_ / "kickvane.log");  // the others went through
     EXPECT_EQ(Capture("xdotool getwindowfocus"), gameWindow + "\n");
-    EXPECT_TRUE(FindWindow("Thông báo").empty());
+    EXPECT_TRUE(FindWindow("Thông báo", *kickvane).empty());
     // Once it has risen into its place.
     std::this_thread::sleep_for(std::chrono::milliseconds(1500));
-    SaveScreenshot(FindWindow("Alert"), "failure-alert.png");
+    SaveScreenshot(FindWindow("Alert", *kickvane), "failure-alert.png");
 
-    Capture("xdotool mousemove --window " + FindWindow("Alert") + " 20 20 click 1");
-    ASSERT_TRUE(WindowShown("Thông báo")) << ReadText(dir_ / "kickvane.log");
-    SaveScreenshot(FindWindow("Thông báo"), "failure-list.png");
+    Capture("xdotool mousemove --window " + FindWindow("Alert", *kickvane) + " 20 20 click 1");
+    ASSERT_TRUE(WindowShown("Thông báo", *kickvane)) << ReadText(dir_ / "kickvane.log");
+    SaveScreenshot(FindWindow("Thông báo", *kickvane), "failure-list.png");
     EXPECT_TRUE(kickvane->Running());
 }
 
 TEST_F(WindowTest, HotkeyTextThatNamesNoKeyTriggersNothing) {
     WriteSettings("f7");  // names are compared exactly: "f7" is no key
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle)) << ReadText(dir_ / "kickvane.log");
+    ASSERT_TRUE(WindowShown(kWindowTitle, *kickvane)) << ReadText(dir_ / "kickvane.log");
     auto focused = FocusOtherWindow();
     Capture("xdotool key F7 F1 F12");
     // Several ticks of the 100 ms poll go by; none may react.
@@ -131,18 +146,55 @@ TEST_F(WindowTest, TriggerRunsThePatchesInTheRunningCopyAndASecondStartIsRefused
     const std::string before = ReadText(tool() / "ThietLap.ini");
     EXPECT_NE(ChildProcess({KICKVANE_BINARY, "trigger"}).Wait(), 0);  // nothing runs yet
     auto first = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle)) << ReadText(dir_ / "kickvane.log");
+    ASSERT_TRUE(WindowShown(kWindowTitle, *first)) << ReadText(dir_ / "kickvane.log");
     EXPECT_EQ(ChildProcess({KICKVANE_BINARY, "trigger"}).Wait(), 0);
     EXPECT_TRUE(WaitFor([&] { return fs::exists(applied()); }));
 
     auto second = StartKickvane("second.log");
-    ASSERT_TRUE(WindowShown("Thông báo"));
-    SaveScreenshot(FindWindow("Thông báo"), "second-start-refused.png");
-    Capture("xdotool windowfocus --sync " + FindWindow("Thông báo") + " key Return");
+    ASSERT_TRUE(WindowShown("Thông báo", *second));
+    SaveScreenshot(FindWindow("Thông báo", *second), "second-start-refused.png");
+    Capture("xdotool windowfocus --sync " + FindWindow("Thông báo", *second) + " key Return");
     EXPECT_EQ(second->Wait(), 0);
     EXPECT_TRUE(first->Running());
-    EXPECT_FALSE(FindWindow(kWindowTitle).empty());
+    EXPECT_FALSE(FindWindow(kWindowTitle, *first).empty());
     EXPECT_EQ(ReadText(tool() / "ThietLap.ini"), before);
+}
+
+// A window that cannot answer (stopped here, as a busy one is) keeps the trigger and runs it once
+// it goes on; the trigger says it is busy, not that nothing runs.
+TEST_F(WindowTest, TriggerToABusyWindowIsQueuedAndRunsWhenItGoesOn) {
+    WriteSettings("F7");
+    auto kickvane = StartKickvane();
+    ASSERT_TRUE(WindowShown(kWindowTitle, *kickvane)) << ReadText(dir_ / "kickvane.log");
+    ASSERT_EQ(::kill(kickvane->pid(), SIGSTOP), 0);
+    const CommandResult busy =
+        RunCommand(std::string("'") + KICKVANE_BINARY + "' trigger", dir_.path());
+    const CommandResult again =
+        RunCommand(std::string("'") + KICKVANE_BINARY + "' trigger", dir_.path());
+    ::kill(kickvane->pid(), SIGCONT);
+    EXPECT_EQ(busy.exitCode, 0) << busy.err;
+    EXPECT_EQ(busy.out, "Kickvane đang bận, lần chép sẽ chạy khi xong.\n");
+    EXPECT_EQ(again.exitCode, 0) << again.err;
+    EXPECT_TRUE(WaitFor([&] { return fs::exists(applied()); }));
+    EXPECT_TRUE(kickvane->Running());
+}
+
+// SIGTERM, SIGINT and SIGHUP end the window as "Thoát" does: a clean exit, the command socket
+// gone, nothing saved.
+TEST_F(WindowTest, StopSignalsEndTheWindowCleanly) {
+    WriteSettings("F7");
+    const std::string settings = ReadText(tool() / "ThietLap.ini");
+    const fs::path socket = dir_ / "runtime/kickvane.sock";
+    for (const int signal : {SIGTERM, SIGINT, SIGHUP}) {
+        auto kickvane = StartKickvane();
+        ASSERT_TRUE(WindowShown(kWindowTitle, *kickvane)) << ReadText(dir_ / "kickvane.log");
+        ASSERT_TRUE(fs::exists(socket));
+        ::kill(kickvane->pid(), signal);
+        EXPECT_EQ(kickvane->Wait(), 0) << "signal " << signal;
+        EXPECT_FALSE(fs::exists(socket)) << "signal " << signal;
+    }
+    EXPECT_EQ(ReadText(tool() / "ThietLap.ini"), settings);
+    EXPECT_NE(ChildProcess({KICKVANE_BINARY, "trigger"}).Wait(), 0);
 }
 
 // The tray icon: the tool's window of 22 pixels square.
@@ -178,14 +230,15 @@ TEST_F(WindowTest, TrayIconAppearsWhenATrayStartsAndBringsTheHiddenWindowBack) {
     }
     WriteSettings("F7");
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle)) << ReadText(dir_ / "kickvane.log");
+    ASSERT_TRUE(WindowShown(kWindowTitle, *kickvane)) << ReadText(dir_ / "kickvane.log");
     // The tray host starts after the tool, as it may when the desktop comes up.
     ChildProcess trayer(
         {"trayer", "--edge", "top", "--align", "right", "--width", "10", "--height", "24"});
     ASSERT_TRUE(WaitFor([] { return !FindTrayIcon().empty(); })) << Capture("xwininfo -root -tree");
 
     // "Chạy ẩn" under the tab heads hides the window; the hotkey still works meanwhile.
-    Capture("xdotool mousemove --window " + FindWindow(kWindowTitle) + " 50 275 click 1");
+    Capture("xdotool mousemove --window " + FindWindow(kWindowTitle, *kickvane) +
+            " 50 275 click 1");
     ASSERT_TRUE(WaitFor([] { return !WindowVisible(kWindowTitle); }));
     Capture("xdotool key F7");
     EXPECT_TRUE(WaitFor([&] { return fs::exists(applied()); }));
@@ -209,8 +262,8 @@ TEST_F(WindowTest, AddedBallIsChosenSavedAndApplied) {
     WriteSettings("F7");
     WriteFile(tool() / u8"extras/Ball/Bóng Mới/textures/ball10.dds", "new ball");
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle)) << ReadText(dir_ / "kickvane.log");
-    const std::string window = FindWindow(kWindowTitle);
+    ASSERT_TRUE(WindowShown(kWindowTitle, *kickvane)) << ReadText(dir_ / "kickvane.log");
+    const std::string window = FindWindow(kWindowTitle, *kickvane);
     // The ball tab's head, then the fifth row's button (after the four catalog balls).
     Capture("xdotool mousemove --window " + window + " 50 125 click 1");
     Capture("xdotool mousemove --window " + window + " 131 243 click 1");

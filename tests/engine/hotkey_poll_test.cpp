@@ -38,5 +38,27 @@ TEST(HotkeyPoll, TicksOnlyForThePressedOrHeldKeyItKeeps) {
     EXPECT_FALSE(withoutKeyState.Tick());
 }
 
+// Where key events wake the tool, the timer is needed only while the key is held.
+TEST(HotkeyPoll, NeedsTicksOnlyWhileTheKeyIsHeld_WhereKeyEventsWake) {
+    testing::FakeKeySampler keys;
+    HotkeyPoll poll(&keys);
+    ASSERT_TRUE(poll.SetHotkey("F7"));
+    EXPECT_TRUE(poll.NeedsTicks());  // no events: always polled
+
+    keys.wake = 5;
+    EXPECT_EQ(poll.WakeDescriptor(), 5);
+    EXPECT_FALSE(poll.NeedsTicks());
+    keys.pressed.insert(kF7);
+    EXPECT_TRUE(poll.Tick());
+    EXPECT_FALSE(poll.NeedsTicks());  // a short press: done
+    keys.held.insert(kF7);
+    EXPECT_TRUE(poll.Tick());
+    EXPECT_TRUE(poll.NeedsTicks());  // held: runs again on every tick
+    EXPECT_TRUE(poll.Tick());
+    keys.held.clear();
+    EXPECT_FALSE(poll.Tick());
+    EXPECT_FALSE(poll.NeedsTicks());
+}
+
 }  // namespace
 }  // namespace kickvane::engine

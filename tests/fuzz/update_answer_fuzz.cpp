@@ -1,5 +1,5 @@
 // The update host's answers on any bytes: the text is valid UTF-8 in CR LF lines, a version is
-// one printable line, and a download link is one web address without blanks around it.
+// one version number, and a download link is one web address without blanks around it.
 #include <cstddef>
 #include <cstdint>
 #include <string>
@@ -16,13 +16,15 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
     const std::string text = ReadFetchedText(input);
     FUZZ_CHECK(IsValidUtf8(text));
     FUZZ_CHECK(text.empty() || text.ends_with("\r\n"));
-    if (IsVersionText(text)) {
-        std::string_view line = std::string_view(text).substr(0, text.size() - 2);
-        if (line.ends_with('\n')) {
-            line.remove_suffix(1);
+    for (const std::string_view answer : {input, std::string_view(text)}) {
+        if (const auto version = VersionFromAnswer(answer)) {
+            FUZZ_CHECK(!version->empty() && version->size() <= kMaxVersionLength);
+            for (const char c : *version) {
+                FUZZ_CHECK((c >= '0' && c <= '9') || (c >= 'a' && c <= 'z') ||
+                           (c >= 'A' && c <= 'Z') || c == '.' || c == '-');
+            }
+            FUZZ_CHECK(VersionFromAnswer(*version) == version);
         }
-        FUZZ_CHECK(!line.empty() && line.find_first_of("\r\n\t") == std::string_view::npos);
-        FUZZ_CHECK(line.find('\0') == std::string_view::npos);
     }
 
     for (const std::string_view answer : {input, std::string_view(text)}) {

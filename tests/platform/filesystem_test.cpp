@@ -7,9 +7,12 @@
 #include <sys/resource.h>
 #include <unistd.h>
 
+#include <atomic>
+#include <chrono>
 #include <csignal>
 #include <fstream>
 #include <functional>
+#include <thread>
 
 #include "platform/scoped_env.h"
 #include "support/temp_dir.h"
@@ -180,11 +183,39 @@ TEST(TemporaryFiles, FitTheNameLimitAndOnlyThoseNothingWritesAreRemoved) {
     // A writer holds its temporary file locked for as long as it writes.
     const int held = ::open(writing.c_str(), O_RDONLY);
     ASSERT_EQ(::flock(held, LOCK_EX), 0);
+    // Just written: it may be one whose writer has not locked it yet.
     RemoveStaleTemporaries(dir.path());
+    EXPECT_TRUE(fs::exists(killed));
+    RemoveStaleTemporaries(dir.path(), std::chrono::seconds(0));
     ::close(held);
     EXPECT_FALSE(fs::exists(killed));
     EXPECT_TRUE(fs::exists(writing));
     EXPECT_TRUE(fs::exists(other));
+}
+
+// A cleaner that takes every unlocked temporary file for abandoned, with no regard to its age,
+// sweeps the folder over and over while saves run: the lock alone must keep every save whole.
+TEST(TemporaryFiles, ASweepNeverRemovesTheFileOfASaveInProgress) {
+    TempDir dir;
+    const fs::path file = dir / "ThietLap.ini";
+    std::atomic<bool> saving{true};
+    std::thread sweeper([&] {
+        while (saving) {
+            RemoveStaleTemporaries(dir.path(), std::chrono::seconds(0));
+        }
+    });
+    int failures = 0;
+    std::string firstFailure;
+    for (int save = 0; save < 2000; ++save) {
+        const Status saved = WriteFileAtomically(file, "save " + std::to_string(save));
+        if (!saved.ok() && failures++ == 0) {
+            firstFailure = saved.reason();
+        }
+    }
+    saving = false;
+    sweeper.join();
+    EXPECT_EQ(failures, 0) << firstFailure;
+    EXPECT_EQ(ReadText(file), "save 1999");
 }
 
 TEST(ListPlainFiles, SkipsFoldersAndHiddenFiles) {

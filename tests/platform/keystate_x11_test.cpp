@@ -1,6 +1,7 @@
 // Global key state against a real X server: each test starts its own Xvfb and presses keys with
 // xdotool, which sends them through XTEST like a keyboard would.
 #include <gtest/gtest.h>
+#include <poll.h>
 #include <unistd.h>
 
 #include <cstdlib>
@@ -72,6 +73,22 @@ TEST_F(KeySamplerX11Test, ReportsShortPressOnce_ThenClearsIt) {
     Xdotool("key", "F8");  // another key's press is not F7's
     EXPECT_FALSE(sampler_->Sample(kF7).any());
     EXPECT_FALSE(sampler_->Sample(0x41).any());  // not a function key: never reported
+}
+
+// An idle tool sleeps until a key event makes the wake descriptor readable; a sample drains it.
+TEST_F(KeySamplerX11Test, WakeDescriptorTurnsReadableOnAKeyAndQuietAfterTheSample) {
+    const int wake = sampler_->WakeDescriptor();
+    ASSERT_GE(wake, 0);
+    auto readable = [wake] {
+        pollfd fd{wake, POLLIN, 0};
+        return ::poll(&fd, 1, 0) == 1;
+    };
+    sampler_->Sample(kF7);
+    EXPECT_FALSE(readable());
+    Xdotool("key", "F3");  // any key wakes; the sample then tells whether it was the hotkey
+    ASSERT_TRUE(WaitFor(readable));
+    WaitFor([&] { return sampler_->Sample(kF7).any() || !readable(); });
+    EXPECT_FALSE(readable());
 }
 
 TEST_F(KeySamplerX11Test, ReportsDown_WhileKeyIsHeld) {

@@ -8,8 +8,11 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
+#include <chrono>
 #include <cstring>
 #include <filesystem>
+#include <optional>
+#include <thread>
 
 #include "platform/scoped_env.h"
 #include "support/temp_dir.h"
@@ -20,6 +23,11 @@ namespace {
 namespace fs = std::filesystem;
 using testing::ScopedEnv;
 using testing::TempDir;
+
+// Sends without waiting for the copy to take the command: the test takes it itself afterwards.
+Delivery SendWithoutWaiting(const std::string& command, const std::string& name) {
+    return SendToRunningInstance(command, name, std::chrono::milliseconds(0));
+}
 
 // Every test gets its own private runtime folder, so none touches the user's real one or meets a
 // copy of the tool that runs on this machine.
@@ -54,9 +62,9 @@ TEST_F(SingleInstanceTest, RefusesSecondCopy_AndDeliversSentCommandsInOrderThrou
     EXPECT_NE(AcquireSingleInstance("kv-other"), nullptr);  // another name, another use
     EXPECT_EQ(first->TakeCommand(), std::nullopt);          // nothing waiting: returns at once
 
-    ASSERT_TRUE(SendToRunningInstance("show", "kv-test"));
-    ASSERT_TRUE(SendToRunningInstance("trigger", "kv-test"));
-    pollfd readable{first->commandDescriptor(), POLLIN, 0};
+    ASSERT_EQ(SendWithoutWaiting("show", "kv-test"), Delivery::Queued);
+    ASSERT_EQ(SendWithoutWaiting("trigger", "kv-test"), Delivery::Queued);
+    pollfd readable{first->CommandDescriptor(), POLLIN, 0};
     ASSERT_EQ(::poll(&readable, 1, 10000), 1);
     EXPECT_EQ(first->TakeCommand(), "show");
     EXPECT_EQ(first->TakeCommand(), "trigger");
@@ -67,7 +75,7 @@ TEST_F(SingleInstanceTest, RefusesSecondCopy_AndDeliversSentCommandsInOrderThrou
 }
 
 TEST_F(SingleInstanceTest, SendFails_WhenNoCopyRuns_AndACopyThatDiedLeavesNothingStale) {
-    EXPECT_FALSE(SendToRunningInstance("trigger", "kv-test"));
+    EXPECT_EQ(SendWithoutWaiting("trigger", "kv-test"), Delivery::NotRunning);
     const pid_t child = ::fork();
     ASSERT_GE(child, 0);
     if (child == 0) {
@@ -80,11 +88,32 @@ TEST_F(SingleInstanceTest, SendFails_WhenNoCopyRuns_AndACopyThatDiedLeavesNothin
     ASSERT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0);
     ASSERT_TRUE(fs::exists(runtime_ / "kv-test.sock"));
 
-    EXPECT_FALSE(SendToRunningInstance("trigger", "kv-test"));
+    EXPECT_EQ(SendWithoutWaiting("trigger", "kv-test"), Delivery::NotRunning);
     auto next = AcquireSingleInstance("kv-test");
     ASSERT_NE(next, nullptr);
-    ASSERT_TRUE(SendToRunningInstance("trigger", "kv-test"));
+    ASSERT_EQ(SendWithoutWaiting("trigger", "kv-test"), Delivery::Queued);
     EXPECT_EQ(next->TakeCommand(), "trigger");
+}
+
+// The sender hears when the running copy takes its command; a copy that is busy keeps it for
+// later, and the sender says so instead of taking the copy for gone.
+TEST_F(SingleInstanceTest, ATakenCommandIsAnswered_ABusyCopyKeepsItForLater) {
+    auto running = AcquireSingleInstance("kv-test");
+    ASSERT_NE(running, nullptr);
+    std::optional<Delivery> delivery;
+    std::thread sender(
+        [&] { delivery = SendToRunningInstance("trigger", "kv-test", std::chrono::minutes(1)); });
+    pollfd readable{running->CommandDescriptor(), POLLIN, 0};
+    ASSERT_EQ(::poll(&readable, 1, 10000), 1);
+    EXPECT_EQ(running->TakeCommand(), "trigger");
+    sender.join();
+    EXPECT_EQ(delivery, Delivery::Delivered);
+
+    // Busy: nothing takes the command while the sender waits.
+    EXPECT_EQ(SendToRunningInstance("trigger", "kv-test", std::chrono::milliseconds(100)),
+              Delivery::Queued);
+    EXPECT_EQ(running->TakeCommand(), "trigger");  // its sender is gone; the command is kept
+    EXPECT_EQ(running->TakeCommand(), std::nullopt);
 }
 
 TEST_F(SingleInstanceTest, SilentOverlongAndMultiLineClients_CannotBlockOrAddCommands) {
@@ -104,9 +133,9 @@ TEST_F(SingleInstanceTest, SilentOverlongAndMultiLineClients_CannotBlockOrAddCom
 
     for (const std::string& bad :
          {std::string("show\nquit"), std::string(1000, 'x'), std::string()}) {
-        EXPECT_FALSE(SendToRunningInstance(bad, "kv-test")) << bad;
+        EXPECT_EQ(SendWithoutWaiting(bad, "kv-test"), Delivery::Refused) << bad;
     }
-    ASSERT_TRUE(SendToRunningInstance("trigger", "kv-test"));
+    ASSERT_EQ(SendWithoutWaiting("trigger", "kv-test"), Delivery::Queued);
     EXPECT_EQ(running->TakeCommand(), "trigger");
     for (int fd : {silent, overlong, twoLines}) {
         ::close(fd);
@@ -118,7 +147,7 @@ TEST_F(SingleInstanceTest, NameCannotReachOutsideRuntimeFolder) {
     auto running = AcquireSingleInstance("sub/x");
     ASSERT_NE(running, nullptr);
     EXPECT_TRUE(fs::is_empty(runtime_ / "sub"));
-    ASSERT_TRUE(SendToRunningInstance("trigger", "sub/x"));
+    ASSERT_EQ(SendWithoutWaiting("trigger", "sub/x"), Delivery::Queued);
     EXPECT_EQ(running->TakeCommand(), "trigger");
 }
 
@@ -137,7 +166,7 @@ TEST(SingleInstanceFallback, UsesPrivateTmpFolder_WhenRuntimeFolderIsSharedWithO
     ASSERT_EQ(::lstat(folder.c_str(), &st), 0);
     EXPECT_TRUE(S_ISDIR(st.st_mode) && st.st_uid == ::getuid() && (st.st_mode & 077) == 0);
     EXPECT_TRUE(fs::exists(folder / (name + ".lock")));
-    ASSERT_TRUE(SendToRunningInstance("trigger", name));
+    ASSERT_EQ(SendWithoutWaiting("trigger", name), Delivery::Queued);
     EXPECT_EQ(running->TakeCommand(), "trigger");
 
     running.reset();

@@ -126,6 +126,36 @@ TEST_F(SessionTest, SaveConfirmsWithThePopupOrWarnsWithTheReason) {
               "không phải file.");
 }
 
+// A settings file the start could not read may still hold the user's choice: the first save
+// keeps it as ThietLap.ini.bak, replacing an older copy, and says so; later saves just save.
+TEST_F(SessionTest, FirstSaveOverAnUnreadableFileKeepsItBesideAndSaysSo) {
+    const std::string unreadable = "[Thiet lap]\r\nDuongDan=" + std::string(1100 * 1024, 'x');
+    WriteFile(tool() / "ThietLap.ini", unreadable);  // larger than the reader accepts
+    WriteFile(tool() / "thietlap.ini.BAK", "an older backup");
+    auto session = Open();
+    ASSERT_FALSE(session->SettingsRead());
+    session->SetGameFolder("D:\\FO2");
+
+    const Outcome first = session->Save();
+    ASSERT_TRUE(first.popup);
+    EXPECT_EQ(first.popup->text, kSavedKeepingOldPopupText);
+    EXPECT_EQ(testing::ReadText(tool() / "thietlap.ini.BAK"), unreadable);
+    std::vector<std::string> backups;  // the older one's name is kept, in its letter case
+    for (const auto& entry : fs::directory_iterator(tool())) {
+        if (entry.path().extension() == ".BAK" || entry.path().extension() == ".bak") {
+            backups.push_back(entry.path().filename().string());
+        }
+    }
+    EXPECT_EQ(backups, std::vector<std::string>{"thietlap.ini.BAK"});
+    EXPECT_EQ(catalog::LoadSettings(tool()).settings.gameFolder, "D:\\FO2");
+    EXPECT_TRUE(session->SettingsRead());
+    EXPECT_TRUE(session->Apply().apply.Stopped());  // no longer refused: the file is the user's
+
+    session->SetGameFolder("E:\\FO2");
+    EXPECT_EQ(session->Save().popup, (Popup{"Đã lưu thiết lập!", 2}));
+    EXPECT_EQ(testing::ReadText(tool() / "thietlap.ini.BAK"), unreadable);
+}
+
 TEST_F(SessionTest, LaunchFromTheWindowHidesItAndFromTheTrayLeavesItAlone) {
     int launches = 0;
     auto session = Open([&](std::string_view folder) {

@@ -77,6 +77,11 @@ TEST_F(GameFinderTest, OneFindFillsTheBox_SeveralOpenAListWithSources_NoneSaysWh
     const fs::path first = AddGame(".wine");
     Search(button);
     EXPECT_EQ(box_->text().toStdString(), fs::canonical(first).string());
+    // The found folder is not kept until the settings are saved; the finder says so.
+    message = OpenDialog<QMessageBox>();
+    ASSERT_NE(message, nullptr);
+    EXPECT_TRUE(message->text().contains(QStringLiteral("\"Lưu thiết lập\" để giữ")));
+    message->close();
 
     const fs::path second = AddGame(".PlayOnLinux/wineprefix/FO2");
     box_->clear();
@@ -91,6 +96,22 @@ TEST_F(GameFinderTest, OneFindFillsTheBox_SeveralOpenAListWithSources_NoneSaysWh
     list->setCurrentRow(1);
     dialog->accept();
     EXPECT_EQ(box_->text().toStdString(), fs::canonical(second).string());
+}
+
+TEST(PathLinesTest, APathBreaksOnlyAfterAFolderSeparator) {
+    const auto characters = [](const QString& text) { return static_cast<int>(text.size()); };
+    const QString path =
+        QStringLiteral("/home/player/.wine/drive_c/Program Files (x86)/FIFA Online 2");
+    const QStringList lines = pathLines(path, 24, characters);
+    EXPECT_EQ(lines, QStringList({"/home/player/.wine/", "drive_c/", "Program Files (x86)/",
+                                  "FIFA Online 2"}));
+    EXPECT_EQ(pathLines(QStringLiteral("C:\\Games\\FO2"), 8, characters),
+              QStringList({"C:\\", "Games\\", "FO2"}));
+    // A name wider than the line stays whole; a short path stays on one line.
+    EXPECT_EQ(pathLines(QStringLiteral("/a/averyveryverylongname/b"), 6, characters),
+              QStringList({"/a/", "averyveryverylongname/", "b"}));
+    EXPECT_EQ(pathLines(path, 200, characters), QStringList{path});
+    EXPECT_EQ(pathLines(QString(), 10, characters), QStringList{QString()});
 }
 
 TEST_F(GameFinderTest, ClosingTheWindowDuringASearchEndsItCleanly) {

@@ -59,6 +59,7 @@ TEST_F(MainWindowTest, SettingsLoadIntoTheWidgetsAndSaveRoundTrips) {
         Click(panels.optionButton(OptionArray::Scoreboard, 6));  // again: stays chosen
         panels.gameFolderBox()->setText("/home/player/FIFA Online 2");
         window->buttons().hotkeyBox()->setCurrentText("F2");
+        QTest::keyClick(window->buttons().hotkeyBox()->lineEdit(), Qt::Key_Return);
         Click(window->buttons().save());
         EXPECT_EQ(dialogs_.popups, QStringList{"Đã lưu thiết lập!|2"});
     }
@@ -93,9 +94,12 @@ TEST_F(MainWindowTest, AHotkeyTextThatNamesNoKeyIsNamedBesideTheBox) {
     EXPECT_FALSE(buttons.hotkeyProblem()->isHidden());
     EXPECT_TRUE(buttons.hotkeyProblem()->text().contains("chưa hoạt động"));
 
-    buttons.hotkeyBox()->setCurrentText("F9");
-    EXPECT_TRUE(buttons.hotkeyProblem()->isHidden());
-    buttons.hotkeyBox()->setCurrentText("F");  // typing on: the last key stays in use
+    for (const char* typed : {"F9", "F"}) {
+        buttons.hotkeyBox()->setCurrentText(typed);
+        QTest::keyClick(buttons.hotkeyBox()->lineEdit(), Qt::Key_Return);
+        EXPECT_EQ(buttons.hotkeyProblem()->isHidden(), std::string_view(typed) == "F9");
+    }
+    // A finished text that names no key: the last key stays in use.
     EXPECT_TRUE(buttons.hotkeyProblem()->text().contains("vẫn dùng F9"));
     keys_->pressed.insert(0x78);
     window->pollHotkey();

@@ -38,11 +38,20 @@ QByteArray Redirect(const QByteArray& to) {
     return Response("302 Found", {}, "Location: " + to + "\r\n");
 }
 
-TEST(UpdateCheckTextTest, OnlyTheExactVersionLineIsCurrent) {
-    EXPECT_TRUE(isCurrentVersion(ReadFetchedText("v2.0-demo")));
-    for (const char* other : {"v2.0-demo ", "v2.0-demo\r\nbeta", "v2.0-demo\n", "V2.0-DEMO", ""}) {
+TEST(UpdateCheckTextTest, OurVersionWithBlanksOrLineEndsAroundItIsCurrent) {
+    for (const char* same : {"v2.0-demo", "v2.0-demo ", "v2.0-demo\n", "v2.0-demo\r\n\r\n"}) {
+        EXPECT_TRUE(isCurrentVersion(ReadFetchedText(same))) << same;
+    }
+    for (const char* other : {"v2.0-demo\r\nbeta", "V2.0-DEMO", "v2.0-demo2", ""}) {
         EXPECT_FALSE(isCurrentVersion(ReadFetchedText(other))) << other;
     }
+}
+
+TEST(UpdateCheckTextTest, MessagesKeepTheFetchedVersionAsItCameAndNoLastWordAlone) {
+    EXPECT_EQ(newerVersionText("v2.0-beta1"), "Đã có phiên bản mới! v2.0-beta1");
+    EXPECT_EQ(checkFailedText(QStringLiteral("máy chủ không trả lời kịp ")),
+              QStringLiteral("Không kiểm tra được phiên bản mới:\nmáy chủ không trả lời\u00A0kịp"));
+    EXPECT_EQ(checkFailedText(QStringLiteral("x")), "Không kiểm tra được phiên bản mới:\nx");
 }
 
 TEST(UpdateCheckTextTest, RedirectsStayOnTheHostAndNeverLeaveHttps) {
@@ -147,7 +156,7 @@ TEST_F(UpdateFlowTest, SameVersionSaysSoAndChangesNothing) {
     ASSERT_TRUE(checked.wait(kWaitMs));
 
     EXPECT_EQ(dialogs_.messages, QStringList{Message("Chưa có phiên bản mới")});
-    EXPECT_EQ(session_->Updates().versionText, "v2.0-demo\r\n");
+    EXPECT_EQ(session_->Updates().versionText, "v2.0-demo");
     EXPECT_TRUE(check_->isEnabled() && Shown(check_) && !Shown(download_));
     EXPECT_EQ(requests_.size(), 1);  // no link fetch
     EXPECT_FALSE(SettingsWritten());
@@ -160,17 +169,17 @@ TEST_F(UpdateFlowTest, NewerVersionIsShownConvertedRecordedAndSwapsTheButtons) {
     responses_["/v"] = Redirect(Root() + "/current/v");
     responses_["/current/v"] = Redirect("again");
     responses_["/current/again"] = Redirect("/last");
-    responses_["/last"] = Ok("v2.1 mo71i\r\n");
+    responses_["/last"] = Ok("v2.1-beta1\r\n");
     responses_["/vlink"] = Ok("https://dl.example.net/kv-2.1.zip\r\n");
     auto flow = Flow();
     Check(*flow);
 
-    EXPECT_EQ(dialogs_.messages, QStringList{Message("Đã có phiên bản mới! v2.1 mới\r\n")});
-    EXPECT_EQ(session_->Updates().versionText, "v2.1 mo71i\r\n");
+    EXPECT_EQ(dialogs_.messages, QStringList{Message("Đã có phiên bản mới! v2.1-beta1")});
+    EXPECT_EQ(session_->Updates().versionText, "v2.1-beta1");
     EXPECT_EQ(session_->Updates().downloadLink, "https://dl.example.net/kv-2.1.zip\r\n");
     EXPECT_TRUE(!Shown(check_) && Shown(download_));
     const auto ini = dir_ / "Thietlap.ini";
-    EXPECT_EQ(catalog::ReadIni(ini, "KiemTra", "PhienBan", "-"), "v2.1 mo71i");
+    EXPECT_EQ(catalog::ReadIni(ini, "KiemTra", "PhienBan", "-"), "v2.1-beta1");
     EXPECT_EQ(catalog::ReadIni(ini, "Thiet lap", "DuongDan", "-"), "C:\\Game");
     EXPECT_EQ(std::distance(std::filesystem::directory_iterator(dir_.path()), {}), 1);
     for (const QByteArray& request : requests_) {
@@ -197,9 +206,7 @@ TEST_F(UpdateFlowTest, FailedChecksAreReportedAndChangeNothing) {
               "quá lớn"},
              {"redirect to another host", Redirect("http://localhost:1/v"), "không được phép"},
              {"too many redirects", Redirect("/r1"), "quá nhiều lần"},
-             {"no answer", QByteArray(""), "không trả lời kịp"},
-             {"captive portal", Ok("<html>\n<body>Wi-Fi login</body>\n</html>\n"),
-              "không trả về số phiên bản"}}) {
+             {"no answer", QByteArray(""), "không trả lời kịp"}}) {
         SCOPED_TRACE(name);
         responses_["/v"] = response;
         session_->KeepVersion("v1.9\r\n");
@@ -210,8 +217,8 @@ TEST_F(UpdateFlowTest, FailedChecksAreReportedAndChangeNothing) {
         Check(*flow);
 
         ASSERT_EQ(dialogs_.messages.size(), 1);
-        const QString& shown = dialogs_.messages[0];
-        EXPECT_TRUE(shown.startsWith(Message("Không kiểm tra được phiên bản mới: ")) &&
+        const QString shown = QString(dialogs_.messages[0]).replace(QChar::Nbsp, u' ');
+        EXPECT_TRUE(shown.startsWith(Message("Không kiểm tra được phiên bản mới:\n")) &&
                     shown.contains(QString::fromUtf8(reason)))
             << shown.toStdString();
         EXPECT_EQ(session_->Updates().versionText, "v1.9\r\n");
@@ -221,6 +228,29 @@ TEST_F(UpdateFlowTest, FailedChecksAreReportedAndChangeNothing) {
         for (qsizetype i = requestsBefore; i < requests_.size(); ++i) {
             EXPECT_FALSE(requests_[i].startsWith("GET /vlink"));
         }
+    }
+}
+
+TEST_F(UpdateFlowTest, AnAnswerThatIsNoVersionIsSaidSoAndChangesNothing) {
+    responses_["/vlink"] = Ok("https://dl.example.net/kv.zip");
+    for (const QByteArray& answer :
+         {QByteArray("<html>\n<body>Wi-Fi login</body>\n</html>\n"),
+          QByteArray("<html><body>v9.9</body></html>"), QByteArray("<img src=\"/etc/x.png\">"),
+          QByteArray("<h1>v2.1</h1>"), QByteArray("v2.1&amp;"), QByteArray("hello world"),
+          QByteArray("")}) {
+        SCOPED_TRACE(answer.toStdString());
+        responses_["/v"] = Ok(answer);
+        session_->KeepVersion("v1.9");
+        auto flow = Flow();
+        Check(*flow);
+        EXPECT_EQ(dialogs_.messages,
+                  QStringList{Message("Máy chủ cập nhật trả lời không phải số phiên bản")});
+        EXPECT_EQ(session_->Updates().versionText, "v1.9");
+        EXPECT_TRUE(check_->isEnabled() && Shown(check_) && !Shown(download_));
+        EXPECT_FALSE(SettingsWritten());
+    }
+    for (const QByteArray& request : requests_) {
+        EXPECT_FALSE(request.startsWith("GET /vlink"));
     }
 }
 

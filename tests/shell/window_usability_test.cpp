@@ -4,14 +4,18 @@
 #include <QAbstractProxyModel>
 #include <QAccessible>
 #include <QApplication>
+#include <QDir>
 #include <QFileDialog>
 #include <QFileSystemModel>
 #include <QLabel>
+#include <QLineEdit>
 #include <QPushButton>
 #include <QTest>
+#include <QWheelEvent>
 
 #include "platform/scoped_env.h"
 #include "shell/dialogs.h"
+#include "shell/side_windows.h"
 #include "support/trees.h"
 #include "window_fixture.h"
 
@@ -116,10 +120,10 @@ TEST_F(WindowUsabilityTest, TabHeadsAndLabelsTellAssistiveToolsWhatTheyAreAndDo)
 TEST_F(WindowUsabilityTest, AboutAndHelpAreSideWindowsThatCloseWithTheirButtonAndWithEscape) {
     auto window = Open();
     window->show();
-    for (const char* title : {"Thong tin", "Huong dan"}) {
+    for (const char* title : {"Thông tin", "Hướng dẫn"}) {
         for (Qt::Key key : {Qt::Key_unknown, Qt::Key_Escape, Qt::Key_Return}) {
             SCOPED_TRACE(std::string(title) + " " + std::to_string(key));
-            if (std::string_view(title) == "Thong tin") {
+            if (std::string_view(title) == "Thông tin") {
                 Click(window->buttons().info());
             } else {
                 Click(window->buttons().help());
@@ -138,6 +142,126 @@ TEST_F(WindowUsabilityTest, AboutAndHelpAreSideWindowsThatCloseWithTheirButtonAn
             EXPECT_TRUE(side.isNull());
         }
     }
+}
+
+// "F1" on the way to "F13" must not become the hotkey: only a finished name counts.
+TEST_F(WindowUsabilityTest, TypingChangesTheHotkeyOnlyOnceFinished) {
+    auto window = ShowActive();
+    HotkeyBox* box = window->buttons().hotkeyBox();
+    TabHead* head = window->panels().tabHead(0);
+    EXPECT_TRUE(head->hasFocus());  // not the hotkey box
+    box->setFocus(Qt::MouseFocusReason);
+    box->lineEdit()->selectAll();
+    for (const char key : std::string_view("F13")) {
+        QTest::keyClick(box->lineEdit(), key);
+        EXPECT_EQ(window->session().ActiveHotkey(), "F7") << box->currentText().toStdString();
+    }
+    EXPECT_EQ(box->currentText(), "F13");
+    Press(box->lineEdit(), Qt::Key_Return);
+    EXPECT_EQ(window->session().Settings().hotkey, "F13");
+    EXPECT_EQ(window->session().ActiveHotkey(), "F7");  // names no key: the last one stays
+
+    box->lineEdit()->selectAll();
+    QTest::keyClicks(box->lineEdit(), QStringLiteral("F9"));
+    EXPECT_EQ(window->session().ActiveHotkey(), "F7");
+    head->setFocus(Qt::TabFocusReason);  // leaving the box finishes the name
+    EXPECT_EQ(window->session().ActiveHotkey(), "F9");
+}
+
+TEST_F(WindowUsabilityTest, TheWheelTurnsTheHotkeyOnlyWhileItHasTheFocus) {
+    auto window = ShowActive();
+    HotkeyBox* box = window->buttons().hotkeyBox();
+    const auto wheelDown = [box] {
+        const QPointF at(box->width() / 2.0, box->height() / 2.0);
+        QWheelEvent wheel(at, box->mapToGlobal(at), QPoint(), QPoint(0, -120), Qt::NoButton,
+                          Qt::NoModifier, Qt::NoScrollPhase, false);
+        QApplication::sendEvent(box, &wheel);
+    };
+    wheelDown();
+    EXPECT_EQ(box->currentText(), "F7");
+    EXPECT_EQ(window->session().ActiveHotkey(), "F7");
+    box->setFocus(Qt::MouseFocusReason);
+    wheelDown();
+    EXPECT_EQ(box->currentText(), "F8");
+    EXPECT_EQ(window->session().ActiveHotkey(), "F8");
+}
+
+// The focus goes back to the current tab head after a tab switch, hiding to the tray and coming
+// back: a key or the wheel meant for something else never reaches the hotkey box.
+TEST_F(WindowUsabilityTest, TheFocusNeverRestsInTheHotkeyBoxAfterTabSwitchHideOrRestore) {
+    auto window = ShowActive();
+    HotkeyBox* box = window->buttons().hotkeyBox();
+    const auto inBox = [&] {
+        QWidget* focused = window->focusWidget();
+        return focused == box || box->isAncestorOf(focused);
+    };
+    box->setFocus(Qt::TabFocusReason);
+    ASSERT_TRUE(inBox());
+    window->panels().selectTab(2);
+    EXPECT_FALSE(inBox());
+    EXPECT_EQ(window->focusWidget(), window->panels().tabHead(2));
+
+    box->setFocus(Qt::TabFocusReason);
+    Click(window->buttons().runHidden());
+    EXPECT_FALSE(window->isVisible());
+    EXPECT_FALSE(inBox());
+    box->setFocus(Qt::OtherFocusReason);  // whatever happened while hidden
+    emit window->tray().showRequested();
+    EXPECT_TRUE(window->isVisible());
+    EXPECT_FALSE(inBox());
+    EXPECT_EQ(box->focusPolicy(), Qt::StrongFocus);  // click and Tab, not the wheel
+}
+
+// The side windows take the keyboard at once, so Escape closes them without a click first.
+TEST_F(WindowUsabilityTest, SideWindowsTakeTheFocusSoEscapeClosesThemAtOnce) {
+    std::filesystem::create_directories(tool() / "img");
+    QImage(40, 20, QImage::Format_RGB32)
+        .save(QString::fromStdString((tool() / "img/t1_img_3.jpg").string()));
+    auto window = ShowActive();
+    const auto escapeCloses = [](const char* title) {
+        QPointer<QWidget> side = SideWindow(title);
+        ASSERT_TRUE(side) << title;
+        ASSERT_TRUE(QTest::qWaitFor([&] { return QApplication::activeWindow() == side; })) << title;
+        ASSERT_NE(QApplication::focusWidget(), nullptr);
+        EXPECT_EQ(QApplication::focusWidget()->window(), side.data()) << title;
+        Press(QApplication::focusWidget(), Qt::Key_Escape);
+        EXPECT_FALSE(side && side->isVisible()) << title;
+    };
+    Press(window->buttons().info(), Qt::Key_Space);
+    QWidget* about = SideWindow("Thông tin");
+    ASSERT_NE(about, nullptr);
+    // Beside the main window, or at least clear of its command buttons.
+    const QRect buttons(window->buttons().save()->mapToGlobal(QPoint(0, 0)),
+                        window->buttons().save()->size());
+    EXPECT_FALSE(about->frameGeometry().intersects(buttons));
+    QDir().mkpath(QStringLiteral(KICKVANE_ARTIFACTS));
+    about->grab().save(QStringLiteral(KICKVANE_ARTIFACTS "/about-window.png"));
+    escapeCloses("Thông tin");
+    window->activateWindow();
+    Click(window->buttons().help());
+    escapeCloses("Hướng dẫn");
+    window->activateWindow();
+    window->panels().categoryLabel(3)->setFocus(Qt::TabFocusReason);
+    Press(window->panels().categoryLabel(3), Qt::Key_Return);
+    escapeCloses("Xem trước");
+}
+
+TEST(SideWindowPositionTest, BesideTheOwnerWhenThereIsRoomElseOverItClearOfTheButtons) {
+    const QRect area(0, 0, 1280, 760);
+    const QSize size(440, 300);
+    // Room on the right, then only on the left.
+    EXPECT_EQ(sideWindowPosition(area, QRect(100, 50, 430, 510), 520, size), QPoint(538, 50));
+    EXPECT_EQ(sideWindowPosition(area, QRect(800, 50, 430, 510), 520, size), QPoint(352, 50));
+    // No room on either side: centred over the owner, its bottom above the buttons.
+    const QRect owner(420, 100, 430, 510);
+    const QPoint over = sideWindowPosition(area, owner, 560, size);
+    EXPECT_EQ(over.x(), owner.center().x() - size.width() / 2);
+    EXPECT_LE(over.y() + size.height(), 560);
+    EXPECT_GE(over.y(), area.top());
+    // A screen too small for both: inside the work area all the same.
+    const QRect small(0, 20, 600, 400);
+    const QPoint inside = sideWindowPosition(small, QRect(50, 40, 430, 510), 500, size);
+    EXPECT_TRUE(small.contains(QRect(inside, size))) << inside.x() << "," << inside.y();
 }
 
 TEST_F(WindowUsabilityTest, FolderDialogStartsAtTheNearestExistingFolderElseInTheWinePrefix) {
@@ -167,7 +291,7 @@ TEST_F(WindowUsabilityTest, FolderDialogSpeaksVietnameseAndListsHiddenFolders) {
     std::filesystem::create_directories(dir_ / ".wine");
     std::filesystem::create_directories(dir_ / "Games");
     QFileDialog dialog;
-    prepareFolderDialog(dialog, QStringLiteral("Ho tro nap nhanh cac file Face va Ball"),
+    prepareFolderDialog(dialog, QStringLiteral("Hỗ trợ nạp nhanh các file Face và Ball"),
                         QString::fromStdString(dir_.path().string()));
     EXPECT_EQ(dialog.proxyModel()->headerData(0, Qt::Horizontal, Qt::DisplayRole).toString(),
               "Tên");

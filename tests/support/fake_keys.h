@@ -13,8 +13,11 @@ public:
         return {held.count(virtualKey) > 0, pressed.erase(virtualKey) > 0};
     }
 
+    int WakeDescriptor() const override { return wake; }
+
     std::set<int> held;
     std::set<int> pressed;
+    int wake = -1;  // a descriptor that stands for key events; -1: the state is polled
 };
 
 }  // namespace kickvane::testing

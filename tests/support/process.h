@@ -62,6 +62,7 @@ public:
     ~ChildProcess() { Kill(); }
 
     bool started() const { return pid_ > 0; }
+    pid_t pid() const { return pid_; }
 
     bool Running() {
         Reap(WNOHANG);

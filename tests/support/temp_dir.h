@@ -29,7 +29,10 @@ public:
     }
 
     const fs::path& path() const { return path_; }
-    fs::path operator/(std::string_view relative) const { return path_ / relative; }
+    // `relative` is UTF-8, also on Windows (where a plain string is read in the ANSI code page).
+    fs::path operator/(std::string_view relative) const {
+        return path_ / fs::path(std::u8string(relative.begin(), relative.end()));
+    }
 
 private:
     fs::path path_;

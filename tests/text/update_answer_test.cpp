@@ -17,17 +17,25 @@ TEST(UpdateAnswerTest, FetchedTextEndsLinesWithCrLfAndReadsBytesThatAreNotUtf8As
     EXPECT_EQ(ReadFetchedText("phiên"), "phiên\r\n");
 }
 
-TEST(UpdateAnswerTest, AVersionIsOneShortLineOfPrintableCharacters) {
-    for (const std::string& version : {std::string("v2.0-demo"), std::string("v2.1-thử"),
-                                       std::string("2\n"), std::string(kMaxVersionLength, 'v')}) {
-        EXPECT_TRUE(IsVersionText(ReadFetchedText(version))) << version;
-        EXPECT_TRUE(IsVersionText(ReadFetchedText(version + "\r\n"))) << version;
+TEST(UpdateAnswerTest, AnAnswerNamesAVersionOnlyWhenItIsOneVersionNumber) {
+    for (const char* version : {"v2.0-demo", "v2.1", "2.1.3", "v2.0-beta1", "7", "v10.0.RC-2"}) {
+        EXPECT_EQ(VersionFromAnswer(ReadFetchedText(version)), version) << version;
     }
+    // Blanks and line ends around it do not count, whatever the server's line ends.
+    for (const char* padded : {"v2.1\n", " v2.1\r\n\r\n", "\tv2.1 \n", "v2.1\r"}) {
+        EXPECT_EQ(VersionFromAnswer(ReadFetchedText(padded)), "v2.1") << padded;
+    }
+    const std::string longest = "v" + std::string(kMaxVersionLength - 1, '1');
+    EXPECT_EQ(VersionFromAnswer(longest), longest);
     for (const std::string& junk :
-         {std::string(), std::string("\n"), std::string("   "), std::string("v2.1\r\nv2.2"),
-          std::string("<html>\n<body>login</body>\n</html>"), std::string("\x89PNG\r\n\x1A\n", 8),
-          std::string("v\0 2", 4), std::string("a\tb"), std::string(kMaxVersionLength + 1, 'v')}) {
-        EXPECT_FALSE(IsVersionText(ReadFetchedText(junk))) << ::testing::PrintToString(junk);
+         {std::string(), std::string("\n"), std::string("   "), std::string("v"),
+          std::string("v.2"), std::string("V2.1"), std::string("beta"), std::string("hello world"),
+          std::string("v2.1\r\nv2.2"), std::string("<html><body>v9.9</body></html>"),
+          std::string("<img src=\"file:///etc/x.png\">"), std::string("<h1>404</h1>"),
+          std::string("2.1&amp;"), std::string("v2.1 beta"), std::string("v2.1-thử"),
+          std::string("v\0 2", 4), std::string("\x89PNG\r\n\x1A\n", 8), longest + "1"}) {
+        EXPECT_EQ(VersionFromAnswer(ReadFetchedText(junk)), std::nullopt)
+            << ::testing::PrintToString(junk);
     }
 }
 

@@ -2,7 +2,9 @@
 // also where the system lacks the fonts the window asks for (a Wine prefix without Wine's own
 // fonts, as these tests run in).
 #include <QLineEdit>
+#include <QMenu>
 
+#include "shell/dialogs.h"
 #include "shell/window_fixture.h"
 
 namespace kickvane::testing {
@@ -37,6 +39,20 @@ TEST_F(WindowBoxesTest, GameFolderAndHotkeyShowInTheirBoxes) {
         << "font: " << QFontInfo(folderBox->font()).family().toStdString();
     EXPECT_GT(TextPixels(hotkeyBox), 8)
         << "font: " << QFontInfo(hotkeyBox->font()).family().toStdString();
+}
+
+// The Vietnamese words of Qt's own menus travel inside the program's one file.
+TEST_F(WindowBoxesTest, QtsOwnMenusSpeakVietnamese) {
+    ASSERT_TRUE(shell::useVietnameseQtTexts());
+    auto window = Open();
+    std::unique_ptr<QMenu> menu(window->panels().gameFolderBox()->createStandardContextMenu());
+    QStringList entries;
+    for (const QAction* action : menu->actions()) {
+        entries << action->text().section(QLatin1Char('\t'), 0, 0);
+    }
+    EXPECT_TRUE(entries.contains(QStringLiteral("&Hoàn tác"))) << entries.join(u'|').toStdString();
+    EXPECT_TRUE(entries.contains(QStringLiteral("Chọn tất cả")))
+        << entries.join(u'|').toStdString();
 }
 
 }  // namespace
