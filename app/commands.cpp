@@ -50,7 +50,7 @@ std::optional<session::Session> SessionFor(const Options& options) {
         return std::nullopt;
     }
     if (options.game) {
-        session->setGameFolder(*options.game);
+        session->SetGameFolder(*options.game);
     }
     return session;
 }
@@ -84,18 +84,18 @@ void PrintStep(const engine::StepOutcome& outcome, const text::ShownFolders& fol
 }
 
 void PrintGroup(const session::Session& session, const catalog::VariantGroup& group) {
-    const catalog::PatchSelection& selection = session.selection();
+    const catalog::PatchSelection& selection = session.Selection();
     for (const catalog::PatchOption& option : group.options) {
-        std::cout << "  " << (selection.optionValue(group.array, option.index) ? "(*) " : "( ) ")
+        std::cout << "  " << (selection.OptionValue(group.array, option.index) ? "(*) " : "( ) ")
                   << option.key << ": " << option.label << '\n';
     }
-    const catalog::AddedVariants& added = session.addedVariants();
+    const catalog::AddedVariants& added = session.AddedVariants();
     for (const catalog::AddedVariant& variant : added.Of(group.id)) {
-        std::cout << "  " << (selection.addedValue(group.id, variant.name) ? "(*) " : "( ) ")
+        std::cout << "  " << (selection.AddedValue(group.id, variant.name) ? "(*) " : "( ) ")
                   << variant.name << " [đã thêm]\n";
     }
     const std::string folder = "extras\\" + std::string(catalog::GroupFolder(group.id));
-    switch (added.folderState(group.id)) {
+    switch (added.FolderState(group.id)) {
         case catalog::GroupFolderState::Listed:
             break;
         case catalog::GroupFolderState::Missing:
@@ -184,11 +184,11 @@ int RunApply(Args args) {
     }
     const session::ApplyRun run = session->Apply();
     const engine::ApplyOutcome& outcome = run.apply;
-    if (outcome.stopped()) {
+    if (outcome.Stopped()) {
         Print(run.shown);
         return kExitStopped;
     }
-    const text::ShownFolders folders = session->shownFolders();
+    const text::ShownFolders folders = session->ShownFolders();
     for (const engine::StepOutcome& step : outcome.steps) {
         PrintStep(step, folders);
     }
@@ -212,7 +212,7 @@ int RunPlan(Args args) {
     }
     // The two folders first, then the steps with paths relative to them: "data", "extras"
     // are the tool's, "data2", "zdata" the game's.
-    const text::ShownFolders folders = session->shownFolders();
+    const text::ShownFolders folders = session->ShownFolders();
     std::cout << "thư mục công cụ = " << platform::PathToUtf8(folders.tool) << '\n'
               << "thư mục trò chơi = " << platform::PathToUtf8(folders.game) << '\n';
     for (const engine::PlanStep& step : session->Plan()) {
@@ -236,7 +236,7 @@ int RunList(Args args) {
     }
     for (const catalog::PatchCategory& category : catalog::Categories()) {
         std::cout << category.key
-                  << (session->selection().isOn(category.switchIndex) ? " [bật] " : " [tắt] ")
+                  << (session->Selection().IsOn(category.switchIndex) ? " [bật] " : " [tắt] ")
                   << platform::TrimBlanks(category.label) << '\n';
         if (category.group) {
             PrintGroup(*session, catalog::Group(*category.group));
@@ -262,7 +262,7 @@ int RunQuickLoad(Args args) {
     std::cout << run.shown.popup->text << '\n';
     for (const engine::QuickLoadFailure& failure : outcome.failures) {
         std::cerr << "lỗi: " << failure.pattern << ": "
-                  << text::FailureText(failure.failure, session.shownFolders()) << '\n';
+                  << text::FailureText(failure.failure, session.ShownFolders()) << '\n';
     }
     return outcome.failures.empty() ? kExitOk : kExitFailedSteps;
 }

@@ -40,7 +40,7 @@ int RunLaunch(Args args) {
     const session::LaunchRun run = session.Launch(session::LaunchFrom::Tray);
     if (!run.launch.started()) {
         for (const text::Message& message : run.shown.messages) {
-            std::cerr << "kickvane: " << message.text << " (" << session.settings().gameFolder
+            std::cerr << "kickvane: " << message.text << " (" << session.Settings().gameFolder
                       << ")\n";
         }
         return 1;

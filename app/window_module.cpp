@@ -14,7 +14,7 @@
 
 extern "C" KICKVANE_EXPORT int kickvane_open_window(int* argc, char** argv,
                                                     const char* toolFolder) {
-    return kickvane::shell::RunWindow(*argc, argv, kickvane::platform::PathFromUtf8(toolFolder));
+    return kickvane::shell::runWindow(*argc, argv, kickvane::platform::PathFromUtf8(toolFolder));
 }
 
 extern "C" KICKVANE_EXPORT int kickvane_draw_skin_gallery(const char* outFile) {

@@ -126,13 +126,13 @@ void MakeGameFolder(const fs::path& game) {
 PatchSelection EverythingOn() {
     PatchSelection selection = PatchSelection::Defaults();
     for (int i = 0; i < kickvane::catalog::kCategoryCount; ++i) {
-        selection.setSwitchValue(i, 1);
+        selection.SetSwitchValue(i, 1);
     }
     // The variants whose sets MakeToolFolder writes under "extras".
-    selection.setOptionValue(OptionArray::Ball, 3, true);        // UCL 2011
-    selection.setOptionValue(OptionArray::Scoreboard, 2, true);  // ESPN HD
-    selection.setOptionValue(OptionArray::Other, 3, true);       // adboard WC 2010
-    selection.setOptionValue(OptionArray::Other, 5, true);       // pitch Caro
+    selection.SetOptionValue(OptionArray::Ball, 3, true);        // UCL 2011
+    selection.SetOptionValue(OptionArray::Scoreboard, 2, true);  // ESPN HD
+    selection.SetOptionValue(OptionArray::Other, 3, true);       // adboard WC 2010
+    selection.SetOptionValue(OptionArray::Other, 5, true);       // pitch Caro
     return selection;
 }
 
@@ -142,7 +142,7 @@ PatchSelection OnlyCategories(std::initializer_list<std::string_view> keys) {
     for (int i = 0; i < kickvane::catalog::kCategoryCount; ++i) {
         const std::string_view key = kickvane::catalog::Categories()[static_cast<size_t>(i)].key;
         const bool on = std::find(keys.begin(), keys.end(), key) != keys.end();
-        selection.setSwitchValue(i, on ? 1 : 0);
+        selection.SetSwitchValue(i, on ? 1 : 0);
     }
     return selection;
 }

@@ -247,7 +247,7 @@ std::span<const SkippedFolder> AddedVariants::Skipped(GroupId group) const {
     return skipped_[Slot(group)];
 }
 
-GroupFolderState AddedVariants::folderState(GroupId group) const {
+GroupFolderState AddedVariants::FolderState(GroupId group) const {
     return states_[Slot(group)];
 }
 

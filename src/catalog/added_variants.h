@@ -64,7 +64,7 @@ public:
     std::span<const AddedVariant> Of(GroupId group) const;
     const AddedVariant* Find(GroupId group, std::string_view name) const;
     std::span<const SkippedFolder> Skipped(GroupId group) const;
-    GroupFolderState folderState(GroupId group) const;
+    GroupFolderState FolderState(GroupId group) const;
     bool empty() const;
 
     // For tests and the demo: a list made by hand.

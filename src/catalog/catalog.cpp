@@ -87,29 +87,6 @@ const VariantGroup& Group(GroupId id) {
     return kGroups[static_cast<size_t>(id)];
 }
 
-const PatchCategory* FindCategory(std::string_view key) {
-    for (const PatchCategory& category : kCategories) {
-        if (category.key == key) {
-            return &category;
-        }
-    }
-    return nullptr;
-}
-
-const PatchOption* FindOption(std::string_view section, std::string_view key) {
-    for (const VariantGroup& group : kGroups) {
-        if (group.section != section) {
-            continue;
-        }
-        for (const PatchOption& option : group.options) {
-            if (option.key == key) {
-                return &option;
-            }
-        }
-    }
-    return nullptr;
-}
-
 const VariantGroup* GroupOfOption(OptionArray array, int index) {
     for (const VariantGroup& group : kGroups) {
         if (group.array == array && index >= group.options.front().index &&

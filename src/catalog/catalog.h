@@ -56,9 +56,6 @@ std::span<const PatchCategory> Categories();
 std::span<const VariantGroup> Groups();
 const VariantGroup& Group(GroupId id);
 
-const PatchCategory* FindCategory(std::string_view key);
-const PatchOption* FindOption(std::string_view section, std::string_view key);
-
 // The group that owns option button `index` of `array`, or null when there is no such button.
 const VariantGroup* GroupOfOption(OptionArray array, int index);
 

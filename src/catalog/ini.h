@@ -65,7 +65,7 @@ public:
     // UTF-16 file, as text), set and added lines in UTF-8 ended by CR LF.
     std::string Serialize() const;
 
-    IniEncoding encoding() const { return encoding_; }
+    IniEncoding Encoding() const { return encoding_; }
 
     // Writes the document over the file found under `file` in any letter case (or creates it),
     // atomically: on failure the previous file stays as it was. A document larger than the

@@ -17,32 +17,32 @@ size_t Slot(GroupId group) {
 PatchSelection PatchSelection::Defaults() {
     PatchSelection selection;
     for (const PatchCategory& category : Categories()) {
-        selection.setSwitchValue(category.switchIndex, category.defaultValue);
+        selection.SetSwitchValue(category.switchIndex, category.defaultValue);
     }
     for (const VariantGroup& group : Groups()) {
         for (const PatchOption& option : group.options) {
-            selection.setOptionValue(group.array, option.index, option.isDefault);
+            selection.SetOptionValue(group.array, option.index, option.isDefault);
         }
     }
     return selection;
 }
 
-int PatchSelection::switchValue(int switchIndex) const {
+int PatchSelection::SwitchValue(int switchIndex) const {
     return ValidSwitch(switchIndex) ? switches_[static_cast<size_t>(switchIndex)] : 0;
 }
 
-void PatchSelection::setSwitchValue(int switchIndex, int value) {
+void PatchSelection::SetSwitchValue(int switchIndex, int value) {
     if (ValidSwitch(switchIndex)) {
         switches_[static_cast<size_t>(switchIndex)] = value;
     }
 }
 
-bool PatchSelection::optionValue(OptionArray array, int index) const {
+bool PatchSelection::OptionValue(OptionArray array, int index) const {
     const VariantGroup* group = GroupOfOption(array, index);
     return group && chosen_[Slot(group->id)] == index;
 }
 
-void PatchSelection::setOptionValue(OptionArray array, int index, bool value) {
+void PatchSelection::SetOptionValue(OptionArray array, int index, bool value) {
     const VariantGroup* group = GroupOfOption(array, index);
     if (!group) {
         return;
@@ -56,12 +56,12 @@ void PatchSelection::setOptionValue(OptionArray array, int index, bool value) {
     }
 }
 
-std::optional<int> PatchSelection::chosen(GroupId group) const {
+std::optional<int> PatchSelection::Chosen(GroupId group) const {
     return chosen_[Slot(group)];
 }
 
-const PatchOption* PatchSelection::chosenOption(GroupId group) const {
-    const std::optional<int> index = chosen(group);
+const PatchOption* PatchSelection::ChosenOption(GroupId group) const {
+    const std::optional<int> index = Chosen(group);
     if (!index) {
         return nullptr;
     }
@@ -73,7 +73,7 @@ const PatchOption* PatchSelection::chosenOption(GroupId group) const {
     return nullptr;
 }
 
-void PatchSelection::setAddedValue(GroupId group, std::string_view name, bool value) {
+void PatchSelection::SetAddedValue(GroupId group, std::string_view name, bool value) {
     std::string& chosen = chosenAdded_[Slot(group)];
     if (value && !name.empty()) {
         chosen = name;
@@ -83,11 +83,11 @@ void PatchSelection::setAddedValue(GroupId group, std::string_view name, bool va
     }
 }
 
-bool PatchSelection::addedValue(GroupId group, std::string_view name) const {
+bool PatchSelection::AddedValue(GroupId group, std::string_view name) const {
     return !name.empty() && chosenAdded_[Slot(group)] == name;
 }
 
-std::string_view PatchSelection::chosenAdded(GroupId group) const {
+std::string_view PatchSelection::ChosenAdded(GroupId group) const {
     return chosenAdded_[Slot(group)];
 }
 

@@ -20,27 +20,27 @@ public:
     // The catalog's defaults, as a load without a settings file gives them.
     static PatchSelection Defaults();
 
-    int switchValue(int switchIndex) const;
-    void setSwitchValue(int switchIndex, int value);
+    int SwitchValue(int switchIndex) const;
+    void SetSwitchValue(int switchIndex, int value);
     // A category is on only when its switch value is exactly 1.
-    bool isOn(int switchIndex) const { return switchValue(switchIndex) == 1; }
+    bool IsOn(int switchIndex) const { return SwitchValue(switchIndex) == 1; }
 
     // The value of option button `index` of `array`.
-    bool optionValue(OptionArray array, int index) const;
+    bool OptionValue(OptionArray array, int index) const;
     // True chooses the variant and clears the others of its container; false clears only it.
-    void setOptionValue(OptionArray array, int index, bool value);
+    void SetOptionValue(OptionArray array, int index, bool value);
 
     // The chosen variant of a group, as its index in the group's option array.
-    std::optional<int> chosen(GroupId group) const;
-    const PatchOption* chosenOption(GroupId group) const;
+    std::optional<int> Chosen(GroupId group) const;
+    const PatchOption* ChosenOption(GroupId group) const;
 
     // A variant the player added to the group, by its folder name. It takes part in the same
     // rule: choosing it clears the group's catalog option and the other way round.
-    void setAddedValue(GroupId group, std::string_view name, bool value);
-    bool addedValue(GroupId group, std::string_view name) const;
+    void SetAddedValue(GroupId group, std::string_view name, bool value);
+    bool AddedValue(GroupId group, std::string_view name) const;
     // The chosen added variant's name; empty when the group's choice is none or a catalog option.
-    std::string_view chosenAdded(GroupId group) const;
-    bool hasChoice(GroupId group) const { return chosen(group) || !chosenAdded(group).empty(); }
+    std::string_view ChosenAdded(GroupId group) const;
+    bool HasChoice(GroupId group) const { return Chosen(group) || !ChosenAdded(group).empty(); }
 
     friend bool operator==(const PatchSelection&, const PatchSelection&) = default;
 

@@ -76,7 +76,7 @@ void ChooseGroupDefault(PatchSelection& selection, GroupId id) {
     const VariantGroup& group = Group(id);
     for (const PatchOption& option : group.options) {
         if (option.isDefault) {
-            selection.setOptionValue(group.array, option.index, true);
+            selection.SetOptionValue(group.array, option.index, true);
         }
     }
 }
@@ -130,7 +130,7 @@ void FallBackFromGoneVariants(const IniDocument& file, const AddedVariants& adde
         }
         size_t next = 0;
         for (const VariantGroup& group : Groups()) {
-            if (group.section != section || goneTrue.empty() || selection.hasChoice(group.id)) {
+            if (group.section != section || goneTrue.empty() || selection.HasChoice(group.id)) {
                 continue;
             }
             ChooseGroupDefault(selection, group.id);
@@ -153,7 +153,7 @@ Status LoadSettings(const std::filesystem::path& toolFolder, Settings& settings,
         const std::string fallback = std::to_string(category.defaultValue);
         if (auto value =
                 ParseWholeNumber(ValueOr(file, kCategorySection, category.key, fallback))) {
-            settings.selection.setSwitchValue(category.switchIndex, *value);
+            settings.selection.SetSwitchValue(category.switchIndex, *value);
         }
     }
     // Values are applied one after the other in catalog order, so within a group the last "True"
@@ -162,7 +162,7 @@ Status LoadSettings(const std::filesystem::path& toolFolder, Settings& settings,
         for (const PatchOption& option : group.options) {
             const std::string_view fallback = option.isDefault ? "True" : "False";
             if (auto value = ParseTruthValue(ValueOr(file, group.section, option.key, fallback))) {
-                settings.selection.setOptionValue(group.array, option.index, *value);
+                settings.selection.SetOptionValue(group.array, option.index, *value);
             }
         }
     }
@@ -170,7 +170,7 @@ Status LoadSettings(const std::filesystem::path& toolFolder, Settings& settings,
     for (const VariantGroup& group : Groups()) {
         for (const AddedVariant& variant : added.Of(group.id)) {
             if (auto value = ParseTruthValue(ValueOr(file, group.section, variant.name, "False"))) {
-                settings.selection.setAddedValue(group.id, variant.name, *value);
+                settings.selection.SetAddedValue(group.id, variant.name, *value);
             }
         }
     }
@@ -197,18 +197,18 @@ Status SaveSettings(const std::filesystem::path& toolFolder, const Settings& set
     set(kMainSection, kHotkeyKey, settings.hotkey);
     for (const PatchCategory& category : Categories()) {
         set(kCategorySection, category.key,
-            std::to_string(settings.selection.switchValue(category.switchIndex)));
+            std::to_string(settings.selection.SwitchValue(category.switchIndex)));
     }
     for (const VariantGroup& group : Groups()) {
         for (const PatchOption& option : group.options) {
             set(group.section, option.key,
-                settings.selection.optionValue(group.array, option.index) ? "True" : "False");
+                settings.selection.OptionValue(group.array, option.index) ? "True" : "False");
         }
     }
     for (const VariantGroup& group : Groups()) {
         for (const AddedVariant& variant : added.Of(group.id)) {
             set(group.section, variant.name,
-                settings.selection.addedValue(group.id, variant.name) ? "True" : "False");
+                settings.selection.AddedValue(group.id, variant.name) ? "True" : "False");
         }
     }
     if (!status) {

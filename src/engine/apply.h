@@ -33,7 +33,7 @@ struct ApplyOutcome {
     std::vector<StepOutcome> steps;
     std::filesystem::path signalSound;  // to play once the copies are done; empty when stopped
 
-    bool stopped() const { return stoppedBy != RootProblem::None; }
+    bool Stopped() const { return stoppedBy != RootProblem::None; }
     std::vector<StepOutcome> Failures() const;
 };
 

@@ -360,8 +360,4 @@ bool FolderExists(const fs::path& folder) {
     return platform::IsDirectory(ResolveCaseInsensitive(folder));
 }
 
-bool FileExists(const fs::path& file) {
-    return platform::IsRegularFile(ResolveCaseInsensitive(file));
-}
-
 }  // namespace kickvane::engine

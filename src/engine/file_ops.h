@@ -30,6 +30,5 @@ Status CopyFileInto(const fs::path& file, const fs::path& folder, CopyCount* cou
 Status MakeFolder(const fs::path& folder);
 
 bool FolderExists(const fs::path& folder);
-bool FileExists(const fs::path& file);
 
 }  // namespace kickvane::engine

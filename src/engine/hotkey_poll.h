@@ -27,16 +27,16 @@ public:
     // and returns false.
     bool SetHotkey(std::string_view name);
     // The virtual key in use; none until a name that names a key has been set.
-    std::optional<int> key() const { return key_; }
+    std::optional<int> Key() const { return key_; }
 
     // Samples the key once; true when the patches should be applied.
     bool Tick();
 
     // The sampler's descriptor that becomes readable on key events; -1 where only ticks tell.
-    int wakeDescriptor() const { return sampler_ ? sampler_->wakeDescriptor() : -1; }
+    int WakeDescriptor() const { return sampler_ ? sampler_->WakeDescriptor() : -1; }
     // Whether the next tick must come from the timer: always without a wake descriptor, else
     // while the key was down at the last tick.
-    bool needsTicks() const { return wakeDescriptor() < 0 || heldAtLastTick_; }
+    bool NeedsTicks() const { return WakeDescriptor() < 0 || heldAtLastTick_; }
 
 private:
     platform::KeySampler* sampler_;

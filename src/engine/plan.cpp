@@ -88,10 +88,10 @@ constexpr std::array<std::string_view, 8> kInterfaceFolders{
 using ChosenSet = std::optional<std::string>;
 
 ChosenSet SetOf(const PatchSelection& selection, GroupId group) {
-    if (const std::string_view added = selection.chosenAdded(group); !added.empty()) {
+    if (const std::string_view added = selection.ChosenAdded(group); !added.empty()) {
         return catalog::AddedVariant{group, std::string(added)}.SourceFolder();
     }
-    if (const catalog::PatchOption* option = selection.chosenOption(group)) {
+    if (const catalog::PatchOption* option = selection.ChosenOption(group)) {
         return std::string(option->sourceFolder);
     }
     return std::nullopt;
@@ -171,7 +171,7 @@ std::vector<PlanStep> BuildPlan(const PatchSelection& selection) {
     std::vector<PlanStep> steps;
     PlanBuilder plan(steps);
     for (int category = 0; category < catalog::kCategoryCount; ++category) {
-        if (!selection.isOn(category)) {
+        if (!selection.IsOn(category)) {
             continue;
         }
         plan.Category(category);

@@ -29,7 +29,7 @@ struct QuickLoadOutcome {
     std::vector<std::string> copied;       // source files copied, relative to the source folder
     std::vector<QuickLoadFailure> failures;
 
-    bool ok() const { return !stopped && failures.empty(); }
+    bool Ok() const { return !stopped && failures.empty(); }
 };
 
 // Copies face and ball files from `source` into the tool's base set by seven name patterns, in

@@ -115,9 +115,6 @@ void RemoveStaleTemporaries(const fs::path& folder,
 // True when the system refuses `path` for its length: the whole path, or one of its names.
 bool IsTooLong(const fs::path& path);
 
-// Reads a whole file. nullopt when it cannot be opened or read.
-std::optional<std::string> ReadFile(const fs::path& path);
-
 // Reads a whole regular file of at most `maxBytes`, without ever opening anything else (a device
 // or a pipe could block or never end).
 struct FileRead {

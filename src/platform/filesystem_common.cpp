@@ -5,7 +5,6 @@
 #include <cstdlib>
 #include <cstring>
 #include <fstream>
-#include <sstream>
 
 #include "platform/filesystem.h"
 #include "platform/sound.h"
@@ -48,19 +47,6 @@ bool IsDirectory(const fs::path& path) {
 bool IsRegularFile(const fs::path& path) {
     std::error_code ec;
     return fs::is_regular_file(path, ec);
-}
-
-std::optional<std::string> ReadFile(const fs::path& path) {
-    std::ifstream in(path, std::ios::binary);
-    if (!in) {
-        return std::nullopt;
-    }
-    std::ostringstream content;
-    content << in.rdbuf();
-    if (in.bad()) {
-        return std::nullopt;
-    }
-    return std::move(content).str();
 }
 
 FileRead ReadRegularFile(const fs::path& path, std::uintmax_t maxBytes) {

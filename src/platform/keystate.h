@@ -24,7 +24,7 @@ public:
 
     // A descriptor that becomes readable when a key event arrives, so that an event loop can
     // sample on events instead of on a timer; -1 where the state can only be polled.
-    virtual int wakeDescriptor() const { return -1; }
+    virtual int WakeDescriptor() const { return -1; }
 };
 
 // The sampler of this session, or null where no global key state can be read (a Wayland session

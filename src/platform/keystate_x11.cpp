@@ -91,7 +91,7 @@ public:
 
     // With raw events every press and release arrives on the connection; without them the state
     // must be polled.
-    int wakeDescriptor() const override { return opcode_ < 0 ? -1 : ConnectionNumber(display_); }
+    int WakeDescriptor() const override { return opcode_ < 0 ? -1 : ConnectionNumber(display_); }
 
     KeySample Sample(int virtualKey) override {
         if (virtualKey < kVirtualKeyF1 || virtualKey > kVirtualKeyF12) {

@@ -17,7 +17,7 @@ public:
     // A descriptor that becomes readable when a command is waiting (for an event loop's notifier).
     // -1 where there is none: on Windows, or when no private runtime folder was available. Then
     // TakeCommand is polled from a timer (it returns nullopt at once when nothing waits).
-    virtual int commandDescriptor() const = 0;
+    virtual int CommandDescriptor() const = 0;
 
     // The next waiting command, or nullopt when none is waiting. Never blocks. Its sender
     // hears that it was taken.

@@ -184,7 +184,7 @@ public:
         }
     }
 
-    int commandDescriptor() const override { return listener_.get(); }
+    int CommandDescriptor() const override { return listener_.get(); }
 
     std::optional<std::string> TakeCommand() override {
         if (!listener_.valid()) {

@@ -59,7 +59,7 @@ public:
         }
     }
 
-    int commandDescriptor() const override { return -1; }
+    int CommandDescriptor() const override { return -1; }
 
     std::optional<std::string> TakeCommand() override {
         if (pipe_ == INVALID_HANDLE_VALUE) {

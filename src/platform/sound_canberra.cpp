@@ -32,25 +32,27 @@ bool PlayFile(ca_context* context, const std::filesystem::path& wav) {
 }
 
 // The desktop's default event sound from its sound theme; the first name the theme knows plays.
-void PlayDefaultSound(ca_context* context) {
+bool PlayDefaultSound(ca_context* context) {
     for (const char* id : {"bell", "dialog-information"}) {
         if (ca_context_play(context, 0, CA_PROP_EVENT_ID, id, CA_PROP_MEDIA_ROLE, "event",
                             nullptr) == CA_SUCCESS) {
-            return;
+            return true;
         }
     }
+    return false;
 }
 
 }  // namespace
 
-void PlaySoundAsync(const std::filesystem::path& wav) {
+SoundPlayed PlaySoundAsync(const std::filesystem::path& wav) {
     ca_context* context = SoundContext();
     if (context == nullptr) {
-        return;
+        return SoundPlayed::Nothing;
     }
-    if (!PlayFile(context, wav)) {
-        PlayDefaultSound(context);
+    if (PlayFile(context, wav)) {
+        return SoundPlayed::File;
     }
+    return PlayDefaultSound(context) ? SoundPlayed::DefaultSound : SoundPlayed::Nothing;
 }
 
 }  // namespace kickvane::platform

@@ -8,8 +8,13 @@
 
 namespace kickvane::platform {
 
-void PlaySoundAsync(const std::filesystem::path& wav) {
-    PlaySoundW(wav.c_str(), nullptr, SND_ASYNC | SND_FILENAME);
+SoundPlayed PlaySoundAsync(const std::filesystem::path& wav) {
+    // A file that exists but does not play is found out only after this returns; the system then
+    // plays its default sound by itself.
+    if (!PlaySoundW(wav.c_str(), nullptr, SND_ASYNC | SND_FILENAME)) {
+        return SoundPlayed::Nothing;
+    }
+    return SoundFileToPlay(wav) ? SoundPlayed::File : SoundPlayed::DefaultSound;
 }
 
 }  // namespace kickvane::platform

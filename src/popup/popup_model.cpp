@@ -12,8 +12,8 @@ constexpr int kLabelLeftPx = 5;
 constexpr int kStickyLabelTopPx = 5;
 constexpr int kTimedLabelTopPx = 10;
 constexpr int kLabelMarginPx = 10;  // label width = client width - this; auto-fit space below
-constexpr int kSlideStepSlot1 = 50;
-constexpr int kSlideStepHigherSlots = 100;
+constexpr double kSlideStepSlot1Points = 2.5;  // per tick
+constexpr double kSlideStepHigherSlotsPoints = 5;
 constexpr int kFadeStartPercent = 20;
 constexpr int kFadeStepPercent = 2;
 constexpr int kFadeEndPercent = 100;
@@ -31,8 +31,10 @@ int RoundToInt(double value) {
     return ClampToInt(RoundHalfEven(std::clamp(value, -kLimit, kLimit)));
 }
 
-double SaneTwipsPerPixel(double twips) {
-    return std::isfinite(twips) && twips > 0.0 ? twips : 15.0;
+constexpr double kPointsPerInch = 72;
+
+double SaneDotsPerInch(double dpi) {
+    return std::isfinite(dpi) && dpi > 0.0 ? dpi : 96.0;
 }
 
 }  // namespace
@@ -73,8 +75,8 @@ void PopupSlots::Release(int slot) {
 AlertPopupModel::AlertPopupModel(PopupEnvironment environment)
     : env_(std::move(environment)),
       slots_(env_.slotTable ? *env_.slotTable : PopupSlots::Shared()) {
-    env_.screen.twipsPerPixelX = SaneTwipsPerPixel(env_.screen.twipsPerPixelX);
-    env_.screen.twipsPerPixelY = SaneTwipsPerPixel(env_.screen.twipsPerPixelY);
+    env_.screen.dotsPerInchX = SaneDotsPerInch(env_.screen.dotsPerInchX);
+    env_.screen.dotsPerInchY = SaneDotsPerInch(env_.screen.dotsPerInchY);
 }
 
 AlertPopupModel::~AlertPopupModel() {
@@ -86,14 +88,13 @@ AlertPopupModel::~AlertPopupModel() {
 
 void AlertPopupModel::Initialise() {
     const ScreenMetrics& screen = env_.screen;
-    workBottomTwips_ = RoundToInt(screen.workAreaBottomPx * screen.twipsPerPixelY);
-    screenHeightTwips_ = RoundToInt(screen.screenHeightPx * screen.twipsPerPixelY);
-    const int workRightTwips = RoundToInt(screen.workAreaRightPx * screen.twipsPerPixelX);
+    workBottom_ = PointsFromPixelsY(screen.workAreaBottomPx);
+    screenHeight_ = PointsFromPixelsY(screen.screenHeightPx);
     // Just below the work area at its right-hand side.
-    leftTwips_ = ClampToInt(static_cast<long long>(workRightTwips) - kPopupInitialWidthTwips);
-    topTwips_ = workBottomTwips_;
-    widthTwips_ = kPopupInitialWidthTwips;
-    heightTwips_ = kPopupInitialHeightTwips;
+    left_ = PointsFromPixelsX(screen.workAreaRightPx) - kPopupInitialWidthPoints;
+    top_ = workBottom_;
+    width_ = kPopupInitialWidthPoints;
+    height_ = kPopupInitialHeightPoints;
     slot_ = slots_.Take();
     initialised_ = true;
 }
@@ -121,12 +122,11 @@ void AlertPopupModel::DisplayMessage(std::string_view message, int displaySecond
     label_.top = sticky_ ? kStickyLabelTopPx : kTimedLabelTopPx;
     label_.width = std::max(0, ClientWidthPx() - kLabelMarginPx);
     if (env_.labelHeight) {
-        // Bounded so that the auto-fit height stays a sane number of twips.
+        // Bounded so that the auto-fit height stays a sane size.
         constexpr int kMaxLabelHeightPx = 100000;
         label_.height = std::clamp(env_.labelHeight(label_.width, text_), 0, kMaxLabelHeightPx);
         if (slot_ == 1 && style.autoFit) {
-            heightTwips_ = RoundToInt((label_.top + label_.height + kLabelMarginPx) *
-                                      env_.screen.twipsPerPixelY);
+            height_ = PointsFromPixelsY(label_.top + label_.height + kLabelMarginPx);
         }
     } else {
         label_.height = std::max(0, ClientHeightPx() - label_.top - kLabelLeftPx);
@@ -135,12 +135,12 @@ void AlertPopupModel::DisplayMessage(std::string_view message, int displaySecond
     fadeMode_ = style.fade;
     fill_ = style.fill;
     if (fadeMode_) {
-        stepValue_ = kFadeStartPercent;
-        topTwips_ = std::max(RestingTop(), 0);
-        SetTransparency(stepValue_);
+        fadePercent_ = kFadeStartPercent;
+        top_ = std::max(RestingTop(), 0.0);
+        SetTransparency(fadePercent_);
         topmost_ = true;
     } else {
-        stepValue_ = slot_ > 1 ? kSlideStepHigherSlots : kSlideStepSlot1;
+        slideStep_ = slot_ > 1 ? kSlideStepHigherSlotsPoints : kSlideStepSlot1Points;
     }
     DrawFrame(style.square, style.backColour);
     shown_ = true;
@@ -159,14 +159,14 @@ void AlertPopupModel::Tick() {
 
 void AlertPopupModel::SlideTick() {
     if (ticksLeft_ > 0) {
-        const int resting = RestingTop();
-        const int stop = std::max(resting, 0);
-        if (topTwips_ > 0 && resting < topTwips_) {
+        const double resting = RestingTop();
+        const double stop = std::max(resting, 0.0);
+        if (top_ > 0 && resting < top_) {
             // Stops at the resting place instead of passing it and jumping back on arrival.
-            topTwips_ = std::max(topTwips_ - stepValue_, stop);
+            top_ = std::max(top_ - slideStep_, stop);
         } else {
             if (!arrived_) {
-                topTwips_ = stop;
+                top_ = stop;
                 arrived_ = true;
                 topmost_ = true;
             }
@@ -176,12 +176,12 @@ void AlertPopupModel::SlideTick() {
         }
         return;
     }
-    if (topTwips_ <= screenHeightTwips_) {
+    if (top_ <= screenHeight_) {
         if (arrived_) {
             arrived_ = false;
             topmost_ = false;
         }
-        topTwips_ = ClampToInt(static_cast<long long>(topTwips_) + stepValue_);
+        top_ += slideStep_;
     } else {
         Unload();
     }
@@ -189,19 +189,19 @@ void AlertPopupModel::SlideTick() {
 
 void AlertPopupModel::FadeTick() {
     if (ticksLeft_ > 0) {
-        if (stepValue_ > 0) {
-            stepValue_ -= kFadeStepPercent;
-            SetTransparency(stepValue_);
+        if (fadePercent_ > 0) {
+            fadePercent_ -= kFadeStepPercent;
+            SetTransparency(fadePercent_);
         } else if (!sticky_) {
             --ticksLeft_;
         }
         return;
     }
-    if (stepValue_ > kFadeEndPercent) {
+    if (fadePercent_ > kFadeEndPercent) {
         Unload();
     } else {
-        stepValue_ += kFadeStepPercent;
-        SetTransparency(stepValue_);
+        fadePercent_ += kFadeStepPercent;
+        SetTransparency(fadePercent_);
     }
 }
 
@@ -211,42 +211,48 @@ void AlertPopupModel::Click() {
     }
 }
 
-void AlertPopupModel::SetCloseActivate(bool value) {
-    if (value) {
-        ticksLeft_ = 0;
-    }
+void AlertPopupModel::Dismiss() {
+    ticksLeft_ = 0;
 }
 
 PopupPhase AlertPopupModel::Phase() const {
     if (!shown_) {
-        return PopupPhase::kHidden;
+        return PopupPhase::Hidden;
     }
     if (finished_) {
-        return PopupPhase::kFinished;
+        return PopupPhase::Finished;
     }
     if (ticksLeft_ <= 0) {
-        return PopupPhase::kLeaving;
+        return PopupPhase::Leaving;
     }
-    const bool atRest = fadeMode_ ? stepValue_ <= 0 : arrived_;
-    return atRest ? PopupPhase::kResting : PopupPhase::kArriving;
+    const bool atRest = fadeMode_ ? fadePercent_ <= 0 : arrived_;
+    return atRest ? PopupPhase::Resting : PopupPhase::Arriving;
 }
 
 PixelRect AlertPopupModel::WindowPixels() const {
-    return {RoundToInt(leftTwips_ / env_.screen.twipsPerPixelX),
-            RoundToInt(topTwips_ / env_.screen.twipsPerPixelY), ClientWidthPx(), ClientHeightPx()};
+    return {RoundToInt(left_ * env_.screen.dotsPerInchX / kPointsPerInch),
+            RoundToInt(top_ * env_.screen.dotsPerInchY / kPointsPerInch), ClientWidthPx(),
+            ClientHeightPx()};
 }
 
-int AlertPopupModel::RestingTop() const {
-    return ClampToInt(static_cast<long long>(workBottomTwips_) -
-                      static_cast<long long>(heightTwips_) * slot_);
+double AlertPopupModel::RestingTop() const {
+    return workBottom_ - height_ * slot_;
+}
+
+double AlertPopupModel::PointsFromPixelsX(double pixels) const {
+    return pixels * kPointsPerInch / env_.screen.dotsPerInchX;
+}
+
+double AlertPopupModel::PointsFromPixelsY(double pixels) const {
+    return pixels * kPointsPerInch / env_.screen.dotsPerInchY;
 }
 
 int AlertPopupModel::ClientWidthPx() const {
-    return RoundToInt(widthTwips_ / env_.screen.twipsPerPixelX);
+    return RoundToInt(width_ * env_.screen.dotsPerInchX / kPointsPerInch);
 }
 
 int AlertPopupModel::ClientHeightPx() const {
-    return RoundToInt(heightTwips_ / env_.screen.twipsPerPixelY);
+    return RoundToInt(height_ * env_.screen.dotsPerInchY / kPointsPerInch);
 }
 
 void AlertPopupModel::SetTransparency(int percent) {
@@ -281,7 +287,7 @@ void AlertPopupModel::DrawFrame(bool square, Colour backColour) {
             {0, 0, w - 1, h - 1, 20, 20, kButtonFaceColour},
             {1, 1, w - 2, h - 2, 18, 18, backColour},
         };
-        frame_.windowShape = RoundedRect{0, 0, w, h, 19, 19};
+        frame_.windowShape = RoundedRect{0, 0, w, h, 19, 19, {}};
     }
 }
 

@@ -11,27 +11,33 @@
 namespace kickvane::popup {
 
 // The alert popup as a model without a window or a timer: a window shows what the model says and
-// calls Tick() every kPopupTickInterval. Positions and sizes of the window are in twips (1/1440
-// inch); everything drawn inside it is in pixels.
+// calls Tick() every kPopupTickInterval. The window's place and size are kept in points (1/72
+// inch), so a popup has the same size and speed on screens of any density; everything drawn
+// inside it is in pixels.
 
 // The popup was timed on a timer that fired at the system timer's granularity; keeping that
 // interval keeps the length of a popup's life (DisplaySeconds × kPopupTicksPerSecond ticks).
 inline constexpr std::chrono::microseconds kPopupTickInterval{15625};
 inline constexpr int kPopupTicksPerSecond = 80;
 
-// Colours are 0x00BBGGRR; 0x80000000 + n is the system colour n.
-using Colour = std::uint32_t;
-inline constexpr Colour kButtonFaceColour = 0x8000000F;
-inline constexpr Colour kPopupBackgroundColour = 0x0000C000;  // RGB(0, 192, 0)
-inline constexpr Colour kPopupTextColour = 0x00FFFFFF;
+// A colour: an RGB value (0xRRGGBB), or the system's colour of a button's face, which the window
+// takes from its palette.
+struct Colour {
+    std::uint32_t rgb = 0;
+    bool buttonFace = false;
+    friend bool operator==(const Colour&, const Colour&) = default;
+};
+inline constexpr Colour kButtonFaceColour{0, true};
+inline constexpr Colour kPopupBackgroundColour{0x00C000};  // green
+inline constexpr Colour kPopupTextColour{0xFFFFFF};
 // The fill of a popup that reports failures: a dark red that white text reads well on (6.8:1),
 // and that is not taken for a confirmation.
-inline constexpr Colour kFailurePopupColour = 0x000000B0;  // RGB(176, 0, 0)
+inline constexpr Colour kFailurePopupColour{0xB00000};
 inline constexpr std::string_view kPopupCaption = "Alert";
 inline constexpr std::string_view kPopupFontFamily = "Tahoma";
 inline constexpr double kPopupFontPointSize = 9.75;
-inline constexpr int kPopupInitialWidthTwips = 2400;
-inline constexpr int kPopupInitialHeightTwips = 2000;
+inline constexpr double kPopupInitialWidthPoints = 120;
+inline constexpr double kPopupInitialHeightPoints = 100;
 // The first line of a popup that waits for a click.
 inline constexpr std::string_view kClickToCloseLine = "(click here to close)";
 
@@ -57,11 +63,11 @@ private:
 };
 
 struct ScreenMetrics {
-    int workAreaRightPx = 0;   // right edge of the desktop work area (exclusive), in pixels
-    int workAreaBottomPx = 0;  // bottom edge of the desktop work area (exclusive), in pixels
-    int screenHeightPx = 0;    // height of the whole screen, in pixels
-    double twipsPerPixelX = 15.0;
-    double twipsPerPixelY = 15.0;
+    int workAreaRightPx = 0;     // right edge of the desktop work area (exclusive), in pixels
+    int workAreaBottomPx = 0;    // bottom edge of the desktop work area (exclusive), in pixels
+    int screenHeightPx = 0;      // height of the whole screen, in pixels
+    double dotsPerInchX = 96.0;  // the screen's logical density
+    double dotsPerInchY = 96.0;
 };
 
 // The height in pixels that the label needs to show `text` (UTF-8) wrapped to `widthPx`.
@@ -91,7 +97,7 @@ struct FrameLine {
     int y1 = 0;
     int x2 = 0;
     int y2 = 0;
-    Colour colour = 0;
+    Colour colour;
     friend bool operator==(const FrameLine&, const FrameLine&) = default;
 };
 
@@ -104,7 +110,7 @@ struct RoundedRect {
     int bottom = 0;
     int ellipseWidth = 0;
     int ellipseHeight = 0;
-    Colour colour = 0;
+    Colour colour;
     friend bool operator==(const RoundedRect&, const RoundedRect&) = default;
 };
 
@@ -116,20 +122,20 @@ struct PopupFrame {
 };
 
 enum class PopupPhase {
-    kHidden,    // DisplayMessage not called yet
-    kArriving,  // rising (slide) or fading in (fade)
-    kResting,   // at its place, counting down unless sticky
-    kLeaving,   // sliding down or fading out
-    kFinished,  // unloaded: the window closes; the slot is free again
+    Hidden,    // DisplayMessage not called yet
+    Arriving,  // rising (slide) or fading in (fade)
+    Resting,   // at its place, counting down unless sticky
+    Leaving,   // sliding down or fading out
+    Finished,  // unloaded: the window closes; the slot is free again
 };
 
 // How a popup shows itself. The tool's own popups slide, fit their height to the text, and have
 // a square frame with a cream inner line.
 struct PopupStyle {
-    bool fade = false;               // fades in place instead of sliding
-    bool autoFit = true;             // fits the height to the text (in slot 1)
-    bool square = true;              // a two-line rectangular frame instead of rounded corners
-    Colour backColour = 0x00C0FFFF;  // the inner line or shape: RGB(255, 255, 192)
+    bool fade = false;                     // fades in place instead of sliding
+    bool autoFit = true;                   // fits the height to the text (in slot 1)
+    bool square = true;                    // a two-line rectangular frame instead of rounded corners
+    Colour backColour{0xFFFFC0};           // the inner line or shape: cream
     Colour fill = kPopupBackgroundColour;  // the background under the text
 };
 
@@ -148,26 +154,26 @@ public:
     AlertPopupModel& operator=(const AlertPopupModel&) = delete;
 
     // Shows `message` (UTF-8). displaySeconds >= 1: stays that many × 80 ticks after arriving;
-    // 0: stays until clicked; negative: stays until CloseActivate.
+    // 0: stays until clicked; negative: stays until dismissed.
     void DisplayMessage(std::string_view message, int displaySeconds, const PopupStyle& style = {});
 
     // One step of the motion; call every kPopupTickInterval while the popup is shown.
     void Tick();
     // A click on the window or its text: the popup leaves unless it ignores clicks.
     void Click();
-    // Setting true sends any popup away at the next tick; reading always gives false.
-    void SetCloseActivate(bool value);
-    bool CloseActivate() const { return false; }
+    // Sends the popup away at the next tick, even one that ignores clicks.
+    void Dismiss();
 
     PopupPhase Phase() const;
     bool Shown() const { return shown_; }
     bool Finished() const { return finished_; }
     int Slot() const { return slot_; }  // 0 until shown
 
-    int LeftTwips() const { return leftTwips_; }
-    int TopTwips() const { return topTwips_; }
-    int WidthTwips() const { return widthTwips_; }
-    int HeightTwips() const { return heightTwips_; }
+    // The window's place and size, in points.
+    double LeftPoints() const { return left_; }
+    double TopPoints() const { return top_; }
+    double WidthPoints() const { return width_; }
+    double HeightPoints() const { return height_; }
     PixelRect WindowPixels() const;
     // The label, in the window's client pixels.
     PixelRect LabelPixels() const { return label_; }
@@ -180,7 +186,9 @@ public:
 
 private:
     void Initialise();
-    int RestingTop() const;
+    double RestingTop() const;
+    double PointsFromPixelsX(double pixels) const;
+    double PointsFromPixelsY(double pixels) const;
     int ClientWidthPx() const;
     int ClientHeightPx() const;
     void SetTransparency(int percent);
@@ -192,14 +200,16 @@ private:
     PopupEnvironment env_;
     PopupSlots& slots_;
 
-    int leftTwips_ = 0;
-    int topTwips_ = 0;
-    int widthTwips_ = kPopupInitialWidthTwips;
-    int heightTwips_ = kPopupInitialHeightTwips;
-    int workBottomTwips_ = 0;
-    int screenHeightTwips_ = 0;
+    // In points.
+    double left_ = 0;
+    double top_ = 0;
+    double width_ = kPopupInitialWidthPoints;
+    double height_ = kPopupInitialHeightPoints;
+    double workBottom_ = 0;
+    double screenHeight_ = 0;
+    double slideStep_ = 0;
 
-    int stepValue_ = 0;
+    int fadePercent_ = 0;  // the window's transparency while fading
     int ticksLeft_ = 0;
     int slot_ = 0;
     bool initialised_ = false;

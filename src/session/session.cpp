@@ -1,6 +1,7 @@
 #include "session/session.h"
 
 #include "catalog/catalog.h"
+#include "catalog/ini.h"
 #include "platform/filesystem.h"
 #include "platform/text.h"
 #include "text/utf.h"
@@ -68,7 +69,7 @@ std::string_view SkipReasonText(catalog::SkipReason reason) {
 
 std::string SkippedLine(const catalog::AddedVariants& added, catalog::GroupId group) {
     std::string line;
-    if (added.folderState(group) == catalog::GroupFolderState::Unreadable) {
+    if (added.FolderState(group) == catalog::GroupFolderState::Unreadable) {
         line =
             "Không đọc được hết thư mục extras\\" + std::string(catalog::GroupFolder(group)) + ".";
     }
@@ -158,17 +159,17 @@ Session::Session(std::filesystem::path toolFolder, std::unique_ptr<platform::Key
     hotkeyValid_ = poll_.SetHotkey(settings_.hotkey);
 }
 
-void Session::setCategoryOn(int switchIndex, bool on) {
-    settings_.selection.setSwitchValue(switchIndex, on ? 1 : 0);
+void Session::SetCategoryOn(int switchIndex, bool on) {
+    settings_.selection.SetSwitchValue(switchIndex, on ? 1 : 0);
 }
 
-void Session::chooseOption(catalog::OptionArray array, int index) {
-    settings_.selection.setOptionValue(array, index, true);
+void Session::ChooseOption(catalog::OptionArray array, int index) {
+    settings_.selection.SetOptionValue(array, index, true);
 }
 
 void Session::ChooseAdded(catalog::GroupId group, std::string_view name) {
     if (added_.Find(group, name)) {
-        settings_.selection.setAddedValue(group, name, true);
+        settings_.selection.SetAddedValue(group, name, true);
     }
 }
 
@@ -176,7 +177,7 @@ Outcome Session::RefreshAddedVariants() {
     added_ = catalog::AddedVariants::List(toolFolder_);
     std::vector<catalog::GoneChoice> gone;
     for (const catalog::VariantGroup& group : catalog::Groups()) {
-        const std::string chosen(settings_.selection.chosenAdded(group.id));
+        const std::string chosen(settings_.selection.ChosenAdded(group.id));
         if (!chosen.empty() && !added_.Find(group.id, chosen)) {
             catalog::ChooseGroupDefault(settings_.selection, group.id);
             gone.push_back({group.id, chosen});
@@ -198,13 +199,13 @@ std::optional<text::Message> Session::TakeGoneNotice() {
     return notice;
 }
 
-void Session::setHotkeyText(std::string text) {
+void Session::SetHotkeyText(std::string text) {
     settings_.hotkey = std::move(text);
     hotkeyValid_ = poll_.SetHotkey(settings_.hotkey);
 }
 
-std::string Session::activeHotkey() const {
-    const std::optional<int> key = poll_.key();
+std::string Session::ActiveHotkey() const {
+    const std::optional<int> key = poll_.Key();
     if (!key) {
         return {};
     }
@@ -213,11 +214,11 @@ std::string Session::activeHotkey() const {
     return name;
 }
 
-std::string Session::hotkeyProblem() const {
+std::string Session::HotkeyProblem() const {
     if (hotkeyValid_) {
         return {};
     }
-    const std::string active = activeHotkey();
+    const std::string active = ActiveHotkey();
     return "\"" + settings_.hotkey + "\" không phải phím F1–F12: " +
            (active.empty() ? "phím tắt chưa hoạt động." : "vẫn dùng " + active + ".");
 }
@@ -233,7 +234,7 @@ std::optional<text::Message> Session::SettingsProblem() const {
     if (settingsRead_) {
         return std::nullopt;
     }
-    std::string why = text::Capitalised(text::FailureText(settingsRead_.failure(), shownFolders()));
+    std::string why = text::Capitalised(text::FailureText(settingsRead_.failure(), ShownFolders()));
     if (!why.ends_with('.')) {
         why += '.';
     }
@@ -259,7 +260,7 @@ ApplyRun Session::Apply() {
     run.shown.signalSound = run.apply.signalSound;
     const std::vector<engine::StepOutcome> failures = run.apply.Failures();
     if (!failures.empty()) {
-        const text::ShownFolders folders = shownFolders();
+        const text::ShownFolders folders = ShownFolders();
         std::string text = "Đã chép xong, nhưng ";
         text += std::to_string(failures.size());
         text += " bước không thành công:";
@@ -273,7 +274,7 @@ ApplyRun Session::Apply() {
     return run;
 }
 
-text::ShownFolders Session::shownFolders() const {
+text::ShownFolders Session::ShownFolders() const {
     if (platform::TrimBlanks(settings_.gameFolder).empty()) {
         return {{}, toolFolder_};  // no game folder: nothing is shown from it
     }
@@ -291,7 +292,7 @@ Outcome Session::Save() {
         shown.messages.push_back(
             {text::Message::Kind::Warning,
              "Không lưu được thiết lập!\n" + before +
-                 text::Capitalised(text::FailureText(failure, shownFolders())) + ".",
+                 text::Capitalised(text::FailureText(failure, ShownFolders())) + ".",
              std::string(kNoticeTitle)});
         return shown;
     };
@@ -332,6 +333,26 @@ LaunchRun Session::Launch(LaunchFrom from) {
     return run;
 }
 
+std::optional<std::string> RunStatusLine(const ApplyRun& run, ClockTime at) {
+    if (run.refused) {
+        return std::nullopt;
+    }
+    return engine::RunSummary(run.apply, at);
+}
+
+GameSearch Session::GameSearchCommand() const {
+    return [folders = searchFolders_.value_or(game::UserFolders::FromEnvironment())](
+               const std::atomic<bool>& cancel) {
+        return game::FindGame(folders, game::SearchLimits{}, &cancel);
+    };
+}
+
+Status Session::RecordNewVersion(std::string version) {
+    updates_.versionText = std::move(version);
+    return catalog::WriteIni(catalog::SettingsFile(toolFolder_), "KiemTra", "PhienBan",
+                             updates_.versionText);
+}
+
 QuickLoadRun Session::QuickLoad(std::optional<std::filesystem::path> chosen) {
     if (chosen) {
         quickLoadFolder_ = std::move(*chosen);
@@ -347,7 +368,7 @@ QuickLoadRun Session::QuickLoad(std::optional<std::filesystem::path> chosen) {
         std::string text = "Một số file không chép được:";
         for (const engine::QuickLoadFailure& failure : run.load.failures) {
             text += "\n• " + failure.pattern + ": " +
-                    text::FailureText(failure.failure, shownFolders());
+                    text::FailureText(failure.failure, ShownFolders());
         }
         run.shown.messages.push_back(Notice(std::move(text)));
     }

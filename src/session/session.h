@@ -1,5 +1,7 @@
 #pragma once
 
+#include <atomic>
+#include <chrono>
 #include <filesystem>
 #include <functional>
 #include <memory>
@@ -14,6 +16,8 @@
 #include "engine/hotkey_poll.h"
 #include "engine/plan.h"
 #include "engine/quick_load.h"
+#include "engine/run_summary.h"
+#include "game/find_game.h"
 #include "game/launcher.h"
 #include "text/failure_text.h"
 #include "text/message.h"
@@ -36,6 +40,9 @@ inline constexpr std::string_view kHiddenPopupText = "Ẩn xuống khay hệ th�
 inline constexpr std::string_view kNoTrayPopupText = "Không có khay hệ thống: đã thu nhỏ cửa sổ!";
 inline constexpr std::string_view kSkinChangedPopupText = "Đã thay đổi giao diện!";
 inline constexpr std::string_view kQuickLoadDonePopupText = "Hoàn tất!";
+
+// How often the user interface runs one tick of the hotkey poll.
+inline constexpr std::chrono::milliseconds kHotkeyPollInterval = engine::HotkeyPoll::kInterval;
 
 struct Popup {
     std::string text;
@@ -87,6 +94,21 @@ struct QuickLoadRun {
 
 using Launcher = std::function<game::LaunchOutcome(std::string_view gameFolder)>;
 
+// A time of day on the user's clock.
+using ClockTime = engine::ClockTime;
+
+// One line for places without room for more (the tray icon's tooltip): when the run was, how many
+// sets it copied and how many steps failed, or why it stopped. Nothing for a run that was
+// refused, which copied nothing and tells the user so itself.
+std::optional<std::string> RunStatusLine(const ApplyRun& run, ClockTime at);
+
+// The game search's answer: the folders that hold the launcher, where it looked, what it skipped.
+using GameSearchOutcome = game::FindOutcome;
+using FoundGame = game::FoundGame;
+// The game search as a command that owns what it needs, so it can run on another thread;
+// setting `cancel` ends it early.
+using GameSearch = std::function<GameSearchOutcome(const std::atomic<bool>& cancel)>;
+
 class Session {
 public:
     // Loads the settings of `toolFolder`. `keys` samples the global key state for the hotkey;
@@ -95,23 +117,23 @@ public:
                      std::unique_ptr<platform::KeySampler> keys = nullptr,
                      Launcher launch = game::LaunchGame);
 
-    const std::filesystem::path& toolFolder() const { return toolFolder_; }
-    const catalog::Settings& settings() const { return settings_; }
+    const std::filesystem::path& ToolFolder() const { return toolFolder_; }
+    const catalog::Settings& Settings() const { return settings_; }
     // Ok when the settings file was read, or is missing or empty (the defaults apply).
-    const Status& settingsRead() const { return settingsRead_; }
+    const Status& SettingsRead() const { return settingsRead_; }
     // For the user, when the settings file could not be read: why, and that the defaults show.
     std::optional<text::Message> SettingsProblem() const;
-    const catalog::PatchSelection& selection() const { return settings_.selection; }
-    bool hasGlobalKeys() const { return keys_ != nullptr; }
+    const catalog::PatchSelection& Selection() const { return settings_.selection; }
+    bool HasGlobalKeys() const { return keys_ != nullptr; }
 
-    void setGameFolder(std::string folder) { settings_.gameFolder = std::move(folder); }
+    void SetGameFolder(std::string folder) { settings_.gameFolder = std::move(folder); }
     // A ticked box is on (1), a cleared one off (0); a stored value other than these is lost.
-    void setCategoryOn(int switchIndex, bool on);
+    void SetCategoryOn(int switchIndex, bool on);
     // Chooses a variant; the others of its group are cleared.
-    void chooseOption(catalog::OptionArray array, int index);
+    void ChooseOption(catalog::OptionArray array, int index);
 
     // The variants the player added to the groups' folders, as listed at start or last refresh.
-    const catalog::AddedVariants& addedVariants() const { return added_; }
+    const catalog::AddedVariants& AddedVariants() const { return added_; }
     // Chooses an added variant of the group; a name that is not listed changes nothing.
     void ChooseAdded(catalog::GroupId group, std::string_view name);
     // Lists the groups' folders again (the window calls it when it comes back from the tray).
@@ -123,21 +145,21 @@ public:
     std::optional<text::Message> TakeGoneNotice();
 
     // Takes the hotkey text as typed; it is saved as it stands. A text that names no key keeps
-    // the key in use as it was; hotkeyValid() says so.
-    void setHotkeyText(std::string text);
-    bool hotkeyValid() const { return hotkeyValid_; }
+    // the key in use as it was; HotkeyValid() says so.
+    void SetHotkeyText(std::string text);
+    bool HotkeyValid() const { return hotkeyValid_; }
     // The name of the key the poll reacts to ("F7"); empty when none.
-    std::string activeHotkey() const;
+    std::string ActiveHotkey() const;
     // For the user, when the hotkey text names no key: what is wrong and which key is in use.
     // Empty when the text names a key.
-    std::string hotkeyProblem() const;
+    std::string HotkeyProblem() const;
 
     // One tick of the hotkey poll: applies the patches when the key was pressed.
     std::optional<ApplyRun> PollHotkey();
     // When to tick: on every readable event of the descriptor (-1: none), and on the poll's
     // interval while HotkeyNeedsTicks() says so.
-    int HotkeyWakeDescriptor() const { return poll_.wakeDescriptor(); }
-    bool HotkeyNeedsTicks() const { return poll_.needsTicks(); }
+    int HotkeyWakeDescriptor() const { return poll_.WakeDescriptor(); }
+    bool HotkeyNeedsTicks() const { return poll_.NeedsTicks(); }
 
     ApplyRun Apply();
     std::vector<engine::PlanStep> Plan() const;
@@ -148,13 +170,25 @@ public:
     LaunchRun Launch(LaunchFrom from);
     // Loads from `chosen`, or from the folder chosen last time when the user picked none.
     QuickLoadRun QuickLoad(std::optional<std::filesystem::path> chosen);
-    const std::filesystem::path& quickLoadFolder() const { return quickLoadFolder_; }
+    const std::filesystem::path& QuickLoadFolder() const { return quickLoadFolder_; }
 
-    UpdateState& updates() { return updates_; }
-    const UpdateState& updates() const { return updates_; }
+    // Looks for the game's launcher in the Wine prefixes and game managers' folders of the user
+    // (of the folders set with SetGameSearchFolders: tests use homes of their own).
+    GameSearch GameSearchCommand() const;
+    void SetGameSearchFolders(game::UserFolders folders) { searchFolders_ = std::move(folders); }
+
+    const UpdateState& Updates() const { return updates_; }
+    // The update host has a version other than this one: keeps it and records it in the settings
+    // file ("KiemTra", "PhienBan"; line breaks dropped). Nothing reads the key back, so a failed
+    // write is only returned.
+    Status RecordNewVersion(std::string version);
+    // Keeps the version text that the update host gave, as fetched.
+    void KeepVersion(std::string version) { updates_.versionText = std::move(version); }
+    // Keeps the download link that the update host gave, as fetched.
+    void RecordDownloadLink(std::string link) { updates_.downloadLink = std::move(link); }
 
     // The game folder of the settings and the tool folder, which failures name paths from.
-    text::ShownFolders shownFolders() const;
+    text::ShownFolders ShownFolders() const;
 
 private:
     std::filesystem::path toolFolder_;
@@ -168,6 +202,7 @@ private:
     Launcher launch_;
     std::filesystem::path quickLoadFolder_;
     UpdateState updates_;
+    std::optional<game::UserFolders> searchFolders_;
 };
 
 // The line under a group that names the folders of its added variants that were passed over and

@@ -14,45 +14,41 @@ namespace kickvane::shell {
 
 namespace {
 
-QColor ToQColor(popup::Colour colour, const QPalette& palette) {
-    if (colour == popup::kButtonFaceColour) {
-        return palette.color(QPalette::Button);
-    }
-    return QColor(static_cast<int>(colour & 0xFF), static_cast<int>((colour >> 8) & 0xFF),
-                  static_cast<int>((colour >> 16) & 0xFF));
+QColor toQColor(popup::Colour colour, const QPalette& palette) {
+    return colour.buttonFace ? palette.color(QPalette::Button) : QColor::fromRgb(colour.rgb);
 }
 
-QFont PopupFont() {
-    QFont font(ToQString(popup::kPopupFontFamily));
+QFont popupFont() {
+    QFont font(toQString(popup::kPopupFontFamily));
     font.setPointSizeF(popup::kPopupFontPointSize);
     return font;
 }
 
-QString DisplayText(const std::string& text) {
-    QString shown = ToQString(text);
+QString displayText(const std::string& text) {
+    QString shown = toQString(text);
     shown.replace(QStringLiteral("\r\n"), QStringLiteral("\n"));
     return shown;
 }
 
 }  // namespace
 
-popup::PopupEnvironment AlertPopup::ScreenEnvironment() {
+popup::PopupEnvironment AlertPopup::screenEnvironment() {
     popup::PopupEnvironment environment;
     if (QScreen* screen = QGuiApplication::primaryScreen()) {
         const QRect work = screen->availableGeometry();
         environment.screen.workAreaRightPx = work.x() + work.width();
         environment.screen.workAreaBottomPx = work.y() + work.height();
         environment.screen.screenHeightPx = screen->geometry().height();
-        environment.screen.twipsPerPixelX = 1440.0 / screen->logicalDotsPerInchX();
-        environment.screen.twipsPerPixelY = 1440.0 / screen->logicalDotsPerInchY();
+        environment.screen.dotsPerInchX = screen->logicalDotsPerInchX();
+        environment.screen.dotsPerInchY = screen->logicalDotsPerInchY();
     }
     environment.translucencySupported =
         QGuiApplication::platformName() != QLatin1String("offscreen");
     environment.labelHeight = [](int widthPx, std::string_view text) {
-        const QFontMetrics metrics(PopupFont());
+        const QFontMetrics metrics(popupFont());
         return metrics
             .boundingRect(QRect(0, 0, widthPx, 100000), Qt::TextWordWrap,
-                          DisplayText(std::string(text)))
+                          displayText(std::string(text)))
             .height();
     };
     return environment;
@@ -64,23 +60,23 @@ AlertPopup::AlertPopup(popup::PopupEnvironment environment)
       model_(std::move(environment)) {
     setAttribute(Qt::WA_DeleteOnClose);
     setAttribute(Qt::WA_ShowWithoutActivating);
-    setWindowTitle(ToQString(popup::kPopupCaption));
-    setFont(PopupFont());
+    setWindowTitle(toQString(popup::kPopupCaption));
+    setFont(popupFont());
     timer_.setTimerType(Qt::PreciseTimer);
     timer_.setInterval(
         std::chrono::duration_cast<std::chrono::milliseconds>(popup::kPopupTickInterval));
-    connect(&timer_, &QTimer::timeout, this, &AlertPopup::CatchUp);
+    connect(&timer_, &QTimer::timeout, this, &AlertPopup::catchUp);
 }
 
-AlertPopup* AlertPopup::Show(const QString& text, int displaySeconds) {
-    auto* popup = new AlertPopup(ScreenEnvironment());
-    popup->DisplayMessage(text, displaySeconds);
+AlertPopup* AlertPopup::open(const QString& text, int displaySeconds) {
+    auto* popup = new AlertPopup(screenEnvironment());
+    popup->displayMessage(text, displaySeconds);
     return popup;
 }
 
-void AlertPopup::DisplayMessage(const QString& text, int displaySeconds,
+void AlertPopup::displayMessage(const QString& text, int displaySeconds,
                                 const popup::PopupStyle& style) {
-    model_.DisplayMessage(ToUtf8(text), displaySeconds, style);
+    model_.DisplayMessage(toUtf8(text), displaySeconds, style);
     if (const auto& shape = model_.Frame().windowShape) {
         QPainterPath path;
         path.addRoundedRect(
@@ -88,34 +84,34 @@ void AlertPopup::DisplayMessage(const QString& text, int displaySeconds,
             shape->ellipseWidth / 2.0, shape->ellipseHeight / 2.0);
         setMask(QRegion(path.toFillPolygon().toPolygon()));
     }
-    Follow();
+    follow();
     show();
     clock_.start();
     ticksRun_ = 0;
     timer_.start();
 }
 
-void AlertPopup::CatchUp() {
+void AlertPopup::catchUp() {
     const qint64 due =
         clock_.nsecsElapsed() /
         std::chrono::duration_cast<std::chrono::nanoseconds>(popup::kPopupTickInterval).count();
     while (ticksRun_ < due && !model_.Finished()) {
         ++ticksRun_;
-        Tick();
+        tick();
     }
 }
 
-void AlertPopup::Tick() {
+void AlertPopup::tick() {
     model_.Tick();
     if (model_.Finished()) {
         timer_.stop();
         close();
         return;
     }
-    Follow();
+    follow();
 }
 
-void AlertPopup::Follow() {
+void AlertPopup::follow() {
     const popup::PixelRect rect = model_.WindowPixels();
     setGeometry(rect.left, rect.top, rect.width, rect.height);
     if (const auto alpha = model_.Alpha()) {
@@ -125,24 +121,24 @@ void AlertPopup::Follow() {
 
 void AlertPopup::paintEvent(QPaintEvent*) {
     QPainter painter(this);
-    painter.fillRect(rect(), ToQColor(model_.Fill(), palette()));
+    painter.fillRect(rect(), toQColor(model_.Fill(), palette()));
     const popup::PopupFrame& frame = model_.Frame();
     for (const popup::RoundedRect& shape : frame.shapes) {
-        painter.setPen(ToQColor(shape.colour, palette()));
+        painter.setPen(toQColor(shape.colour, palette()));
         painter.setBrush(Qt::NoBrush);
         painter.drawRoundedRect(
             QRect(QPoint(shape.left, shape.top), QPoint(shape.right, shape.bottom)),
             shape.ellipseWidth / 2.0, shape.ellipseHeight / 2.0);
     }
     for (const popup::FrameLine& line : frame.lines) {
-        painter.setPen(ToQColor(line.colour, palette()));
+        painter.setPen(toQColor(line.colour, palette()));
         painter.drawLine(line.x1, line.y1, line.x2, line.y2);
     }
     const popup::PixelRect label = model_.LabelPixels();
-    painter.setPen(ToQColor(popup::kPopupTextColour, palette()));
-    painter.setFont(PopupFont());
+    painter.setPen(toQColor(popup::kPopupTextColour, palette()));
+    painter.setFont(popupFont());
     painter.drawText(QRect(label.left, label.top, label.width, label.height),
-                     Qt::TextWordWrap | Qt::AlignLeft | Qt::AlignTop, DisplayText(model_.Text()));
+                     Qt::TextWordWrap | Qt::AlignLeft | Qt::AlignTop, displayText(model_.Text()));
 }
 
 void AlertPopup::mousePressEvent(QMouseEvent*) {

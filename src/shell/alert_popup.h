@@ -16,17 +16,17 @@ public:
     explicit AlertPopup(popup::PopupEnvironment environment);
 
     // Opens a popup the way the tool's callers do: timed, sliding, fitted, square frame.
-    static AlertPopup* Show(const QString& text, int displaySeconds);
+    static AlertPopup* open(const QString& text, int displaySeconds);
 
-    void DisplayMessage(const QString& text, int displaySeconds,
+    void displayMessage(const QString& text, int displaySeconds,
                         const popup::PopupStyle& style = {});
 
     const popup::AlertPopupModel& model() const { return model_; }
     // One tick of the motion; the timer calls it, tests may too.
-    void Tick();
+    void tick();
 
     // The screen and text measures the model needs, from the primary screen and the popup font.
-    static popup::PopupEnvironment ScreenEnvironment();
+    static popup::PopupEnvironment screenEnvironment();
 
 signals:
     // The player clicked the popup (it leaves then, unless it ignores clicks).
@@ -37,10 +37,10 @@ protected:
     void mousePressEvent(QMouseEvent* event) override;
 
 private:
-    void Follow();
+    void follow();
     // Runs the ticks that are due by the clock, so the popup's life does not depend on how
     // exactly the system timer fires.
-    void CatchUp();
+    void catchUp();
 
     popup::AlertPopupModel model_;
     QTimer timer_;

@@ -4,9 +4,8 @@
 #include <QScrollBar>
 
 #include "platform/text.h"
-#include "shell/game_finder.h"
 #include "shell/qt_text.h"
-#include "shell/skins.h"
+#include "shell/skin_look.h"
 
 namespace kickvane::shell {
 
@@ -25,15 +24,15 @@ constexpr int kRightLabelWidth = 134;
 const std::array<QString, kTabCount> kTabCaptions{QStringLiteral("Chung"), QStringLiteral("Bóng"),
                                                   QStringLiteral("Tỉ số"), QStringLiteral("Khác")};
 
-ClickableLabel* MakeLabel(std::string_view text, QWidget* parent, const QRect& geometry) {
-    auto* label = new ClickableLabel(ToQString(text), parent);
+ClickableLabel* makeLabel(std::string_view text, QWidget* parent, const QRect& geometry) {
+    auto* label = new ClickableLabel(toQString(text), parent);
     label->setGeometry(geometry);
     label->setCursor(Qt::PointingHandCursor);
-    Paint(label, kLabelBackground);
+    paint(label, kLabelBackground);
     return label;
 }
 
-QLabel* MakeHeading(const QString& text, QWidget* parent, const QPoint& at) {
+QLabel* makeHeading(const QString& text, QWidget* parent, const QPoint& at) {
     auto* heading = new QLabel(text, parent);
     QFont font = heading->font();
     font.setBold(true);
@@ -43,16 +42,16 @@ QLabel* MakeHeading(const QString& text, QWidget* parent, const QPoint& at) {
     return heading;
 }
 
-QRadioButton* MakeOptionButton(QWidget* parent, const QRect& geometry) {
+QRadioButton* makeOptionButton(QWidget* parent, const QRect& geometry) {
     auto* button = new QRadioButton(parent);
     button->setAutoExclusive(false);
     button->setGeometry(geometry);
-    Paint(button, kEntryBackground);
+    paint(button, kEntryBackground);
     return button;
 }
 
 // Keeps a widget's own background off, so the panel's picture shows through.
-void SeeThrough(QWidget* widget) {
+void seeThrough(QWidget* widget) {
     widget->setAutoFillBackground(false);
 }
 
@@ -81,9 +80,9 @@ CatalogPanels::CatalogPanels(QWidget* window)
     }
     tabHeight_ = tabs_[0]->height();
     buildCategoryPanel(panels_[0]);
-    MakeHeading(QStringLiteral("Chọn quả bóng:"), panels_[1], {12, 10});
+    makeHeading(QStringLiteral("Chọn quả bóng:"), panels_[1], {12, 10});
     buildGroupPanel(panels_[1], GroupId::Ball, kPanelRowsTop + 4);
-    MakeHeading(QStringLiteral("Chọn bảng tỉ số:"), panels_[2], {12, 10});
+    makeHeading(QStringLiteral("Chọn bảng tỉ số:"), panels_[2], {12, 10});
     buildGroupPanel(panels_[2], GroupId::Scoreboard, kPanelRowsTop + 4);
     buildVariantFrames(panels_[3]);
 }
@@ -98,7 +97,6 @@ void CatalogPanels::buildCategoryPanel(QWidget* panel) {
     browse_ = new QPushButton(QStringLiteral("Đổ&i thư mục"), panel);
     browse_->setGeometry(226, 27, 86, 27);
     connect(browse_, &QPushButton::clicked, this, &CatalogPanels::browseRequested);
-    AddGameFinder(gameFolder_, browse_);
 
     for (const catalog::PatchCategory& category : catalog::Categories()) {
         const int i = category.switchIndex;
@@ -106,8 +104,8 @@ void CatalogPanels::buildCategoryPanel(QWidget* panel) {
         const int y = 68 + (i % 7) * 40;
         auto* check = new QCheckBox(panel);
         check->setGeometry(x, y + 2, 20, 20);
-        check->setAccessibleName(ToQString(platform::TrimBlanks(category.label)));
-        Paint(check, kEntryBackground);
+        check->setAccessibleName(toQString(platform::TrimBlanks(category.label)));
+        paint(check, kEntryBackground);
         connect(check, &QCheckBox::clicked, this, [this, check, i](bool checked) {
             check->setTristate(false);
             emit categoryToggled(i, checked);
@@ -118,7 +116,7 @@ void CatalogPanels::buildCategoryPanel(QWidget* panel) {
         // hand (Tahoma, Segoe UI, a wider stand-in) wraps between its words instead of losing
         // its end, in a taller box centred on its check box.
         const int width = i < 7 ? kLeftLabelWidth : kRightLabelWidth;
-        auto* label = MakeLabel(category.label, panel, QRect(x + 22, y, width, 24));
+        auto* label = makeLabel(category.label, panel, QRect(x + 22, y, width, 24));
         label->setWordWrap(true);
         if (label->fontMetrics().horizontalAdvance(label->text()) > label->contentsRect().width()) {
             label->setGeometry(x + 22, y - 6, width, 36);
@@ -149,8 +147,8 @@ void CatalogPanels::buildGroupPanel(QWidget* panel, GroupId id, int top) {
     GroupView& view = makeGroupView(id, panel, room, {20, 2, 20, 44, 0, 250, 24, 36});
     for (const catalog::PatchOption& option : group.options) {
         const int row = view.catalogRows++;
-        addOption(group, option, MakeOptionButton(view.rows, rowButton(view, row)),
-                  MakeLabel(option.label, view.rows, rowLabel(view, row)));
+        addOption(group, option, makeOptionButton(view.rows, rowButton(view, row)),
+                  makeLabel(option.label, view.rows, rowLabel(view, row)));
     }
     fitRows(view);
 }
@@ -166,11 +164,11 @@ CatalogPanels::GroupView& CatalogPanels::makeGroupView(GroupId id, QWidget* pare
     view.area->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
     view.area->setVerticalScrollBarPolicy(Qt::ScrollBarAsNeeded);
     view.area->setFocusPolicy(Qt::NoFocus);
-    SeeThrough(view.area);
-    SeeThrough(view.area->viewport());
+    seeThrough(view.area);
+    seeThrough(view.area->viewport());
     view.rows = new QWidget;
     view.area->setWidget(view.rows);
-    SeeThrough(view.rows);  // after setWidget, which turns the filling on
+    seeThrough(view.rows);  // after setWidget, which turns the filling on
     view.skipped = new QLabel(parent);
     view.skipped->setTextFormat(Qt::PlainText);
     view.skipped->setGeometry(room.left() + 8, room.bottom() + 1 - kSkippedLineHeight,
@@ -220,14 +218,14 @@ void CatalogPanels::buildVariantFrames(QWidget* panel) {
         frame->setGeometry(frames[f].rect);
         frame->setBackground(kEntryBackground);
         groupFrames_[f] = frame;
-        MakeHeading(frames[f].caption, frame, {8, 4});
+        makeHeading(frames[f].caption, frame, {8, 4});
         const catalog::VariantGroup& group = catalog::Group(frames[f].group);
         const QRect room(0, kFrameRowsTop, frame->width(), frame->height() - kFrameRowsTop);
         GroupView& view = makeGroupView(group.id, frame, room, {10, 0, 18, 32, -1, 200, 19, 20});
         for (const catalog::PatchOption& option : group.options) {
             const int row = view.catalogRows++;
-            addOption(group, option, MakeOptionButton(view.rows, rowButton(view, row)),
-                      MakeLabel(option.label, view.rows, rowLabel(view, row)));
+            addOption(group, option, makeOptionButton(view.rows, rowButton(view, row)),
+                      makeLabel(option.label, view.rows, rowLabel(view, row)));
         }
         fitRows(view);
     }
@@ -280,7 +278,7 @@ void CatalogPanels::selectTab(int index) {
 
 void CatalogPanels::recolour(const SkinLook& look) {
     const auto paintIndicator = [&look](QWidget* entry) {
-        Paint(entry, look.entryBackground);
+        paint(entry, look.entryBackground);
         QPalette palette = entry->palette();
         palette.setColor(QPalette::Base, look.indicatorBase);
         palette.setColor(QPalette::Text, look.indicatorMark);
@@ -288,11 +286,11 @@ void CatalogPanels::recolour(const SkinLook& look) {
     };
     for (size_t i = 0; i < checks_.size(); ++i) {
         paintIndicator(checks_[i]);
-        Paint(categoryLabels_[i], look.labelBackground, look.labelText);
+        paint(categoryLabels_[i], look.labelBackground, look.labelText);
     }
     for (const OptionWidgets& option : options_) {
         paintIndicator(option.button);
-        Paint(option.label, look.labelBackground, look.labelText);
+        paint(option.label, look.labelBackground, look.labelText);
     }
     for (PictureBox* frame : groupFrames_) {
         frame->setBackground(look.entryBackground);
@@ -321,7 +319,7 @@ void CatalogPanels::recolour(const SkinLook& look) {
 void CatalogPanels::showSelection(const catalog::PatchSelection& selection) {
     for (const catalog::PatchCategory& category : catalog::Categories()) {
         QCheckBox* check = checks_[static_cast<size_t>(category.switchIndex)];
-        const int value = selection.switchValue(category.switchIndex);
+        const int value = selection.SwitchValue(category.switchIndex);
         // A stored value other than 0 and 1 shows as greyed; only 1 counts as on.
         check->setTristate(value != 0 && value != 1);
         check->setCheckState(value == 0   ? Qt::Unchecked
@@ -329,18 +327,18 @@ void CatalogPanels::showSelection(const catalog::PatchSelection& selection) {
                                           : Qt::PartiallyChecked);
     }
     for (const OptionWidgets& option : options_) {
-        option.button->setChecked(selection.optionValue(option.array, option.index));
+        option.button->setChecked(selection.OptionValue(option.array, option.index));
     }
     for (const catalog::VariantGroup& group : catalog::Groups()) {
         for (const AddedWidgets& added : groupViews_[static_cast<size_t>(group.id)].added) {
-            added.button->setChecked(selection.addedValue(group.id, added.name));
+            added.button->setChecked(selection.AddedValue(group.id, added.name));
         }
     }
 }
 
 void CatalogPanels::paintAdded(const AddedWidgets& widgets) const {
-    Paint(widgets.button, entryColour_);
-    Paint(widgets.label, labelColour_, labelTextColour_);
+    paint(widgets.button, entryColour_);
+    paint(widgets.label, labelColour_, labelTextColour_);
 }
 
 void CatalogPanels::showAddedVariants(
@@ -360,10 +358,10 @@ void CatalogPanels::showAddedVariants(
         QWidget* previous = lastListed ? lastListed->label : nullptr;
         for (const catalog::AddedVariant& variant : added.Of(id)) {
             // The folder's name is outside text: shown as it is, never read as markup.
-            auto* label = MakeLabel(variant.name, view.rows, rowLabel(view, row));
+            auto* label = makeLabel(variant.name, view.rows, rowLabel(view, row));
             label->setTextFormat(Qt::PlainText);
             label->setToolTip(label->text());
-            auto* button = MakeOptionButton(view.rows, rowButton(view, row));
+            auto* button = makeOptionButton(view.rows, rowButton(view, row));
             button->setAccessibleName(label->text());
             const std::string name = variant.name;
             connect(button, &QRadioButton::clicked, this,
@@ -396,7 +394,7 @@ void CatalogPanels::showAddedVariants(
 
 QRadioButton* CatalogPanels::addedButton(GroupId group, const QString& name) const {
     for (const AddedWidgets& added : groupViews_[static_cast<size_t>(group)].added) {
-        if (ToQString(added.name) == name) {
+        if (toQString(added.name) == name) {
             return added.button;
         }
     }
@@ -405,7 +403,7 @@ QRadioButton* CatalogPanels::addedButton(GroupId group, const QString& name) con
 
 ClickableLabel* CatalogPanels::addedLabel(GroupId group, const QString& name) const {
     for (const AddedWidgets& added : groupViews_[static_cast<size_t>(group)].added) {
-        if (ToQString(added.name) == name) {
+        if (toQString(added.name) == name) {
             return added.label;
         }
     }

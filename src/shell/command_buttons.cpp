@@ -1,6 +1,6 @@
 #include "shell/command_buttons.h"
 
-#include "shell/skins.h"
+#include "shell/skin_look.h"
 
 namespace kickvane::shell {
 
@@ -9,7 +9,7 @@ namespace {
 constexpr int kSmallLeft = 9;
 constexpr int kSmallWidth = 82;
 
-QPushButton* MakeButton(const QString& caption, QWidget* parent, const QRect& geometry) {
+QPushButton* makeButton(const QString& caption, QWidget* parent, const QRect& geometry) {
     auto* button = new QPushButton(caption, parent);
     button->setGeometry(geometry);
     return button;
@@ -34,25 +34,25 @@ CommandButtons::CommandButtons(QWidget* window) : QObject(window) {
     hotkeyProblem_->setGeometry(9, 408, 410, 30);
     hotkeyProblem_->setWordWrap(true);
     hotkeyProblem_->setMargin(2);
-    paintNote(LightSkin());
+    paintNote(lightSkin());
     hotkeyProblem_->setTextFormat(Qt::PlainText);  // it quotes the text from the settings file
     hotkeyProblem_->hide();
 
-    save_ = MakeButton(QStringLiteral("&Lưu thiết lập"), window, {130, 442, 92, 30});
-    launch_ = MakeButton(QStringLiteral("Khởi động &FIFA"), window, {226, 442, 104, 30});
-    quickLoad_ = MakeButton(QStringLiteral("&Nạp nhanh"), window, {334, 442, 84, 30});
+    save_ = makeButton(QStringLiteral("&Lưu thiết lập"), window, {130, 442, 92, 30});
+    launch_ = makeButton(QStringLiteral("Khởi động &FIFA"), window, {226, 442, 104, 30});
+    quickLoad_ = makeButton(QStringLiteral("&Nạp nhanh"), window, {334, 442, 84, 30});
 
-    runHidden_ = MakeButton(QStringLiteral("&Chạy ẩn"), window, {kSmallLeft, 262, kSmallWidth, 26});
-    info_ = MakeButton(QStringLiteral("&Thông tin"), window, {kSmallLeft, 292, kSmallWidth, 26});
-    help_ = MakeButton(QStringLiteral("&Hướng dẫn"), window, {kSmallLeft, 322, kSmallWidth, 26});
-    translucent_ = MakeButton(QStringLiteral("T&rans"), window, {kSmallLeft, 352, kSmallWidth, 26});
+    runHidden_ = makeButton(QStringLiteral("&Chạy ẩn"), window, {kSmallLeft, 262, kSmallWidth, 26});
+    info_ = makeButton(QStringLiteral("&Thông tin"), window, {kSmallLeft, 292, kSmallWidth, 26});
+    help_ = makeButton(QStringLiteral("&Hướng dẫn"), window, {kSmallLeft, 322, kSmallWidth, 26});
+    translucent_ = makeButton(QStringLiteral("T&rans"), window, {kSmallLeft, 352, kSmallWidth, 26});
 
     // The header's right end, clear of the banner's title and version on the left.
-    checkUpdate_ = MakeButton(QStringLiteral("&Kiểm tra cập nhật"), window, {210, 10, 108, 26});
-    download_ = MakeButton(QStringLiteral("Tải &về"), window, checkUpdate_->geometry());
+    checkUpdate_ = makeButton(QStringLiteral("&Kiểm tra cập nhật"), window, {210, 10, 108, 26});
+    download_ = makeButton(QStringLiteral("Tải &về"), window, checkUpdate_->geometry());
     download_->hide();
-    skin1_ = MakeButton(QStringLiteral("skin &1"), window, {322, 10, 46, 26});
-    skin2_ = MakeButton(QStringLiteral("skin &2"), window, {372, 10, 46, 26});
+    skin1_ = makeButton(QStringLiteral("skin &1"), window, {322, 10, 46, 26});
+    skin2_ = makeButton(QStringLiteral("skin &2"), window, {372, 10, 46, 26});
 }
 
 void CommandButtons::showHotkey(const QString& text, const QString& problem) {
@@ -65,7 +65,7 @@ void CommandButtons::showHotkey(const QString& text, const QString& problem) {
 
 void CommandButtons::paintNote(const SkinLook& look) {
     // On a ground of its own: over the skins' pictures red text could not be read.
-    Paint(hotkeyProblem_, look.noteBackground, look.noteText);
+    paint(hotkeyProblem_, look.noteBackground, look.noteText);
 }
 
 void CommandButtons::recolour(const SkinLook& look) {

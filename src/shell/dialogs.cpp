@@ -15,7 +15,6 @@
 #include <filesystem>
 #include <memory>
 
-#include "game/wine_prefix.h"
 #include "platform/filesystem.h"
 #include "shell/alert_popup.h"
 #include "shell/message_box.h"
@@ -78,7 +77,7 @@ public:
 
 }  // namespace
 
-bool UseVietnameseQtTexts() {
+bool useVietnameseQtTexts() {
     auto* translator = new QTranslator(QCoreApplication::instance());
     if (!translator->load(QStringLiteral(":/translations/qtbase_vi.qm"))) {
         delete translator;
@@ -87,17 +86,17 @@ bool UseVietnameseQtTexts() {
     return QCoreApplication::installTranslator(translator);
 }
 
-QString FolderDialogStart(const QString& wanted) {
+QString folderDialogStart(const QString& wanted) {
     namespace fs = std::filesystem;
     const QString text = wanted.trimmed();
     if (!text.isEmpty()) {
         // A relative text would name a folder under the program's working folder, which is
         // nowhere the user has been.
-        fs::path folder = platform::NativePathFromUserText(ToUtf8(text));
+        fs::path folder = platform::NativePathFromUserText(toUtf8(text));
         while (folder.is_absolute()) {
             const fs::path existing = platform::ResolveCaseInsensitive(folder);
             if (platform::IsDirectory(existing)) {
-                return QDir::cleanPath(PathToQString(existing));
+                return QDir::cleanPath(pathToQString(existing));
             }
             if (!folder.has_relative_path()) {
                 break;  // the root itself is missing, as an unmapped drive is
@@ -106,17 +105,17 @@ QString FolderDialogStart(const QString& wanted) {
         }
     }
     // Nothing typed yet: where Windows games live here, the Wine prefix's drive C.
-    const game::UserFolders user = game::UserFolders::FromEnvironment();
-    for (const fs::path& prefix :
-         {user.winePrefix, user.home.empty() ? fs::path() : user.home / ".wine"}) {
+    const fs::path home = platform::PathFromUtf8(platform::GetEnv("HOME"));
+    for (const fs::path& prefix : {platform::PathFromUtf8(platform::GetEnv("WINEPREFIX")),
+                                   home.empty() ? fs::path() : home / ".wine"}) {
         if (!prefix.empty() && platform::IsDirectory(prefix / "drive_c")) {
-            return PathToQString(prefix / "drive_c");
+            return pathToQString(prefix / "drive_c");
         }
     }
     return QDir::homePath();
 }
 
-void PrepareFolderDialog(QFileDialog& dialog, const QString& title, const QString& start) {
+void prepareFolderDialog(QFileDialog& dialog, const QString& title, const QString& start) {
     // Qt's own dialog rather than the desktop's, so that every label can be Vietnamese.
     dialog.setOption(QFileDialog::DontUseNativeDialog);
     dialog.setFileMode(QFileDialog::Directory);
@@ -151,13 +150,13 @@ void PrepareFolderDialog(QFileDialog& dialog, const QString& title, const QStrin
         places << QUrl::fromLocalFile(drive.absoluteFilePath());
     }
     dialog.setSidebarUrls(places);
-    dialog.setDirectory(FolderDialogStart(start));
+    dialog.setDirectory(folderDialogStart(start));
 }
 
-std::optional<QString> QtDialogs::PickFolder(QWidget* owner, const QString& title,
+std::optional<QString> QtDialogs::pickFolder(QWidget* owner, const QString& title,
                                              const QString& start) {
     QFileDialog dialog(owner);
-    PrepareFolderDialog(dialog, title, start);
+    prepareFolderDialog(dialog, title, start);
     if (dialog.exec() != QDialog::Accepted || dialog.selectedFiles().isEmpty()) {
         return std::nullopt;
     }
@@ -168,29 +167,29 @@ std::optional<QString> QtDialogs::PickFolder(QWidget* owner, const QString& titl
     return QDir::toNativeSeparators(folder);
 }
 
-void QtDialogs::ShowMessage(QWidget* owner, const QString& title, const QString& text, Icon icon) {
+void QtDialogs::showMessage(QWidget* owner, const QString& title, const QString& text, Icon icon) {
     const std::unique_ptr<QMessageBox> box(
-        NewPlainMessageBox(icon == Icon::Warning ? QMessageBox::Warning : QMessageBox::Information,
+        newPlainMessageBox(icon == Icon::Warning ? QMessageBox::Warning : QMessageBox::Information,
                            title, text, owner));
     box->exec();
 }
 
-void QtDialogs::ShowNotice(QWidget* owner, const QString& title, const QString& text) {
-    QMessageBox* box = NewPlainMessageBox(QMessageBox::Warning, title, text, owner);
+void QtDialogs::showNotice(QWidget* owner, const QString& title, const QString& text) {
+    QMessageBox* box = newPlainMessageBox(QMessageBox::Warning, title, text, owner);
     box->setAttribute(Qt::WA_DeleteOnClose);
     box->setModal(false);
     box->show();
 }
 
-void QtDialogs::ShowPopup(const QString& text, int displaySeconds) {
-    AlertPopup::Show(text, displaySeconds);
+void QtDialogs::showPopup(const QString& text, int displaySeconds) {
+    AlertPopup::open(text, displaySeconds);
 }
 
-void QtDialogs::ShowFailureAlert(const QString& text, int displaySeconds,
+void QtDialogs::showFailureAlert(const QString& text, int displaySeconds,
                                  std::function<void()> onClick) {
-    auto* popup = new AlertPopup(AlertPopup::ScreenEnvironment());
+    auto* popup = new AlertPopup(AlertPopup::screenEnvironment());
     QObject::connect(popup, &AlertPopup::clicked, popup, std::move(onClick));
-    popup->DisplayMessage(text, displaySeconds, popup::FailureStyle());
+    popup->displayMessage(text, displaySeconds, popup::FailureStyle());
 }
 
 }  // namespace kickvane::shell

@@ -5,13 +5,13 @@
 namespace kickvane::shell {
 
 // The main window's fade: its opacity moves by a step every tick until it reaches a target, and
-// then the fade ends with a beep. Plain state driven by Tick(), so tests need no timer.
+// then the fade ends with a beep. Plain state driven by advance(), so tests need no timer.
 class FadeModel {
 public:
     static constexpr std::chrono::milliseconds kInterval{20};
 
     // Starts a fade, or changes the target and step of the one that runs.
-    void Start(int target, int step) {
+    void start(int target, int step) {
         target_ = target;
         step_ = step;
         running_ = true;
@@ -24,7 +24,7 @@ public:
     };
 
     // One tick of a running fade.
-    Tick Step() {
+    Tick advance() {
         const bool first = !layered_;
         layered_ = true;
         alpha_ += step_;

@@ -2,7 +2,7 @@
 
 namespace kickvane::shell {
 
-FetchProblem ProblemOf(QNetworkReply::NetworkError error) {
+FetchProblem problemOf(QNetworkReply::NetworkError error) {
     using E = QNetworkReply::NetworkError;
     switch (error) {
         case E::TimeoutError:
@@ -38,7 +38,7 @@ FetchProblem ProblemOf(QNetworkReply::NetworkError error) {
     }
 }
 
-QString FetchProblemText(FetchProblem problem, int detail) {
+QString fetchProblemText(FetchProblem problem, int detail) {
     switch (problem) {
         case FetchProblem::TimedOut:
             return QStringLiteral("máy chủ không trả lời kịp");

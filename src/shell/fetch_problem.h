@@ -25,13 +25,13 @@ enum class FetchProblem {
 };
 
 // The problem behind one of Qt's network errors.
-FetchProblem ProblemOf(QNetworkReply::NetworkError error);
+FetchProblem problemOf(QNetworkReply::NetworkError error);
 
 // The text of a problem; `detail` is the HTTP status, or Qt's error code for Other.
-QString FetchProblemText(FetchProblem problem, int detail = 0);
+QString fetchProblemText(FetchProblem problem, int detail = 0);
 
-inline QString NetworkErrorText(QNetworkReply::NetworkError error) {
-    return FetchProblemText(ProblemOf(error), static_cast<int>(error));
+inline QString networkErrorText(QNetworkReply::NetworkError error) {
+    return fetchProblemText(problemOf(error), static_cast<int>(error));
 }
 
 }  // namespace kickvane::shell

@@ -33,22 +33,22 @@ constexpr int kPlaceWidth = 420;
 
 // A path laid out for `widget`'s font in lines of at most `width` pixels, continued lines
 // indented.
-QString BrokenPath(const QString& path, const QWidget& widget, int width) {
+QString brokenPath(const QString& path, const QWidget& widget, int width) {
     const QFontMetrics metrics = widget.fontMetrics();
-    return PathLines(path, width,
+    return pathLines(path, width,
                      [&](const QString& text) { return metrics.horizontalAdvance(text); })
         .join(QStringLiteral("\n    "));
 }
 
 // A box that does not hold up the window; its text is shown as written.
-void OpenInformation(QWidget* owner, const QString& text) {
-    QMessageBox* box = NewPlainMessageBox(QMessageBox::Information, kTitle, text, owner);
+void openInformation(QWidget* owner, const QString& text) {
+    QMessageBox* box = newPlainMessageBox(QMessageBox::Information, kTitle, text, owner);
     box->setAttribute(Qt::WA_DeleteOnClose);
     box->open();
 }
 
 // The list of several finds; the chosen folder goes into the box.
-void OpenChoice(QWidget* owner, QLineEdit* box, const std::vector<game::FoundGame>& games) {
+void openChoice(QWidget* owner, QLineEdit* box, const std::vector<session::FoundGame>& games) {
     auto* dialog = new QDialog(owner);
     dialog->setAttribute(Qt::WA_DeleteOnClose);
     dialog->setWindowTitle(kTitle);
@@ -59,10 +59,10 @@ void OpenChoice(QWidget* owner, QLineEdit* box, const std::vector<game::FoundGam
     list->setAccessibleName(QStringLiteral("Các thư mục tìm thấy"));
     list->setMinimumWidth(520);
     const int pathWidth = list->minimumWidth() - 48;  // the frame, the margins, a scroll bar
-    for (const game::FoundGame& game : games) {
-        auto* item = new QListWidgetItem(BrokenPath(PathToQString(game.folder), *list, pathWidth) +
-                                         QStringLiteral("\n    ") + ToQString(game.source));
-        item->setData(Qt::UserRole, PathToQString(game.folder));
+    for (const session::FoundGame& game : games) {
+        auto* item = new QListWidgetItem(brokenPath(pathToQString(game.folder), *list, pathWidth) +
+                                         QStringLiteral("\n    ") + toQString(game.source));
+        item->setData(Qt::UserRole, pathToQString(game.folder));
         list->addItem(item);
     }
     list->setCurrentRow(0);
@@ -83,28 +83,26 @@ void OpenChoice(QWidget* owner, QLineEdit* box, const std::vector<game::FoundGam
     dialog->open();
 }
 
-void OpenNothingFound(QWidget* owner, const game::FindOutcome& outcome) {
+void openNothingFound(QWidget* owner, const session::GameSearchOutcome& outcome) {
     QString text = QStringLiteral("Không tìm thấy Gameloader.exe.\n\nĐã tìm trong:");
     for (const std::string& place : outcome.looked) {
-        text += QStringLiteral("\n  ") + BrokenPath(ToQString(place), *owner, kPlaceWidth);
+        text += QStringLiteral("\n  ") + brokenPath(toQString(place), *owner, kPlaceWidth);
     }
     if (!outcome.skipped.empty()) {
         text += QStringLiteral("\n\nBỏ qua (không đọc được):");
         for (const std::string& skipped : outcome.skipped) {
-            text += QStringLiteral("\n  ") + BrokenPath(ToQString(skipped), *owner, kPlaceWidth);
+            text += QStringLiteral("\n  ") + brokenPath(toQString(skipped), *owner, kPlaceWidth);
         }
     }
-    OpenInformation(owner, text);
+    openInformation(owner, text);
 }
 
 }  // namespace
 
-GameFinderButton::GameFinderButton(QLineEdit* gameFolderBox, game::UserFolders folders,
-                                   game::SearchLimits limits)
+GameFinderButton::GameFinderButton(QLineEdit* gameFolderBox, session::GameSearch search)
     : QPushButton(kCaption, gameFolderBox->parentWidget()),
       gameFolderBox_(gameFolderBox),
-      folders_(std::move(folders)),
-      limits_(limits) {
+      search_(std::move(search)) {
     setToolTip(
         QStringLiteral("Tìm thư mục cài FIFA Online 2 trong Wine và các trình quản lý game"));
     setAccessibleName(QStringLiteral("Tìm thư mục game"));
@@ -138,15 +136,14 @@ void GameFinderButton::start() {
     QApplication::setOverrideCursor(Qt::BusyCursor);
     // The search reads folders that may be slow or huge; the window goes on meanwhile. Its
     // result comes back to the window's thread through the event queue.
-    worker_ = std::thread([this, folders = folders_, limits = limits_] {
-        auto outcome =
-            std::make_shared<game::FindOutcome>(game::FindGame(folders, limits, &cancel_));
+    worker_ = std::thread([this, search = search_] {
+        auto outcome = std::make_shared<session::GameSearchOutcome>(search(cancel_));
         QMetaObject::invokeMethod(
             this, [this, outcome] { finish(*outcome); }, Qt::QueuedConnection);
     });
 }
 
-void GameFinderButton::finish(const game::FindOutcome& outcome) {
+void GameFinderButton::finish(const session::GameSearchOutcome& outcome) {
     finished_ = true;
     if (worker_.joinable()) {
         worker_.join();
@@ -155,20 +152,20 @@ void GameFinderButton::finish(const game::FindOutcome& outcome) {
     setText(kCaption);
     setEnabled(true);
     if (outcome.games.size() == 1) {
-        const QString folder = PathToQString(outcome.games.front().folder);
+        const QString folder = pathToQString(outcome.games.front().folder);
         gameFolderBox_->setText(folder);
-        OpenInformation(window(), QStringLiteral("Đã tìm thấy FIFA Online 2:\n    ") +
-                                      BrokenPath(folder, *this, kPlaceWidth) +
+        openInformation(window(), QStringLiteral("Đã tìm thấy FIFA Online 2:\n    ") +
+                                      brokenPath(folder, *this, kPlaceWidth) +
                                       QStringLiteral("\n\n") + kSaveToKeep);
     } else if (outcome.games.size() > 1) {
-        OpenChoice(window(), gameFolderBox_, outcome.games);
+        openChoice(window(), gameFolderBox_, outcome.games);
     } else {
-        OpenNothingFound(window(), outcome);
+        openNothingFound(window(), outcome);
     }
     emit searchFinished();
 }
 
-QStringList PathLines(const QString& path, int width,
+QStringList pathLines(const QString& path, int width,
                       const std::function<int(const QString&)>& measure) {
     QStringList lines;
     QString line;
@@ -196,8 +193,9 @@ QStringList PathLines(const QString& path, int width,
     return lines;
 }
 
-GameFinderButton* AddGameFinder(QLineEdit* gameFolderBox, QPushButton* browseButton) {
-    auto* button = new GameFinderButton(gameFolderBox, game::UserFolders::FromEnvironment());
+GameFinderButton* addGameFinder(QLineEdit* gameFolderBox, QPushButton* browseButton,
+                                session::GameSearch search) {
+    auto* button = new GameFinderButton(gameFolderBox, std::move(search));
     QRect box = gameFolderBox->geometry();
     box.setWidth(box.width() - kButtonWidth - kGap);
     gameFolderBox->setGeometry(box);

@@ -6,7 +6,7 @@
 #include <functional>
 #include <thread>
 
-#include "game/find_game.h"
+#include "session/session.h"
 
 class QLineEdit;
 
@@ -18,8 +18,8 @@ namespace kickvane::shell {
 class GameFinderButton final : public QPushButton {
     Q_OBJECT
 public:
-    GameFinderButton(QLineEdit* gameFolderBox, game::UserFolders folders,
-                     game::SearchLimits limits = {});
+    // `search` is the session's game search; it runs on a thread of the button's.
+    GameFinderButton(QLineEdit* gameFolderBox, session::GameSearch search);
     ~GameFinderButton() override;
 
     bool searching() const { return worker_.joinable() && !finished_; }
@@ -30,12 +30,11 @@ signals:
 
 private:
     void start();
-    void finish(const game::FindOutcome& outcome);
+    void finish(const session::GameSearchOutcome& outcome);
     void stopWorker();
 
     QLineEdit* gameFolderBox_;
-    game::UserFolders folders_;
-    game::SearchLimits limits_;
+    session::GameSearch search_;
     std::thread worker_;
     std::atomic<bool> cancel_{false};
     bool finished_ = true;
@@ -44,11 +43,12 @@ private:
 // A path in lines no wider than `width` (as `measure` gives a text's width) that break only
 // after a folder separator, never inside a name; a name wider than the width keeps a line of its
 // own.
-QStringList PathLines(const QString& path, int width,
+QStringList pathLines(const QString& path, int width,
                       const std::function<int(const QString&)>& measure);
 
 // Puts a "Tìm" button between the game folder box and the change-folder button (the box gives
 // up the room) and returns it.
-GameFinderButton* AddGameFinder(QLineEdit* gameFolderBox, QPushButton* browseButton);
+GameFinderButton* addGameFinder(QLineEdit* gameFolderBox, QPushButton* browseButton,
+                                session::GameSearch search);
 
 }  // namespace kickvane::shell

@@ -7,7 +7,6 @@
 #include <QTimer>
 #include <utility>
 
-#include "engine/run_summary.h"
 #include "platform/filesystem.h"
 #include "shell/message_box.h"
 #include "shell/qt_text.h"
@@ -16,13 +15,13 @@ namespace kickvane::shell {
 
 namespace {
 
-QIcon ToolIcon(const std::filesystem::path& toolFolder) {
+QIcon toolIcon(const std::filesystem::path& toolFolder) {
     QIcon icon;
     for (const char* size : {"16", "32", "64"}) {
         const std::filesystem::path file = platform::ResolveCaseInsensitive(
             toolFolder / "icons" / (std::string("kickvane-") + size + ".png"));
         if (platform::IsRegularFile(file)) {
-            icon.addFile(PathToQString(file));
+            icon.addFile(pathToQString(file));
         }
     }
     if (icon.isNull()) {
@@ -52,8 +51,8 @@ MainWindow::MainWindow(session::Session& session, ShellServices services, QWidge
       outcomes_(*services_.dialogs, this, services_.playSound),
       panels_(new CatalogPanels(this)),
       buttons_(new CommandButtons(this)),
-      skins_(session_.toolFolder(), *panels_),
-      sideWindows_(this, session_.toolFolder()) {
+      skins_(session_.ToolFolder(), *panels_),
+      sideWindows_(this, session_.ToolFolder()) {
     setWindowTitle(QStringLiteral("Kickvane v2.0"));
     setFixedSize(kClientWidth, kClientHeight);
     QFont small = font();
@@ -67,18 +66,18 @@ MainWindow::MainWindow(session::Session& session, ShellServices services, QWidge
     connect(&fadeTimer_, &QTimer::timeout, this, &MainWindow::fadeTick);
     startFade(240, 15);
 
-    const QIcon icon = ToolIcon(session_.toolFolder());
+    const QIcon icon = toolIcon(session_.ToolFolder());
     setWindowIcon(icon);
     skins_.initialise();
     sideWindows_.keepClearFrom(buttons_->save());
 
     tray_ = std::make_unique<TrayMenu>(icon, services_.makeTray);
     connectTray();
-    tray_->icon().Add();
+    tray_->icon().add();
 
     // The hotkey is sampled when a key event arrives and, while it is held (or where no events
     // come), on the poll's interval; an idle tool sleeps.
-    hotkeyTimer_.setInterval(engine::HotkeyPoll::kInterval);
+    hotkeyTimer_.setInterval(session::kHotkeyPollInterval);
     connect(&hotkeyTimer_, &QTimer::timeout, this, &MainWindow::pollHotkey);
     if (const int wake = session_.HotkeyWakeDescriptor(); wake >= 0) {
         hotkeyWake_ = std::make_unique<QSocketNotifier>(wake, QSocketNotifier::Read);
@@ -86,9 +85,9 @@ MainWindow::MainWindow(session::Session& session, ShellServices services, QWidge
     }
     pollHotkey();
 
-    updateFlow_ = std::make_unique<UpdateFlow>(services_.updates, session_.toolFolder(),
-                                               *services_.dialogs, this, buttons_->checkUpdate(),
-                                               buttons_->download(), session_.updates());
+    addGameFinder(panels_->gameFolderBox(), panels_->browseButton(), session_.GameSearchCommand());
+    updateFlow_ = std::make_unique<UpdateFlow>(services_.updates, session_, *services_.dialogs,
+                                               this, buttons_->checkUpdate(), buttons_->download());
     showSession();
     connectPanels();
     connectButtons();
@@ -96,11 +95,11 @@ MainWindow::MainWindow(session::Session& session, ShellServices services, QWidge
     if (std::optional<text::Message> problem = session_.SettingsProblem()) {
         // Once the window is up, so the box has its owner on screen.
         QTimer::singleShot(
-            0, this, [this, message = std::move(*problem)] { outcomes_.ShowMessage(message); });
+            0, this, [this, message = std::move(*problem)] { outcomes_.showMessage(message); });
     }
     if (std::optional<text::Message> gone = session_.TakeGoneNotice()) {
         QTimer::singleShot(0, this,
-                           [this, message = std::move(*gone)] { outcomes_.ShowMessage(message); });
+                           [this, message = std::move(*gone)] { outcomes_.showMessage(message); });
     }
 }
 
@@ -113,17 +112,17 @@ void MainWindow::connectPanels() {
         moveFocusOffHotkey();
     });
     connect(panels_, &CatalogPanels::categoryToggled, this,
-            [this](int switchIndex, bool on) { session_.setCategoryOn(switchIndex, on); });
+            [this](int switchIndex, bool on) { session_.SetCategoryOn(switchIndex, on); });
     connect(panels_, &CatalogPanels::optionChosen, this,
             [this](catalog::OptionArray array, int index) {
                 // Clicking an option button always chooses it; its group's others clear.
-                session_.chooseOption(array, index);
-                panels_->showSelection(session_.selection());
+                session_.ChooseOption(array, index);
+                panels_->showSelection(session_.Selection());
             });
     connect(panels_, &CatalogPanels::addedChosen, this,
             [this](catalog::GroupId group, const std::string& name) {
                 session_.ChooseAdded(group, name);
-                panels_->showSelection(session_.selection());
+                panels_->showSelection(session_.Selection());
             });
     connect(panels_, &CatalogPanels::addedLabelClicked, this,
             [this](catalog::GroupId group, const std::string& name) {
@@ -140,14 +139,14 @@ void MainWindow::connectPanels() {
         panels_, &CatalogPanels::labelClicked, this,
         [this](catalog::LabelArray labels, int index) { sideWindows_.showPreview(labels, index); });
     connect(panels_, &CatalogPanels::gameFolderEdited, this,
-            [this](const QString& folder) { session_.setGameFolder(ToUtf8(folder)); });
+            [this](const QString& folder) { session_.SetGameFolder(toUtf8(folder)); });
     connect(panels_, &CatalogPanels::browseRequested, this, &MainWindow::browseGameFolder);
 }
 
 void MainWindow::connectButtons() {
     CommandButtons& b = *buttons_;
     connect(&b, &CommandButtons::hotkeyEdited, this, [this](const QString& text) {
-        session_.setHotkeyText(ToUtf8(text));
+        session_.SetHotkeyText(toUtf8(text));
         showHotkey();
     });
     connect(b.save(), &QPushButton::clicked, this, &MainWindow::saveSettings);
@@ -160,8 +159,8 @@ void MainWindow::connectButtons() {
     connect(b.translucent(), &QPushButton::clicked, this, [this] { makeTranslucent(160); });
     connect(b.checkUpdate(), &QPushButton::clicked, updateFlow_.get(), &UpdateFlow::check);
     connect(b.download(), &QPushButton::clicked, updateFlow_.get(), &UpdateFlow::download);
-    connect(b.skin(1), &QPushButton::clicked, this, [this] { applySkin(LightSkin()); });
-    connect(b.skin(2), &QPushButton::clicked, this, [this] { applySkin(DarkSkin()); });
+    connect(b.skin(1), &QPushButton::clicked, this, [this] { applySkin(lightSkin()); });
+    connect(b.skin(2), &QPushButton::clicked, this, [this] { applySkin(darkSkin()); });
 }
 
 void MainWindow::connectTray() {
@@ -175,9 +174,9 @@ void MainWindow::connectTray() {
 }
 
 void MainWindow::showSession() {
-    panels_->showGameFolder(ToQString(session_.settings().gameFolder));
+    panels_->showGameFolder(toQString(session_.Settings().gameFolder));
     showAddedVariants();
-    panels_->showSelection(session_.selection());
+    panels_->showSelection(session_.Selection());
     showHotkey();
 }
 
@@ -185,14 +184,14 @@ void MainWindow::showAddedVariants() {
     std::array<QString, catalog::kGroupCount> skipped;
     for (const catalog::VariantGroup& group : catalog::Groups()) {
         skipped[static_cast<size_t>(group.id)] =
-            ToQString(session::SkippedLine(session_.addedVariants(), group.id));
+            toQString(session::SkippedLine(session_.AddedVariants(), group.id));
     }
-    panels_->showAddedVariants(session_.addedVariants(), skipped);
+    panels_->showAddedVariants(session_.AddedVariants(), skipped);
 }
 
 void MainWindow::showHotkey() {
-    buttons_->showHotkey(ToQString(session_.settings().hotkey),
-                         ToQString(session_.hotkeyProblem()));
+    buttons_->showHotkey(toQString(session_.Settings().hotkey),
+                         toQString(session_.HotkeyProblem()));
 }
 
 void MainWindow::paintEvent(QPaintEvent*) {
@@ -248,11 +247,10 @@ void MainWindow::showRunAlone(const session::ApplyRun& run) {
 }
 
 void MainWindow::showRun(const session::ApplyRun& run) {
-    if (!run.refused) {
-        // The tooltip keeps the last result where no sound is heard.
-        const QTime now = QTime::currentTime();
-        tray_->icon().SetStatusLine(
-            ToQString(engine::RunSummary(run.apply, {now.hour(), now.minute()})));
+    // The tooltip keeps the last result where no sound is heard.
+    const QTime now = QTime::currentTime();
+    if (const auto line = session::RunStatusLine(run, {now.hour(), now.minute()})) {
+        tray_->icon().setStatusLine(toQString(*line));
     }
     if (!run.failureAlert || isActiveWindow()) {
         if (!run.refused) {
@@ -260,79 +258,79 @@ void MainWindow::showRun(const session::ApplyRun& run) {
             lastFailures_.reset();
             tray_->showFailuresEntry(false);
         }
-        outcomes_.Show(run.shown);
+        outcomes_.show(run.shown);
         return;
     }
     session::Outcome shown = run.shown;
     lastFailures_ = std::move(shown.messages.back());
     shown.messages.pop_back();
-    outcomes_.Show(shown);
+    outcomes_.show(shown);
     tray_->showFailuresEntry(true);
-    services_.dialogs->ShowFailureAlert(ToQString(run.failureAlert->text),
+    services_.dialogs->showFailureAlert(toQString(run.failureAlert->text),
                                         run.failureAlert->seconds, [this] { showLastFailures(); });
 }
 
 void MainWindow::showLastFailures() {
     if (lastFailures_) {
-        outcomes_.ShowMessage(*lastFailures_);
+        outcomes_.showMessage(*lastFailures_);
     }
 }
 
 void MainWindow::saveSettings() {
-    outcomes_.Show(session_.Save());
+    outcomes_.show(session_.Save());
 }
 
 void MainWindow::launchGame(session::LaunchFrom from) {
     session::LaunchRun run = session_.Launch(from);
     std::optional<session::Popup> popup = std::move(run.shown.popup);
     run.shown.popup.reset();
-    outcomes_.Show(run.shown);
+    outcomes_.show(run.shown);
     if (run.hideToTray && popup) {
         hideAndSay(*popup);
     } else if (popup) {
-        outcomes_.ShowPopup(*popup);
+        outcomes_.showPopup(*popup);
     }
 }
 
 void MainWindow::browseGameFolder() {
-    if (auto folder = services_.dialogs->PickFolder(
+    if (auto folder = services_.dialogs->pickFolder(
             this, QStringLiteral("Chọn thư mục cài đặt FIFA Online 2"),
-            ToQString(session_.settings().gameFolder))) {
+            toQString(session_.Settings().gameFolder))) {
         panels_->showGameFolder(*folder);
     }
 }
 
 void MainWindow::quickLoad() {
     std::optional<std::filesystem::path> chosen;
-    if (auto folder = services_.dialogs->PickFolder(
+    if (auto folder = services_.dialogs->pickFolder(
             this, QStringLiteral("Hỗ trợ nạp nhanh các file Face và Ball"),
-            PathToQString(session_.quickLoadFolder()))) {
-        chosen = QStringToPath(*folder);
+            pathToQString(session_.QuickLoadFolder()))) {
+        chosen = qStringToPath(*folder);
     }
-    outcomes_.Show(session_.QuickLoad(std::move(chosen)).shown);
+    outcomes_.show(session_.QuickLoad(std::move(chosen)).shown);
 }
 
 void MainWindow::applySkin(const SkinLook& look) {
     skins_.apply(look);
     buttons_->recolour(look);
     update();
-    outcomes_.ShowPopup({std::string(session::kSkinChangedPopupText), 1});
+    outcomes_.showPopup({std::string(session::kSkinChangedPopupText), 1});
 }
 
 void MainWindow::closeEvent(QCloseEvent* event) {
     // Closing the window ends the tool; its tray icon goes with it at once.
-    tray_->icon().Remove();
+    tray_->icon().remove();
     QWidget::closeEvent(event);
     emit closed();
 }
 
 void MainWindow::startFade(int target, int step) {
-    fade_.Start(target, step);
+    fade_.start(target, step);
     fadeTimer_.start();
 }
 
 void MainWindow::fadeTick() {
-    const FadeModel::Tick tick = fade_.Step();
+    const FadeModel::Tick tick = fade_.advance();
     setAlpha(tick.alpha);
     if (tick.ended) {
         fadeTimer_.stop();
@@ -370,7 +368,7 @@ void MainWindow::moveFocusOffHotkey() {
 bool MainWindow::hideToTray() {
     moveFocusOffHotkey();
     // Without a tray host the window could not come back from hiding; it minimises instead.
-    if (tray_->icon().Shown()) {
+    if (tray_->icon().shown()) {
         hide();
         return true;
     }
@@ -380,9 +378,9 @@ bool MainWindow::hideToTray() {
 
 void MainWindow::hideAndSay(const session::Popup& popup) {
     if (hideToTray()) {
-        outcomes_.ShowPopup(popup);
+        outcomes_.showPopup(popup);
     } else {
-        outcomes_.ShowPopup({std::string(session::kNoTrayPopupText), popup.seconds});
+        outcomes_.showPopup({std::string(session::kNoTrayPopupText), popup.seconds});
     }
 }
 
@@ -400,12 +398,12 @@ void MainWindow::showFromTray() {
     // Sets dropped into the groups' folders while the window was away show up now.
     const session::Outcome refreshed = session_.RefreshAddedVariants();
     showAddedVariants();
-    panels_->showSelection(session_.selection());
-    outcomes_.Show(refreshed);
+    panels_->showSelection(session_.Selection());
+    outcomes_.show(refreshed);
 }
 
 void MainWindow::exitFromTray() {
-    tray_->icon().Remove();
+    tray_->icon().remove();
     emit exitRequested();
 }
 

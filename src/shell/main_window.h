@@ -11,6 +11,7 @@
 #include "shell/command_buttons.h"
 #include "shell/dialogs.h"
 #include "shell/fade_model.h"
+#include "shell/game_finder.h"
 #include "shell/outcome_view.h"
 #include "shell/side_window_set.h"
 #include "shell/skins.h"
@@ -27,7 +28,7 @@ struct ShellServices {
     Dialogs* dialogs = nullptr;  // not owned
     SoundPlayer playSound;
     // Where the update check asks; tests point it at a server of their own.
-    UpdateCheck::Options updates = UpdateCheck::DefaultOptions();
+    UpdateCheck::Options updates = UpdateCheck::defaultOptions();
     // Makes the tray icon with the window's tray menu; null: the desktop's tray.
     TrayFactory makeTray;
 };

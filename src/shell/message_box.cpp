@@ -9,11 +9,11 @@
 
 namespace kickvane::shell {
 
-QString NoticeTitle() {
-    return ToQString(text::VniToUnicodeUtf8(kNoticeTitleVni));
+QString noticeTitle() {
+    return toQString(text::VniToUnicodeUtf8(kNoticeTitleVni));
 }
 
-QMessageBox* NewPlainMessageBox(QMessageBox::Icon icon, const QString& title, const QString& text,
+QMessageBox* newPlainMessageBox(QMessageBox::Icon icon, const QString& title, const QString& text,
                                 QWidget* owner) {
     auto* box = new QMessageBox(icon, title, QString(), QMessageBox::Ok, owner);
     box->setTextFormat(Qt::PlainText);
@@ -21,12 +21,12 @@ QMessageBox* NewPlainMessageBox(QMessageBox::Icon icon, const QString& title, co
     return box;
 }
 
-int ShowMessageW(std::string_view text, std::string_view title, int style, QWidget* owner) {
-    const std::unique_ptr<QMessageBox> box(NewPlainMessageBox(
-        style == kStyleInformation ? QMessageBox::Information : QMessageBox::NoIcon,
-        ToQString(text::VniToUnicodeUtf8(title)), ToQString(text::VniToUnicodeUtf8(text)), owner));
+void showVniMessage(std::string_view text, std::string_view title, MessageIcon icon,
+                    QWidget* owner) {
+    const std::unique_ptr<QMessageBox> box(newPlainMessageBox(
+        icon == MessageIcon::Information ? QMessageBox::Information : QMessageBox::NoIcon,
+        toQString(text::VniToUnicodeUtf8(title)), toQString(text::VniToUnicodeUtf8(text)), owner));
     box->exec();
-    return 1;
 }
 
 }  // namespace kickvane::shell

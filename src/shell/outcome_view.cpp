@@ -5,39 +5,39 @@
 
 namespace kickvane::shell {
 
-void OutcomeView::Show(const session::Outcome& shown) {
+void OutcomeView::show(const session::Outcome& shown) {
     if (!shown.signalSound.empty() && sound_) {
         sound_(shown.signalSound);
     }
     for (const text::Message& message : shown.messages) {
-        ShowMessage(message);
+        showMessage(message);
     }
     if (shown.popup) {
-        ShowPopup(*shown.popup);
+        showPopup(*shown.popup);
     }
 }
 
-void OutcomeView::ShowMessage(const text::Message& message) {
-    const QString text = ToQString(message.text);
-    const QString title = ToQString(message.title);
+void OutcomeView::showMessage(const text::Message& message) {
+    const QString text = toQString(message.text);
+    const QString title = toQString(message.title);
     switch (message.kind) {
         case text::Message::Kind::Component:
-            dialogs_.ShowMessage(owner_, NoticeTitle(), text);
+            dialogs_.showMessage(owner_, noticeTitle(), text);
             break;
         case text::Message::Kind::Plain:
-            dialogs_.ShowMessage(owner_, title, text);
+            dialogs_.showMessage(owner_, title, text);
             break;
         case text::Message::Kind::Warning:
-            dialogs_.ShowMessage(owner_, title, text, Dialogs::Icon::Warning);
+            dialogs_.showMessage(owner_, title, text, Dialogs::Icon::Warning);
             break;
         case text::Message::Kind::Notice:
-            dialogs_.ShowNotice(owner_, title, text);
+            dialogs_.showNotice(owner_, title, text);
             break;
     }
 }
 
-void OutcomeView::ShowPopup(const session::Popup& popup) {
-    dialogs_.ShowPopup(ToQString(popup.text), popup.seconds);
+void OutcomeView::showPopup(const session::Popup& popup) {
+    dialogs_.showPopup(toQString(popup.text), popup.seconds);
 }
 
 }  // namespace kickvane::shell

@@ -16,9 +16,9 @@ public:
     OutcomeView(Dialogs& dialogs, QWidget* owner, SoundPlayer sound)
         : dialogs_(dialogs), owner_(owner), sound_(std::move(sound)) {}
 
-    void Show(const session::Outcome& shown);
-    void ShowMessage(const text::Message& message);
-    void ShowPopup(const session::Popup& popup);
+    void show(const session::Outcome& shown);
+    void showMessage(const text::Message& message);
+    void showPopup(const session::Popup& popup);
 
     Dialogs& dialogs() { return dialogs_; }
 

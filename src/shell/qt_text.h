@@ -12,19 +12,19 @@
 // room for most Vietnamese letters.
 namespace kickvane::shell {
 
-inline QString ToQString(std::string_view utf8) {
+inline QString toQString(std::string_view utf8) {
     return QString::fromUtf8(utf8.data(), static_cast<qsizetype>(utf8.size()));
 }
 
-inline std::string ToUtf8(const QString& text) {
+inline std::string toUtf8(const QString& text) {
     return text.toStdString();
 }
 
-inline QString PathToQString(const std::filesystem::path& path) {
-    return ToQString(platform::PathToUtf8(path));
+inline QString pathToQString(const std::filesystem::path& path) {
+    return toQString(platform::PathToUtf8(path));
 }
 
-inline std::filesystem::path QStringToPath(const QString& text) {
+inline std::filesystem::path qStringToPath(const QString& text) {
     return platform::PathFromUtf8(text.toStdString());
 }
 

@@ -26,7 +26,7 @@ const QString kNoGlobalKeysText = QStringLiteral(
     "Hãy gắn lệnh \"kickvane trigger\" vào một phím tắt của màn hình nền: lệnh này chép các bộ "
     "đồ hoạ đã chọn vào game, như khi nhấn phím tắt.");
 
-void CentreOnScreen(QWidget& window) {
+void centreOnScreen(QWidget& window) {
     if (const QScreen* screen = QGuiApplication::primaryScreen()) {
         const QRect area = screen->availableGeometry();
         window.move(area.center() - QPoint(window.width() / 2, window.height() / 2));
@@ -35,7 +35,7 @@ void CentreOnScreen(QWidget& window) {
 
 }  // namespace
 
-void UseReadableFonts() {
+void useReadableFonts() {
     // A Wine prefix without Wine's own fonts has neither the system's dialog font ("MS Shell
     // Dlg", which Wine maps to Tahoma) nor Tahoma. Qt then takes the first family by name, which
     // can be DejaVu's math font: its Windows line height is four times its size, and line edits,
@@ -49,22 +49,22 @@ void UseReadableFonts() {
                                QStringLiteral("Liberation Sans"),
                                QStringLiteral("Noto Sans")};
     for (const QString& family :
-         {QApplication::font().family(), ToQString(popup::kPopupFontFamily)}) {
+         {QApplication::font().family(), toQString(popup::kPopupFontFamily)}) {
         QStringList others = readable;
         others.removeAll(family);
         QFont::insertSubstitutions(family, others);
     }
 }
 
-int RunWindow(int& argc, char** argv, const std::filesystem::path& toolFolder) {
+int runWindow(int& argc, char** argv, const std::filesystem::path& toolFolder) {
     QApplication app(argc, argv);
     QApplication::setApplicationName(QStringLiteral("Kickvane"));
-    UseReadableFonts();
-    UseVietnameseQtTexts();
+    useReadableFonts();
+    useVietnameseQtTexts();
 
     const std::unique_ptr<platform::SingleInstance> instance = platform::AcquireSingleInstance();
     if (!instance) {
-        ShowMessageW(kAlreadyRunningVni, kNoticeTitleVni, kStyleInformation, nullptr);
+        showVniMessage(kAlreadyRunningVni, kNoticeTitleVni, MessageIcon::Information, nullptr);
         return 0;
     }
 
@@ -96,9 +96,9 @@ int RunWindow(int& argc, char** argv, const std::filesystem::path& toolFolder) {
     };
     std::unique_ptr<QSocketNotifier> commandNotifier;
     QTimer commandTimer;
-    if (instance->commandDescriptor() >= 0) {
+    if (instance->CommandDescriptor() >= 0) {
         commandNotifier =
-            std::make_unique<QSocketNotifier>(instance->commandDescriptor(), QSocketNotifier::Read);
+            std::make_unique<QSocketNotifier>(instance->CommandDescriptor(), QSocketNotifier::Read);
         QObject::connect(commandNotifier.get(), &QSocketNotifier::activated, &window, takeCommands);
     } else {
         QObject::connect(&commandTimer, &QTimer::timeout, &window, takeCommands);
@@ -114,11 +114,11 @@ int RunWindow(int& argc, char** argv, const std::filesystem::path& toolFolder) {
                          [&window] { window.exitFromTray(); });
     }
 
-    CentreOnScreen(window);
+    centreOnScreen(window);
     window.show();
-    if (!session.hasGlobalKeys()) {
+    if (!session.HasGlobalKeys()) {
         QTimer::singleShot(0, &window,
-                           [&] { dialogs.ShowNotice(&window, NoticeTitle(), kNoGlobalKeysText); });
+                           [&] { dialogs.showNotice(&window, noticeTitle(), kNoGlobalKeysText); });
     }
     return QApplication::exec();
 }

@@ -6,11 +6,11 @@ namespace kickvane::shell {
 
 // Runs the tool with its window until the user ends it; returns the process exit code.
 // A second start while a copy runs shows a notice and ends without touching anything.
-int RunWindow(int& argc, char** argv, const std::filesystem::path& toolFolder);
+int runWindow(int& argc, char** argv, const std::filesystem::path& toolFolder);
 
 // Gives the fonts the interface asks for by name (the system's own and the popups' Tahoma)
 // readable stand-ins for systems that lack them. Called once the application exists.
-void UseReadableFonts();
+void useReadableFonts();
 
 inline constexpr const char* kTriggerCommand = "trigger";
 

@@ -9,7 +9,7 @@ namespace kickvane::shell {
 namespace {
 
 // Brings a side window to the front with the keyboard focus, so that Escape closes it at once.
-void ShowInFront(QWidget& window) {
+void showInFront(QWidget& window) {
     window.show();
     window.raise();
     window.activateWindow();
@@ -31,30 +31,30 @@ void SideWindowSet::show(QPointer<QWidget>& window, QWidget* (*create)(QWidget*)
         const QScreen* screen = owner_->screen();
         const QRect area = screen ? screen->availableGeometry() : frame;
         const QPoint at =
-            SideWindowPosition(area, frame, clearTop, window->size().grownBy(margins));
+            sideWindowPosition(area, frame, clearTop, window->size().grownBy(margins));
         window->move(at);
     }
-    ShowInFront(*window);
+    showInFront(*window);
 }
 
 void SideWindowSet::showPreview(catalog::LabelArray labels, int index) {
-    const std::filesystem::path picture = PreviewPicture(toolFolder_, labels, index);
+    const std::filesystem::path picture = previewPicture(toolFolder_, labels, index);
     if (picture.empty()) {
         return;
     }
-    shownPreview().ShowPicture(picture);
+    shownPreview().showPicture(picture);
 }
 
 void SideWindowSet::showAddedPreview(catalog::GroupId group, std::string_view name) {
-    const std::filesystem::path picture = AddedPreviewPicture(toolFolder_, group, name);
+    const std::filesystem::path picture = addedPreviewPicture(toolFolder_, group, name);
     PreviewWindow& window = shownPreview();
     if (picture.empty()) {
-        window.ShowNoPicture();
+        window.showNoPicture();
         return;
     }
-    window.ShowPicture(picture);
-    if (window.pictureFile() != PathToQString(picture)) {
-        window.ShowNoPicture();  // there but unreadable: never another entry's picture
+    window.showPicture(picture);
+    if (window.pictureFile() != pathToQString(picture)) {
+        window.showNoPicture();  // there but unreadable: never another entry's picture
     }
 }
 
@@ -62,7 +62,7 @@ PreviewWindow& SideWindowSet::shownPreview() {
     if (!preview_) {
         preview_ = new PreviewWindow(owner_);
     }
-    ShowInFront(*preview_);
+    showInFront(*preview_);
     preview_->setFocus(Qt::OtherFocusReason);
     return *preview_;
 }

@@ -19,8 +19,8 @@ public:
     // owner (the command buttons along its bottom).
     void keepClearFrom(QWidget* topOfClearArea) { keepClear_ = topOfClearArea; }
 
-    void showAbout() { show(about_, CreateAboutWindow); }
-    void showHelp() { show(help_, CreateHelpWindow); }
+    void showAbout() { show(about_, createAboutWindow); }
+    void showHelp() { show(help_, createHelpWindow); }
     // Shows the label's preview picture; a label without one changes nothing.
     void showPreview(catalog::LabelArray labels, int index);
     // Shows the preview of a variant the player added, or the note that it has none.

@@ -21,7 +21,7 @@ namespace {
 constexpr QSize kPreviewSize(597, 397);
 
 // The side windows close on a plain Escape, as dialogs do.
-bool ClosesOnEscape(QWidget& window, const QKeyEvent& event) {
+bool closesOnEscape(QWidget& window, const QKeyEvent& event) {
     if (event.key() != Qt::Key_Escape || event.modifiers() != Qt::NoModifier) {
         return false;
     }
@@ -64,7 +64,7 @@ public:
 
 protected:
     void keyPressEvent(QKeyEvent* event) override {
-        if (!ClosesOnEscape(*this, *event)) {
+        if (!closesOnEscape(*this, *event)) {
             QWidget::keyPressEvent(event);
         }
     }
@@ -72,7 +72,7 @@ protected:
 
 }  // namespace
 
-QPoint SideWindowPosition(const QRect& area, const QRect& ownerFrame, int keepClearTop,
+QPoint sideWindowPosition(const QRect& area, const QRect& ownerFrame, int keepClearTop,
                           const QSize& size) {
     constexpr int kGap = 8;
     const auto inside = [&](QPoint at) {
@@ -93,7 +93,7 @@ QPoint SideWindowPosition(const QRect& area, const QRect& ownerFrame, int keepCl
     return inside(QPoint(centredX, std::min(centredY, keepClearTop - kGap - size.height())));
 }
 
-std::filesystem::path PreviewPicture(const std::filesystem::path& toolFolder,
+std::filesystem::path previewPicture(const std::filesystem::path& toolFolder,
                                      catalog::LabelArray labels, int index) {
     int tab = 0;
     int last = 0;
@@ -144,30 +144,30 @@ PreviewWindow::PreviewWindow(QWidget* owner)
 }
 
 void PreviewWindow::keyPressEvent(QKeyEvent* event) {
-    if (!ClosesOnEscape(*this, *event)) {
+    if (!closesOnEscape(*this, *event)) {
         QWidget::keyPressEvent(event);
     }
 }
 
-void PreviewWindow::ShowPicture(const std::filesystem::path& file) {
+void PreviewWindow::showPicture(const std::filesystem::path& file) {
     QPixmap pixmap;
-    const QString name = PathToQString(file);
+    const QString name = pathToQString(file);
     if (!file.empty() && pixmap.load(name)) {
         picture_->setScaledContents(true);
         picture_->setPixmap(pixmap);
         pictureFile_ = name;
     } else if (pictureFile_.isEmpty()) {
-        ShowNoPicture();
+        showNoPicture();
     }
 }
 
-void PreviewWindow::ShowNoPicture() {
+void PreviewWindow::showNoPicture() {
     picture_->setScaledContents(false);
     picture_->setText(QStringLiteral("Chưa có ảnh xem trước cho mục này."));
     pictureFile_.clear();
 }
 
-std::filesystem::path AddedPreviewPicture(const std::filesystem::path& toolFolder,
+std::filesystem::path addedPreviewPicture(const std::filesystem::path& toolFolder,
                                           catalog::GroupId group, std::string_view name) {
     const std::filesystem::path folder = platform::ResolveCaseInsensitive(
         toolFolder / "extras" / platform::PathFromUtf8(catalog::GroupFolder(group)) /
@@ -181,7 +181,7 @@ std::filesystem::path AddedPreviewPicture(const std::filesystem::path& toolFolde
     return {};
 }
 
-QWidget* CreateAboutWindow(QWidget* owner) {
+QWidget* createAboutWindow(QWidget* owner) {
     return new TextWindow(
         owner, QStringLiteral("Thông tin"),
         {QStringLiteral("<b>Kickvane</b> phiên bản 2.0"),
@@ -194,7 +194,7 @@ QWidget* CreateAboutWindow(QWidget* owner) {
         Qt::RichText, 420);
 }
 
-QString HelpText() {
+QString helpText() {
     return QStringList{
         QStringLiteral("Hướng dẫn sử dụng:"),
         QStringLiteral(" 1. Tại thẻ đầu tiên các bạn chọn đường dẫn cài FIFA ONLINE 2."),
@@ -227,9 +227,9 @@ QString HelpText() {
         .join(QStringLiteral("\r\n"));
 }
 
-QWidget* CreateHelpWindow(QWidget* owner) {
+QWidget* createHelpWindow(QWidget* owner) {
     return new TextWindow(owner, QStringLiteral("Hướng dẫn"),
-                          {HelpText().replace(QStringLiteral("\r\n"), QStringLiteral("\n"))},
+                          {helpText().replace(QStringLiteral("\r\n"), QStringLiteral("\n"))},
                           Qt::PlainText, 520);
 }
 

@@ -13,12 +13,12 @@ namespace kickvane::shell {
 
 // The preview picture of a catalog label: "img\t<tab>_img_<index>.jpg" in the tool folder, or
 // an empty path for a label that has no preview.
-std::filesystem::path PreviewPicture(const std::filesystem::path& toolFolder,
+std::filesystem::path previewPicture(const std::filesystem::path& toolFolder,
                                      catalog::LabelArray labels, int index);
 
 // The preview picture of a variant the player added: "preview.jpg", else "preview.png", in its
 // folder (any letter case); empty when it has neither.
-std::filesystem::path AddedPreviewPicture(const std::filesystem::path& toolFolder,
+std::filesystem::path addedPreviewPicture(const std::filesystem::path& toolFolder,
                                           catalog::GroupId group, std::string_view name);
 
 // "Xem trước": one picture scaled to the window, which opens centred on the main window's
@@ -28,9 +28,9 @@ class PreviewWindow final : public QWidget {
     Q_OBJECT
 public:
     explicit PreviewWindow(QWidget* owner);
-    void ShowPicture(const std::filesystem::path& file);
+    void showPicture(const std::filesystem::path& file);
     // The note that the entry has no preview picture, in place of any picture shown before.
-    void ShowNoPicture();
+    void showNoPicture();
     const QString& pictureFile() const { return pictureFile_; }
 
 protected:
@@ -45,15 +45,15 @@ private:
 // frame on the right, else on the left, when it fits in the work area `area`; otherwise centred
 // over the owner, its bottom above `keepClearTop` (the top of the owner's command buttons) when
 // there is room. Always inside the work area as far as the window's size allows.
-QPoint SideWindowPosition(const QRect& area, const QRect& ownerFrame, int keepClearTop,
+QPoint sideWindowPosition(const QRect& area, const QRect& ownerFrame, int keepClearTop,
                           const QSize& size);
 
 // "Thông tin": the tool's name and version. It and the help window close with their button
 // "Đóng" or with Escape.
-QWidget* CreateAboutWindow(QWidget* owner);
+QWidget* createAboutWindow(QWidget* owner);
 
 // "Hướng dẫn": the user guide.
-QWidget* CreateHelpWindow(QWidget* owner);
-QString HelpText();
+QWidget* createHelpWindow(QWidget* owner);
+QString helpText();
 
 }  // namespace kickvane::shell

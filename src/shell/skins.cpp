@@ -1,12 +1,5 @@
 #include "shell/skins.h"
 
-#include <algorithm>
-#include <cmath>
-
-#include <QApplication>
-#include <QPalette>
-#include <QWidget>
-
 #include "platform/filesystem.h"
 #include "shell/catalog_panels.h"
 #include "shell/qt_text.h"
@@ -14,63 +7,17 @@
 
 namespace kickvane::shell {
 
-void Paint(QWidget* widget, const QColor& background, const QColor& text) {
-    QPalette palette = widget->palette();
-    palette.setColor(QPalette::Window, background);
-    palette.setColor(QPalette::WindowText, text);
-    widget->setPalette(palette);
-    widget->setAutoFillBackground(true);
-}
-
-SkinLook LightSkin() {
-    return {QStringLiteral("skin1"),
-            kEntryBackground,
-            Qt::black,
-            kLabelBackground,
-            Qt::white,
-            Qt::black,
-            QColor(0xC0, 0x00, 0x00),
-            QColor(0xF0, 0xF0, 0xF0)};
-}
-
-SkinLook DarkSkin() {
-    // The labels take the system's menu text colour as their background. The tick boxes and
-    // option buttons are drawn on the entries' own dark colour, not on light squares.
-    const QColor entry(0x40, 0x40, 0x40);
-    return {QStringLiteral("skin2"),
-            entry,
-            Qt::white,
-            QApplication::palette().color(QPalette::Active, QPalette::WindowText),
-            entry,
-            Qt::white,
-            QColor(0xFF, 0x80, 0x80),
-            QColor(0x30, 0x30, 0x30)};
-}
-
-double ContrastRatio(const QColor& a, const QColor& b) {
-    const auto luminance = [](const QColor& colour) {
-        const auto linear = [](double channel) {
-            return channel <= 0.04045 ? channel / 12.92 : std::pow((channel + 0.055) / 1.055, 2.4);
-        };
-        return 0.2126 * linear(colour.redF()) + 0.7152 * linear(colour.greenF()) +
-               0.0722 * linear(colour.blueF());
-    };
-    const double first = luminance(a);
-    const double second = luminance(b);
-    return (std::max(first, second) + 0.05) / (std::min(first, second) + 0.05);
-}
-
 WindowSkins::WindowSkins(std::filesystem::path toolFolder, CatalogPanels& panels)
     : toolFolder_(std::move(toolFolder)), panels_(panels) {}
 
 QString WindowSkins::skinFile(const QString& skin, const QString& suffix) const {
-    return PathToQString(
-        platform::ResolveCaseInsensitive(toolFolder_ / "skin" / QStringToPath(skin + suffix)));
+    return pathToQString(
+        platform::ResolveCaseInsensitive(toolFolder_ / "skin" / qStringToPath(skin + suffix)));
 }
 
 void WindowSkins::initialise() {
-    panels_.layoutPanels(skinFile(LightSkin().name, QStringLiteral("_panel.jpg")));
-    LoadPicture(background_, skinFile(activeSkin_, QStringLiteral("_bg.jpg")));
+    panels_.layoutPanels(skinFile(lightSkin().name, QStringLiteral("_panel.jpg")));
+    loadPicture(background_, skinFile(activeSkin_, QStringLiteral("_bg.jpg")));
     paintTabs();
 }
 
@@ -80,7 +27,7 @@ void WindowSkins::paintTabs() {
 }
 
 void WindowSkins::apply(const SkinLook& look) {
-    LoadPicture(background_, skinFile(look.name, QStringLiteral("_bg.jpg")));
+    loadPicture(background_, skinFile(look.name, QStringLiteral("_bg.jpg")));
     panels_.layoutPanels(skinFile(look.name, QStringLiteral("_panel.jpg")));
     panels_.recolour(look);
     activeSkin_ = look.name;

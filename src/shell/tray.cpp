@@ -5,7 +5,7 @@
 
 namespace kickvane::shell {
 
-QString TrayToolTip(const QString& statusLine) {
+QString trayToolTip(const QString& statusLine) {
     QString tip = QString::fromLatin1(kTrayTooltip);
     if (!statusLine.isEmpty()) {
         tip += QLatin1Char('\n') + statusLine;
@@ -13,14 +13,14 @@ QString TrayToolTip(const QString& statusLine) {
     return tip;
 }
 
-void TrayIcon::SetStatusLine(const QString& line) {
+void TrayIcon::setStatusLine(const QString& line) {
     // One line only: a line break in it would push the name off a short tooltip.
     QString single = line.simplified();
     if (single == statusLine_) {
         return;
     }
     statusLine_ = std::move(single);
-    ToolTipChanged();
+    toolTipChanged();
 }
 
 SystemTrayIcon::SystemTrayIcon(const QIcon& icon, QMenu* menu, QObject* parent)
@@ -35,10 +35,10 @@ SystemTrayIcon::SystemTrayIcon(const QIcon& icon, QMenu* menu, QObject* parent)
                 }
             });
     hostWatch_.setInterval(1000);
-    connect(&hostWatch_, &QTimer::timeout, this, &SystemTrayIcon::ShowWhenHostAppears);
+    connect(&hostWatch_, &QTimer::timeout, this, &SystemTrayIcon::showWhenHostAppears);
 }
 
-void SystemTrayIcon::Add() {
+void SystemTrayIcon::add() {
     wanted_ = true;
     icon_.show();
     if (!QSystemTrayIcon::isSystemTrayAvailable()) {
@@ -46,21 +46,21 @@ void SystemTrayIcon::Add() {
     }
 }
 
-void SystemTrayIcon::Remove() {
+void SystemTrayIcon::remove() {
     wanted_ = false;
     hostWatch_.stop();
     icon_.hide();
 }
 
-bool SystemTrayIcon::Shown() const {
+bool SystemTrayIcon::shown() const {
     return wanted_ && icon_.isVisible() && QSystemTrayIcon::isSystemTrayAvailable();
 }
 
-void SystemTrayIcon::ToolTipChanged() {
+void SystemTrayIcon::toolTipChanged() {
     icon_.setToolTip(toolTip());
 }
 
-void SystemTrayIcon::ShowWhenHostAppears() {
+void SystemTrayIcon::showWhenHostAppears() {
     if (!wanted_ || !QSystemTrayIcon::isSystemTrayAvailable()) {
         return;
     }

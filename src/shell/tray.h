@@ -13,7 +13,7 @@ namespace kickvane::shell {
 inline constexpr const char* kTrayTooltip = "Kickvane v2.0";
 
 // The icon's tooltip: the tool's name and version, and below it a status line when there is one.
-QString TrayToolTip(const QString& statusLine);
+QString trayToolTip(const QString& statusLine);
 
 // The tool's entry in the notification area. The window adds it at start-up and removes it when
 // it closes or the user exits from the menu.
@@ -23,14 +23,14 @@ public:
     using QObject::QObject;
     ~TrayIcon() override = default;
 
-    virtual void Add() = 0;
-    virtual void Remove() = 0;
+    virtual void add() = 0;
+    virtual void remove() = 0;
     // A tray host shows the icon now; without one the window must stay reachable on screen.
-    virtual bool Shown() const = 0;
+    virtual bool shown() const = 0;
 
     // The tooltip's second line, such as the last patch run's result; empty leaves one line.
-    void SetStatusLine(const QString& line);
-    QString toolTip() const { return TrayToolTip(statusLine_); }
+    void setStatusLine(const QString& line);
+    QString toolTip() const { return trayToolTip(statusLine_); }
 
 signals:
     // The user clicked the icon: the window opens the menu at the mouse position.
@@ -38,7 +38,7 @@ signals:
 
 protected:
     // The tooltip has changed; an icon on screen shows the new one.
-    virtual void ToolTipChanged() {}
+    virtual void toolTipChanged() {}
 
 private:
     QString statusLine_;
@@ -51,15 +51,15 @@ class SystemTrayIcon final : public TrayIcon {
 public:
     SystemTrayIcon(const QIcon& icon, QMenu* menu, QObject* parent = nullptr);
 
-    void Add() override;
-    void Remove() override;
-    bool Shown() const override;
+    void add() override;
+    void remove() override;
+    bool shown() const override;
 
 protected:
-    void ToolTipChanged() override;
+    void toolTipChanged() override;
 
 private:
-    void ShowWhenHostAppears();
+    void showWhenHostAppears();
 
     QSystemTrayIcon icon_;
     QTimer hostWatch_;

@@ -7,8 +7,6 @@
 #include <QWidget>
 #include <utility>
 
-#include "catalog/ini.h"
-#include "catalog/settings.h"
 #include "shell/fetch_problem.h"
 #include "shell/message_box.h"
 #include "shell/qt_text.h"
@@ -23,22 +21,22 @@ namespace kickvane::shell {
 
 namespace {
 
-bool IsWebScheme(const QString& scheme) {
+bool isWebScheme(const QString& scheme) {
     return scheme.compare(u"http", Qt::CaseInsensitive) == 0 ||
            scheme.compare(u"https", Qt::CaseInsensitive) == 0;
 }
 
-int DefaultPort(const QString& scheme) {
+int defaultPort(const QString& scheme) {
     return scheme.compare(u"https", Qt::CaseInsensitive) == 0 ? 443 : 80;
 }
 
-QString Vni(std::string_view text) {
+QString fromVni(std::string_view text) {
     return QString::fromStdString(text::VniToUnicodeUtf8(text));
 }
 
 // A failure's reason with its last two words joined by a no-break space: a box that wraps it
 // carries the last word over together with the one before.
-QString WithLastWordsHeld(const QString& reason) {
+QString withLastWordsHeld(const QString& reason) {
     QString held = reason.trimmed();
     if (const qsizetype lastBlank = held.lastIndexOf(QLatin1Char(' ')); lastBlank > 0) {
         held[lastBlank] = QChar::Nbsp;
@@ -46,26 +44,26 @@ QString WithLastWordsHeld(const QString& reason) {
     return held;
 }
 
-const QString kTimedOut = FetchProblemText(FetchProblem::TimedOut);
-const QString kTooLarge = FetchProblemText(FetchProblem::TooLarge);
-const QString kRedirectRefused = FetchProblemText(FetchProblem::RedirectRefused);
-const QString kTooManyRedirects = FetchProblemText(FetchProblem::TooManyRedirects);
-const QString kBadHost = FetchProblemText(FetchProblem::BadHost);
+const QString kTimedOut = fetchProblemText(FetchProblem::TimedOut);
+const QString kTooLarge = fetchProblemText(FetchProblem::TooLarge);
+const QString kRedirectRefused = fetchProblemText(FetchProblem::RedirectRefused);
+const QString kTooManyRedirects = fetchProblemText(FetchProblem::TooManyRedirects);
+const QString kBadHost = fetchProblemText(FetchProblem::BadHost);
 
 }  // namespace
 
-bool IsCurrentVersion(std::string_view text) {
+bool isCurrentVersion(std::string_view text) {
     return VersionFromAnswer(text) == kToolVersion;
 }
 
-QString CheckFailedText(const QString& reason) {
-    return QStringLiteral("Không kiểm tra được phiên bản mới:\n") + WithLastWordsHeld(reason);
+QString checkFailedText(const QString& reason) {
+    return QStringLiteral("Không kiểm tra được phiên bản mới:\n") + withLastWordsHeld(reason);
 }
 
-QString NewerVersionText(std::string_view version) {
+QString newerVersionText(std::string_view version) {
     // Only the tool's own VNI-typed words are converted: a fetched "beta1" must not become
     // "betá".
-    return Vni("D9a4 co1 phie6n ba3n mo71i! ") + ToQString(version);
+    return fromVni("D9a4 co1 phie6n ba3n mo71i! ") + toQString(version);
 }
 
 UpdateCheck::UpdateCheck(Options options, QObject* parent)
@@ -83,20 +81,20 @@ UpdateCheck::~UpdateCheck() {
     release(File::Link);
 }
 
-QUrl UpdateCheck::DefaultHost() {
+QUrl UpdateCheck::defaultHost() {
     const QString fromEnvironment = qEnvironmentVariable("KICKVANE_UPDATE_HOST").trimmed();
     return QUrl(fromEnvironment.isEmpty() ? QString::fromUtf8(KICKVANE_UPDATE_HOST)
                                           : fromEnvironment);
 }
 
-UpdateCheck::Options UpdateCheck::DefaultOptions() {
+UpdateCheck::Options UpdateCheck::defaultOptions() {
     Options options;
-    options.host = DefaultHost();
+    options.host = defaultHost();
     return options;
 }
 
-bool UpdateCheck::AllowsRedirect(const QUrl& origin, const QUrl& current, const QUrl& target) {
-    if (!target.isValid() || !IsWebScheme(target.scheme()) || target.host().isEmpty() ||
+bool UpdateCheck::allowsRedirect(const QUrl& origin, const QUrl& current, const QUrl& target) {
+    if (!target.isValid() || !isWebScheme(target.scheme()) || target.host().isEmpty() ||
         target.host().compare(origin.host(), Qt::CaseInsensitive) != 0) {
         return false;
     }
@@ -105,8 +103,8 @@ bool UpdateCheck::AllowsRedirect(const QUrl& origin, const QUrl& current, const 
         return false;  // never back to plain http
     }
     if (target.scheme().compare(origin.scheme(), Qt::CaseInsensitive) == 0) {
-        return target.port(DefaultPort(target.scheme())) ==
-               origin.port(DefaultPort(origin.scheme()));
+        return target.port(defaultPort(target.scheme())) ==
+               origin.port(defaultPort(origin.scheme()));
     }
     // From http to https on the same host: the secure service sits on its usual port.
     return toHttps && target.port(443) == 443;
@@ -129,7 +127,7 @@ void UpdateCheck::fetch(File file) {
     Transfer& t = transfer(file);
     const QUrl url = address(file);
     t.deadline.start(options_.timeout);
-    if (!url.isValid() || !IsWebScheme(url.scheme()) || url.host().isEmpty()) {
+    if (!url.isValid() || !isWebScheme(url.scheme()) || url.host().isEmpty()) {
         // Reported from the event loop like every other outcome.
         t.earlyFailure = kBadHost;
         t.deadline.start(0);
@@ -193,7 +191,7 @@ void UpdateCheck::follow(File file, const QUrl& target) {
     const QUrl next = t.current.resolved(target);
     if (++t.redirects > kMaxRedirects) {
         fail(file, kTooManyRedirects);
-    } else if (!AllowsRedirect(address(file), t.current, next)) {
+    } else if (!allowsRedirect(address(file), t.current, next)) {
         fail(file, kRedirectRefused);
     } else {
         drop(t);
@@ -212,11 +210,11 @@ void UpdateCheck::onFinished(File file, QNetworkReply* reply) {
     if (code >= 300 && code < 400 && target.isValid()) {
         follow(file, target.toUrl());
     } else if (status.isValid() && (code < 200 || code >= 300)) {
-        fail(file, FetchProblemText(FetchProblem::HttpStatus, code));
+        fail(file, fetchProblemText(FetchProblem::HttpStatus, code));
     } else if (reply->error() != QNetworkReply::NoError) {
-        fail(file, NetworkErrorText(reply->error()));
+        fail(file, networkErrorText(reply->error()));
     } else if (!status.isValid()) {
-        fail(file, FetchProblemText(FetchProblem::NotHttp));
+        fail(file, fetchProblemText(FetchProblem::NotHttp));
     } else {
         succeed(file);
     }
@@ -261,23 +259,21 @@ void UpdateCheck::fail(File file, const QString& reason) {
     }
 }
 
-UpdateFlow::UpdateFlow(UpdateCheck::Options options, std::filesystem::path toolFolder,
-                       Dialogs& dialogs, QWidget* owner, QPushButton* checkButton,
-                       QPushButton* downloadButton, session::UpdateState& state, UrlOpener openUrl,
-                       QObject* parent)
+UpdateFlow::UpdateFlow(UpdateCheck::Options options, session::Session& session, Dialogs& dialogs,
+                       QWidget* owner, QPushButton* checkButton, QPushButton* downloadButton,
+                       UrlOpener openUrl, QObject* parent)
     : QObject(parent),
       updates_(std::move(options)),
-      toolFolder_(std::move(toolFolder)),
+      session_(session),
       dialogs_(dialogs),
       owner_(owner),
       checkButton_(checkButton),
       downloadButton_(downloadButton),
-      state_(state),
       openUrl_(std::move(openUrl)) {
     connect(&updates_, &UpdateCheck::versionFetched, this, &UpdateFlow::onVersion);
     connect(&updates_, &UpdateCheck::versionFailed, this, &UpdateFlow::onVersionFailed);
     connect(&updates_, &UpdateCheck::linkFetched, this, [this](const QString& text) {
-        state_.downloadLink = text.toStdString();
+        session_.RecordDownloadLink(text.toStdString());
         link_ = LinkState::Fetched;
         emit linkFinished();
     });
@@ -313,12 +309,12 @@ void UpdateFlow::onVersion(const QString& text) {
         return;
     }
     checking_ = false;
-    state_.versionText = *version;
     if (checkButton_) {
         checkButton_->setEnabled(true);
     }
     if (*version == kToolVersion) {
-        showMessage(Vni("Chu7a co1 phie6n ba3n mo71i"), Dialogs::Icon::Information);
+        session_.KeepVersion(*version);
+        showMessage(fromVni("Chu7a co1 phie6n ba3n mo71i"), Dialogs::Icon::Information);
         emit checkFinished();
         return;
     }
@@ -330,11 +326,11 @@ void UpdateFlow::onVersion(const QString& text) {
     }
     // Nothing reads the key back, so a failed write must not keep the user from hearing about
     // the new version.
-    (void)catalog::WriteIni(catalog::SettingsFile(toolFolder_), "KiemTra", "PhienBan", *version);
+    (void)session_.RecordNewVersion(*version);
     if (downloadButton_) {
         downloadButton_->show();
     }
-    showMessage(NewerVersionText(*version), Dialogs::Icon::Information);
+    showMessage(newerVersionText(*version), Dialogs::Icon::Information);
     emit checkFinished();
 }
 
@@ -343,21 +339,21 @@ void UpdateFlow::onVersionFailed(const QString& reason) {
     if (checkButton_) {
         checkButton_->setEnabled(true);
     }
-    showMessage(CheckFailedText(reason), Dialogs::Icon::Warning);
+    showMessage(checkFailedText(reason), Dialogs::Icon::Warning);
     emit checkFinished();
 }
 
 void UpdateFlow::download() {
-    const std::optional<std::string> link = DownloadLink(state_.downloadLink);
+    const std::optional<std::string> link = DownloadLink(session_.Updates().downloadLink);
     const QUrl url = link ? QUrl(QString::fromStdString(*link), QUrl::TolerantMode) : QUrl();
-    if (!url.isValid() || !IsWebScheme(url.scheme()) || url.host().isEmpty()) {
+    if (!url.isValid() || !isWebScheme(url.scheme()) || url.host().isEmpty()) {
         if (link_ == LinkState::Pending) {
             showMessage(
                 QStringLiteral("Chưa nhận được đường dẫn tải về, xin thử lại sau giây lát."),
                 Dialogs::Icon::Information);
         } else if (link_ == LinkState::Failed) {
             showMessage(QStringLiteral("Không lấy được đường dẫn tải về:\n") +
-                            WithLastWordsHeld(linkFailure_),
+                            withLastWordsHeld(linkFailure_),
                         Dialogs::Icon::Warning);
         } else {
             showMessage(QStringLiteral("Đường dẫn tải về không hợp lệ."), Dialogs::Icon::Warning);
@@ -370,7 +366,7 @@ void UpdateFlow::download() {
 }
 
 void UpdateFlow::showMessage(const QString& text, Dialogs::Icon icon) {
-    dialogs_.ShowMessage(owner_.data(), NoticeTitle(), text, icon);
+    dialogs_.showMessage(owner_.data(), noticeTitle(), text, icon);
 }
 
 }  // namespace kickvane::shell

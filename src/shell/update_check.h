@@ -34,14 +34,14 @@ using text::VersionFromAnswer;
 
 // True when the fetched answer names this tool's version (blanks and line ends around it do not
 // count).
-bool IsCurrentVersion(std::string_view text);
+bool isCurrentVersion(std::string_view text);
 
 // The message for a check that could not be done. Its reason starts a line of its own, and the
 // reason's last two words are held together, so that no word stands alone on the last line.
-QString CheckFailedText(const QString& reason);
+QString checkFailedText(const QString& reason);
 
 // The message for a newer version: the tool's own words, then the version exactly as it came.
-QString NewerVersionText(std::string_view version);
+QString newerVersionText(std::string_view version);
 
 // Fetches the version file ("v" at the host's root) and the link file ("vlink") from the update
 // host, each on its own, without blocking. Answers stay in memory and never come from a cache.
@@ -65,12 +65,12 @@ public:
     ~UpdateCheck() override;
 
     // KICKVANE_UPDATE_HOST from the environment when set, else the host the build was made for.
-    static QUrl DefaultHost();
+    static QUrl defaultHost();
     // The options the tool runs with: the default host, 10 s and 64 KiB per fetch.
-    static Options DefaultOptions();
+    static Options defaultOptions();
 
     // Whether a fetch that started at `origin` and now stands at `current` may go on to `target`.
-    static bool AllowsRedirect(const QUrl& origin, const QUrl& current, const QUrl& target);
+    static bool allowsRedirect(const QUrl& origin, const QUrl& current, const QUrl& target);
 
     QUrl address(File file) const;
     bool isFetching(File file) const;
@@ -117,16 +117,15 @@ private:
 
 // What the window's update buttons do. The window creates the buttons (check visible, download
 // hidden) and connects their clicks to check() and download(). The fetched version and link go
-// into `state`; buttons and state must outlive the flow.
+// to the session; buttons and session must outlive the flow.
 class UpdateFlow final : public QObject {
     Q_OBJECT
 public:
     using UrlOpener = std::function<bool(const QUrl&)>;
 
-    UpdateFlow(UpdateCheck::Options options, std::filesystem::path toolFolder, Dialogs& dialogs,
+    UpdateFlow(UpdateCheck::Options options, session::Session& session, Dialogs& dialogs,
                QWidget* owner, QPushButton* checkButton, QPushButton* downloadButton,
-               session::UpdateState& state, UrlOpener openUrl = &QDesktopServices::openUrl,
-               QObject* parent = nullptr);
+               UrlOpener openUrl = &QDesktopServices::openUrl, QObject* parent = nullptr);
 
     // Asks the host for its version. The check button stays disabled until the answer is in;
     // a newer version swaps the check button for the download button for good.
@@ -148,12 +147,11 @@ private:
     void showMessage(const QString& text, Dialogs::Icon icon);
 
     UpdateCheck updates_;
-    std::filesystem::path toolFolder_;
+    session::Session& session_;
     Dialogs& dialogs_;
     QPointer<QWidget> owner_;
     QPointer<QPushButton> checkButton_;
     QPointer<QPushButton> downloadButton_;
-    session::UpdateState& state_;
     UrlOpener openUrl_;
     bool checking_ = false;
     LinkState link_ = LinkState::NotAsked;

@@ -12,7 +12,7 @@ namespace kickvane::shell {
 
 namespace {
 
-bool IsActivationKey(const QKeyEvent& event) {
+bool isActivationKey(const QKeyEvent& event) {
     if ((event.modifiers() & ~Qt::KeypadModifier) != Qt::NoModifier) {
         return false;
     }
@@ -21,7 +21,7 @@ bool IsActivationKey(const QKeyEvent& event) {
 }
 
 // A dotted frame over a light line, readable on the light and the dark skin alike.
-void DrawFocusFrame(QPainter& painter, const QRect& frame) {
+void drawFocusFrame(QPainter& painter, const QRect& frame) {
     painter.setBrush(Qt::NoBrush);
     painter.setPen(QPen(QColor(255, 255, 255, 220), 1));
     painter.drawRect(frame);
@@ -61,7 +61,7 @@ private:
     void (*press_)(QWidget*);
 };
 
-QAccessibleInterface* AccessibleFor(const QString&, QObject* object) {
+QAccessibleInterface* accessibleFor(const QString&, QObject* object) {
     if (auto* tab = qobject_cast<TabHead*>(object)) {
         return new ClickableAccessible(
             tab, QAccessible::PageTab,
@@ -77,9 +77,9 @@ QAccessibleInterface* AccessibleFor(const QString&, QObject* object) {
     return nullptr;
 }
 
-void InstallAccessibility() {
+void installAccessibility() {
     static const bool installed = [] {
-        QAccessible::installFactory(&AccessibleFor);
+        QAccessible::installFactory(&accessibleFor);
         return true;
     }();
     (void)installed;
@@ -87,21 +87,21 @@ void InstallAccessibility() {
 
 }  // namespace
 
-void FocusCue::FocusIn(Qt::FocusReason reason) {
+void FocusCue::focusIn(Qt::FocusReason reason) {
     // Coming back to the window keeps whatever the focus looked like before.
     if (reason != Qt::ActiveWindowFocusReason && reason != Qt::PopupFocusReason) {
         keyboard_ = reason != Qt::MouseFocusReason;
     }
 }
 
-bool FocusCue::KeyPressed(QWidget& widget, const QKeyEvent& event) {
+bool FocusCue::keyPressed(QWidget& widget, const QKeyEvent& event) {
     if (!std::exchange(keyboard_, true)) {
         widget.update();
     }
-    return IsActivationKey(event);
+    return isActivationKey(event);
 }
 
-bool LoadPicture(QPixmap& pixmap, const QString& file) {
+bool loadPicture(QPixmap& pixmap, const QString& file) {
     // The same few skin pictures are drawn on every tab switch and by all four panels: decode
     // each file once and share it.
     QPixmap loaded;
@@ -116,7 +116,7 @@ bool LoadPicture(QPixmap& pixmap, const QString& file) {
 }
 
 ClickableLabel::ClickableLabel(const QString& text, QWidget* parent) : QLabel(text, parent) {
-    InstallAccessibility();
+    installAccessibility();
     setFocusPolicy(Qt::StrongFocus);
     setAccessibleDescription(QStringLiteral("Xem ảnh minh hoạ"));
 }
@@ -127,7 +127,7 @@ void ClickableLabel::enterEvent(QEnterEvent* event) {
 }
 
 void ClickableLabel::keyPressEvent(QKeyEvent* event) {
-    if (focusCue_.KeyPressed(*this, *event)) {
+    if (focusCue_.keyPressed(*this, *event)) {
         emit clicked();
         return;
     }
@@ -135,15 +135,15 @@ void ClickableLabel::keyPressEvent(QKeyEvent* event) {
 }
 
 void ClickableLabel::focusInEvent(QFocusEvent* event) {
-    focusCue_.FocusIn(event->reason());
+    focusCue_.focusIn(event->reason());
     QLabel::focusInEvent(event);
 }
 
 void ClickableLabel::paintEvent(QPaintEvent* event) {
     QLabel::paintEvent(event);
-    if (focusCue_.Shown(*this)) {
+    if (focusCue_.shown(*this)) {
         QPainter painter(this);
-        DrawFocusFrame(painter, rect().adjusted(0, 0, -1, -1));
+        drawFocusFrame(painter, rect().adjusted(0, 0, -1, -1));
     }
 }
 
@@ -172,7 +172,7 @@ void HotkeyBox::wheelEvent(QWheelEvent* event) {
 }
 
 bool PictureBox::setPictureFile(const QString& file) {
-    if (!LoadPicture(picture_, file)) {
+    if (!loadPicture(picture_, file)) {
         return false;
     }
     pictureFile_ = file;
@@ -201,13 +201,13 @@ void PictureBox::mouseReleaseEvent(QMouseEvent* event) {
 }
 
 TabHead::TabHead(const QString& caption, QWidget* parent) : PictureBox(parent), caption_(caption) {
-    InstallAccessibility();
+    installAccessibility();
     setCursor(Qt::PointingHandCursor);
     setFocusPolicy(Qt::StrongFocus);
 }
 
 void TabHead::keyPressEvent(QKeyEvent* event) {
-    if (focusCue_.KeyPressed(*this, *event)) {
+    if (focusCue_.keyPressed(*this, *event)) {
         emit clicked();
         return;
     }
@@ -240,7 +240,7 @@ void TabHead::keyPressEvent(QKeyEvent* event) {
 }
 
 void TabHead::focusInEvent(QFocusEvent* event) {
-    focusCue_.FocusIn(event->reason());
+    focusCue_.focusIn(event->reason());
     PictureBox::focusInEvent(event);
 }
 
@@ -255,8 +255,8 @@ void TabHead::paintEvent(QPaintEvent* event) {
     painter.drawText(rect().translated(1, 1), Qt::AlignCenter, caption_);
     painter.setPen(QColor(0x20, 0x30, 0x40));
     painter.drawText(rect(), Qt::AlignCenter, caption_);
-    if (focusCue_.Shown(*this)) {
-        DrawFocusFrame(painter, rect().adjusted(2, 2, -3, -3));
+    if (focusCue_.shown(*this)) {
+        drawFocusFrame(painter, rect().adjusted(2, 2, -3, -3));
     }
 }
 

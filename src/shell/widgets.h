@@ -13,17 +13,17 @@ namespace kickvane::shell {
 
 // Loads a picture file into `pixmap`; a file that is missing or no readable picture leaves the
 // previous picture and returns false.
-bool LoadPicture(QPixmap& pixmap, const QString& file);
+bool loadPicture(QPixmap& pixmap, const QString& file);
 
 // Whether a focused widget draws its focus frame: not while the focus came from a mouse click,
 // as on Windows; from the first key press on, or when the keyboard brought the focus, it does.
 class FocusCue {
 public:
-    void FocusIn(Qt::FocusReason reason);
+    void focusIn(Qt::FocusReason reason);
     // A key pressed in `widget`: the frame becomes due (the widget repaints when it just did).
     // True when the key activates the widget: Space or Enter.
-    bool KeyPressed(QWidget& widget, const QKeyEvent& event);
-    bool Shown(const QWidget& widget) const { return keyboard_ && widget.hasFocus(); }
+    bool keyPressed(QWidget& widget, const QKeyEvent& event);
+    bool shown(const QWidget& widget) const { return keyboard_ && widget.hasFocus(); }
 
 private:
     bool keyboard_ = false;

@@ -61,7 +61,7 @@ TEST(AddedVariants, FoldersBesideTheCatalogsSetsAreVariantsOfTheirGroup) {
     EXPECT_EQ(Names(list, GroupId::Mark), std::vector<std::string>{"Mũi tên"});
     for (const VariantGroup& group : Groups()) {
         EXPECT_TRUE(list.Skipped(group.id).empty());
-        EXPECT_EQ(list.folderState(group.id), GroupFolderState::Listed);
+        EXPECT_EQ(list.FolderState(group.id), GroupFolderState::Listed);
     }
     EXPECT_EQ(list.Of(GroupId::Mark)[0].SourceFolder(), "\\Indicator\\Mũi tên");
 }
@@ -141,11 +141,11 @@ TEST(AddedVariants, CaseTwinsLongNamesLinksAndUnreadableFolders) {
                                               {"Mine", R::CaseTwin},
                                               {"ucl 2011", R::CaseTwin},
                                           }));
-    EXPECT_EQ(list.folderState(GroupId::Mark), GroupFolderState::Missing);
+    EXPECT_EQ(list.FolderState(GroupId::Mark), GroupFolderState::Missing);
     if (::geteuid() != 0) {  // root reads any folder
         EXPECT_EQ(Skips(list, GroupId::Pitch),
                   (std::vector<std::pair<std::string, SkipReason>>{{"Locked", R::Unreadable}}));
-        EXPECT_EQ(list.folderState(GroupId::Adboard), GroupFolderState::Unreadable);
+        EXPECT_EQ(list.FolderState(GroupId::Adboard), GroupFolderState::Unreadable);
     }
     fs::permissions(tool / "extras/pitch/Locked", fs::perms::owner_all);
     fs::permissions(tool / "extras/adboard", fs::perms::owner_all);
@@ -176,8 +176,8 @@ TEST(AddedVariantSettings, ChosenAddedVariantsRoundTripAfterTheCatalogKeys) {
     TempDir tool;
     const AddedVariants added = OneOfEach();
     Settings saved{"C:\\Games", "F7", PatchSelection::Defaults()};
-    saved.selection.setAddedValue(GroupId::Ball, "World Cup 2026", true);
-    saved.selection.setAddedValue(GroupId::Pitch, "Sọc", true);
+    saved.selection.SetAddedValue(GroupId::Ball, "World Cup 2026", true);
+    saved.selection.SetAddedValue(GroupId::Pitch, "Sọc", true);
     ASSERT_TRUE(SaveSettings(tool.path(), saved, added).ok());
 
     const std::string text = ReadText(tool / "ThietLap.ini");
@@ -190,15 +190,15 @@ TEST(AddedVariantSettings, ChosenAddedVariantsRoundTripAfterTheCatalogKeys) {
     EXPECT_EQ(loaded.settings.selection, saved.selection);
     EXPECT_TRUE(loaded.gone.empty());
     // The adboard's and mark's catalog choices stayed, although they share the section.
-    EXPECT_EQ(loaded.settings.selection.chosen(GroupId::Mark), 8);
+    EXPECT_EQ(loaded.settings.selection.Chosen(GroupId::Mark), 8);
 }
 
 TEST(AddedVariantSettings, GoneChosenVariantFallsBackToTheDefaultAndIsDroppedAtTheNextSave) {
     TempDir tool;
     AddedVariants before = OneOfEach();
     Settings saved{"C:\\Games", "F7", PatchSelection::Defaults()};
-    saved.selection.setAddedValue(GroupId::Ball, "World Cup 2026", true);
-    saved.selection.setAddedValue(GroupId::Mark, "Mũi tên", true);
+    saved.selection.SetAddedValue(GroupId::Ball, "World Cup 2026", true);
+    saved.selection.SetAddedValue(GroupId::Mark, "Mũi tên", true);
     ASSERT_TRUE(SaveSettings(tool.path(), saved, before).ok());
 
     AddedVariants after;  // the ball's and the mark's folders are gone, the pitch's stays
@@ -206,9 +206,9 @@ TEST(AddedVariantSettings, GoneChosenVariantFallsBackToTheDefaultAndIsDroppedAtT
     const LoadedSettings loaded = LoadSettings(tool.path(), after);
     EXPECT_EQ(loaded.gone, (std::vector<GoneChoice>{{GroupId::Ball, "World Cup 2026"},
                                                     {GroupId::Mark, "Mũi tên"}}));
-    EXPECT_EQ(loaded.settings.selection.chosenOption(GroupId::Ball)->key, "Europa League 2011");
-    EXPECT_EQ(loaded.settings.selection.chosenOption(GroupId::Mark)->key, "MarkMacDinh");
-    EXPECT_EQ(loaded.settings.selection.chosenOption(GroupId::Pitch)->key, "CoMacDinh");
+    EXPECT_EQ(loaded.settings.selection.ChosenOption(GroupId::Ball)->key, "Europa League 2011");
+    EXPECT_EQ(loaded.settings.selection.ChosenOption(GroupId::Mark)->key, "MarkMacDinh");
+    EXPECT_EQ(loaded.settings.selection.ChosenOption(GroupId::Pitch)->key, "CoMacDinh");
 
     ASSERT_TRUE(SaveSettings(tool.path(), loaded.settings, after).ok());
     const std::string text = ReadText(tool / "ThietLap.ini");
@@ -225,7 +225,7 @@ TEST(AddedVariantSettings, GoneVariantThatWasNotChosenChangesNothing) {
               "Old Ball=False\r\n");
     const LoadedSettings loaded = LoadSettings(tool.path(), OneOfEach());
     EXPECT_TRUE(loaded.gone.empty());
-    EXPECT_EQ(loaded.settings.selection.chosen(GroupId::Ball), 3);
+    EXPECT_EQ(loaded.settings.selection.Chosen(GroupId::Ball), 3);
 }
 
 }  // namespace

@@ -31,11 +31,11 @@ TEST(Settings, SaveThenLoadRestoresEverySwitchAndVariant) {
     TempDir tool;
     Settings saved{"/home/player/.wine/drive_c/Program Files/Garena/FIFA Online 2 with a long name",
                    "F3", PatchSelection::Defaults()};
-    saved.selection.setSwitchValue(0, 0);
-    saved.selection.setSwitchValue(12, 1);
-    saved.selection.setOptionValue(OptionArray::Ball, 3, true);
-    saved.selection.setOptionValue(OptionArray::Other, 6, true);
-    saved.selection.setOptionValue(OptionArray::Other, 8, false);  // mark: none chosen
+    saved.selection.SetSwitchValue(0, 0);
+    saved.selection.SetSwitchValue(12, 1);
+    saved.selection.SetOptionValue(OptionArray::Ball, 3, true);
+    saved.selection.SetOptionValue(OptionArray::Other, 6, true);
+    saved.selection.SetOptionValue(OptionArray::Other, 8, false);  // mark: none chosen
     ASSERT_TRUE(SaveSettings(tool.path(), saved).ok());
 
     const Settings loaded = LoadSettings(tool.path()).settings;
@@ -52,22 +52,22 @@ TEST(Settings, LoadTakesValuesKeyByKey) {
               "[Bong]\nMacDinh=True\nUCL 2011=true\n"
               "[Khac]\nQcaoMacDinh=False\nCoMacDinh=0\nMarkMacDinh=maybe\n");
     Settings settings;  // as the widgets are before the load
-    settings.selection.setSwitchValue(0, 1);
+    settings.selection.SetSwitchValue(0, 1);
     ASSERT_TRUE(LoadSettings(tool.path(), settings).ok());
 
     EXPECT_EQ(settings.gameFolder, "");               // empty value, not the default
     EXPECT_EQ(settings.hotkey, "f7");                 // handed over unchanged
-    EXPECT_EQ(settings.selection.switchValue(0), 1);  // "abc" leaves the switch as it was
-    EXPECT_FALSE(settings.selection.isOn(1));
-    EXPECT_TRUE(settings.selection.isOn(2));
-    EXPECT_EQ(settings.selection.switchValue(3), 2);
-    EXPECT_TRUE(settings.selection.isOn(4));  // missing key: default
+    EXPECT_EQ(settings.selection.SwitchValue(0), 1);  // "abc" leaves the switch as it was
+    EXPECT_FALSE(settings.selection.IsOn(1));
+    EXPECT_TRUE(settings.selection.IsOn(2));
+    EXPECT_EQ(settings.selection.SwitchValue(3), 2);
+    EXPECT_TRUE(settings.selection.IsOn(4));  // missing key: default
     // The last "True" of a group wins; a group read as all false keeps nothing.
-    EXPECT_EQ(settings.selection.chosenOption(GroupId::Ball)->key, "UCL 2011");
-    EXPECT_FALSE(settings.selection.chosen(GroupId::Adboard).has_value());
-    EXPECT_FALSE(settings.selection.chosen(GroupId::Pitch).has_value());
+    EXPECT_EQ(settings.selection.ChosenOption(GroupId::Ball)->key, "UCL 2011");
+    EXPECT_FALSE(settings.selection.Chosen(GroupId::Adboard).has_value());
+    EXPECT_FALSE(settings.selection.Chosen(GroupId::Pitch).has_value());
     // "maybe" is no truth value: the button keeps its state instead of taking the default.
-    EXPECT_FALSE(settings.selection.chosen(GroupId::Mark).has_value());
+    EXPECT_FALSE(settings.selection.Chosen(GroupId::Mark).has_value());
 }
 
 // A settings file under another letter case is the settings readers' and writers' own test.

@@ -51,8 +51,7 @@ TEST(TwoAtOnce, SavesOfOneSettingsFileNeverFailEachOther) {
 TEST(TwoAtOnce, AppliesOnOneGameFolderBothSucceed) {
     TempDir dir;
     MakeToolFolder(dir / "tool");
-    WriteFile(dir / "tool/ThietLap.ini",
-              "[Thay doi]\r\nBong=1\r\nCo=1\r\nGdien=1\r\nSVD=1\r\n");
+    WriteFile(dir / "tool/ThietLap.ini", "[Thay doi]\r\nBong=1\r\nCo=1\r\nGdien=1\r\nSVD=1\r\n");
     const auto apply = [&](const fs::path& game, const char* log) {
         return std::make_unique<ChildProcess>(
             std::vector<std::string>{KICKVANE_BINARY, "apply", "--tool-folder",

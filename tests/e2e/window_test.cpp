@@ -115,7 +115,8 @@ TEST_F(WindowTest, FailedStepsOverTheGameShowTheAlertAndItsClickTheList) {
     const std::string gameWindow = FindWindow("the game", nullptr);
     Capture("xdotool key F7");
     ASSERT_TRUE(WindowShown("Alert", *kickvane)) << ReadText(dir_ / "kickvane.log");
-    EXPECT_TRUE(fs::exists(applied())) << ReadText(dir_ / "kickvane.log");  // the others went through
+    EXPECT_TRUE(fs::exists(applied()))
+        << ReadText(dir_ / "kickvane.log");  // the others went through
     EXPECT_EQ(Capture("xdotool getwindowfocus"), gameWindow + "\n");
     EXPECT_TRUE(FindWindow("Thông báo", *kickvane).empty());
     // Once it has risen into its place.

@@ -29,7 +29,7 @@ protected:
     static PatchSelection Only(std::initializer_list<int> categories) {
         PatchSelection selection = PatchSelection::Defaults();
         for (int i = 0; i < catalog::kCategoryCount; ++i) {
-            selection.setSwitchValue(
+            selection.SetSwitchValue(
                 i, static_cast<int>(std::count(categories.begin(), categories.end(), i)));
         }
         return selection;
@@ -105,12 +105,12 @@ TEST_F(ApplyTest, FailedStepsAreListedWithAReasonAndTheRunGoesOn) {
     fs::remove_all(game() / "zdata");
     fs::create_directories(game() / "data2/cmn/base.dds");  // a folder where the file goes
     PatchSelection selection = PatchSelection::Defaults();
-    selection.setSwitchValue(12, 1);
-    selection.setSwitchValue(13, 1);
-    selection.setOptionValue(OptionArray::Other, 5, true);  // pitch Caro
+    selection.SetSwitchValue(12, 1);
+    selection.SetSwitchValue(13, 1);
+    selection.SetOptionValue(OptionArray::Other, 5, true);  // pitch Caro
     const ApplyOutcome outcome = Apply(selection);
 
-    ASSERT_FALSE(outcome.stopped());
+    ASSERT_FALSE(outcome.Stopped());
     for (const StepOutcome& step : outcome.steps) {
         const bool blocked = step.step.target.root == Root::ZData || step.step.category == 5;
         EXPECT_EQ(step.state == StepState::Failed, blocked) << Describe(step.step);
@@ -121,9 +121,14 @@ TEST_F(ApplyTest, FailedStepsAreListedWithAReasonAndTheRunGoesOn) {
     EXPECT_FALSE(outcome.signalSound.empty());
 }
 
+// A pitch variant leaves its own grass and the shared textures in the main tree, with the base
+// set's dirt and lines over the variant's, and the second tree's pitch back at the base set; it
+// touches nothing else in the game.
 TEST_F(ApplyTest, PitchVariantEndsWithTheBaseSetsDirtAndLines) {
+    // An earlier run's pitch in the second tree is overwritten, not kept.
+    WriteFile(game() / "zdata/data2/pitch/zbase.dds", "earlier variant");
     PatchSelection selection = Only({1});
-    selection.setOptionValue(OptionArray::Other, 5, true);
+    selection.SetOptionValue(OptionArray::Other, 5, true);
     // A trailing separator on the game folder names the same folders.
     EXPECT_TRUE(Apply(selection, "/").Failures().empty());
     const fs::path textures = game() / "data2/pitch/textures";
@@ -131,6 +136,19 @@ TEST_F(ApplyTest, PitchVariantEndsWithTheBaseSetsDirtAndLines) {
     EXPECT_EQ(ReadText(textures / "shadow.dds"), "shared shadow");
     EXPECT_EQ(ReadText(textures / "grass_dirt.dds"), "base dirt");
     EXPECT_EQ(ReadText(textures / "grass_pitchlines.dds"), "base lines");
+    EXPECT_EQ(ReadText(game() / "zdata/data2/pitch/zbase.dds"), "zbase pitch");
+
+    std::vector<std::string> files;
+    for (const auto& entry : fs::recursive_directory_iterator(game())) {
+        if (entry.is_regular_file()) {
+            files.push_back(entry.path().lexically_relative(game()).generic_string());
+        }
+    }
+    std::sort(files.begin(), files.end());
+    EXPECT_EQ(files, (std::vector<std::string>{
+                         "data2/pitch/textures/grass.dds", "data2/pitch/textures/grass_dirt.dds",
+                         "data2/pitch/textures/grass_pitchlines.dds",
+                         "data2/pitch/textures/shadow.dds", "zdata/data2/pitch/zbase.dds"}));
 }
 
 // A missing parent of the target fails the copy too; the failed steps above show that.

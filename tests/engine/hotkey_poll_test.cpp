@@ -26,7 +26,7 @@ TEST(HotkeyPoll, TicksOnlyForThePressedOrHeldKeyItKeeps) {
     // Names are compared exactly; one that names no key leaves F7 in use.
     for (const char* name : {"f7", "", "F13", "F7 "}) {
         EXPECT_FALSE(poll.SetHotkey(name)) << name;
-        EXPECT_EQ(poll.key(), kF7) << name;
+        EXPECT_EQ(poll.Key(), kF7) << name;
     }
     EXPECT_TRUE(poll.SetHotkey("F9"));
     EXPECT_FALSE(poll.Tick());  // F7 is still held, but no longer the hotkey
@@ -43,21 +43,21 @@ TEST(HotkeyPoll, NeedsTicksOnlyWhileTheKeyIsHeld_WhereKeyEventsWake) {
     testing::FakeKeySampler keys;
     HotkeyPoll poll(&keys);
     ASSERT_TRUE(poll.SetHotkey("F7"));
-    EXPECT_TRUE(poll.needsTicks());  // no events: always polled
+    EXPECT_TRUE(poll.NeedsTicks());  // no events: always polled
 
     keys.wake = 5;
-    EXPECT_EQ(poll.wakeDescriptor(), 5);
-    EXPECT_FALSE(poll.needsTicks());
+    EXPECT_EQ(poll.WakeDescriptor(), 5);
+    EXPECT_FALSE(poll.NeedsTicks());
     keys.pressed.insert(kF7);
     EXPECT_TRUE(poll.Tick());
-    EXPECT_FALSE(poll.needsTicks());  // a short press: done
+    EXPECT_FALSE(poll.NeedsTicks());  // a short press: done
     keys.held.insert(kF7);
     EXPECT_TRUE(poll.Tick());
-    EXPECT_TRUE(poll.needsTicks());  // held: runs again on every tick
+    EXPECT_TRUE(poll.NeedsTicks());  // held: runs again on every tick
     EXPECT_TRUE(poll.Tick());
     keys.held.clear();
     EXPECT_FALSE(poll.Tick());
-    EXPECT_FALSE(poll.needsTicks());
+    EXPECT_FALSE(poll.NeedsTicks());
 }
 
 }  // namespace

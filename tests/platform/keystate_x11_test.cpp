@@ -77,7 +77,7 @@ TEST_F(KeySamplerX11Test, ReportsShortPressOnce_ThenClearsIt) {
 
 // An idle tool sleeps until a key event makes the wake descriptor readable; a sample drains it.
 TEST_F(KeySamplerX11Test, WakeDescriptorTurnsReadableOnAKeyAndQuietAfterTheSample) {
-    const int wake = sampler_->wakeDescriptor();
+    const int wake = sampler_->WakeDescriptor();
     ASSERT_GE(wake, 0);
     auto readable = [wake] {
         pollfd fd{wake, POLLIN, 0};

@@ -64,7 +64,7 @@ TEST_F(SingleInstanceTest, RefusesSecondCopy_AndDeliversSentCommandsInOrderThrou
 
     ASSERT_EQ(SendWithoutWaiting("show", "kv-test"), Delivery::Queued);
     ASSERT_EQ(SendWithoutWaiting("trigger", "kv-test"), Delivery::Queued);
-    pollfd readable{first->commandDescriptor(), POLLIN, 0};
+    pollfd readable{first->CommandDescriptor(), POLLIN, 0};
     ASSERT_EQ(::poll(&readable, 1, 10000), 1);
     EXPECT_EQ(first->TakeCommand(), "show");
     EXPECT_EQ(first->TakeCommand(), "trigger");
@@ -103,7 +103,7 @@ TEST_F(SingleInstanceTest, ATakenCommandIsAnswered_ABusyCopyKeepsItForLater) {
     std::optional<Delivery> delivery;
     std::thread sender(
         [&] { delivery = SendToRunningInstance("trigger", "kv-test", std::chrono::minutes(1)); });
-    pollfd readable{running->commandDescriptor(), POLLIN, 0};
+    pollfd readable{running->CommandDescriptor(), POLLIN, 0};
     ASSERT_EQ(::poll(&readable, 1, 10000), 1);
     EXPECT_EQ(running->TakeCommand(), "trigger");
     sender.join();

@@ -2,6 +2,10 @@
 
 #include <gtest/gtest.h>
 
+#include <atomic>
+#include <thread>
+
+#include "catalog/ini.h"
 #include "support/fake_keys.h"
 #include "support/trees.h"
 
@@ -34,14 +38,14 @@ protected:
 TEST_F(SessionTest, HotkeyFromTheSettingsAppliesOnPressAndABadTextKeepsTheLastKey) {
     WriteSettings("f7");  // names no key: nothing is in use yet, and the session says so
     auto session = Open();
-    EXPECT_FALSE(session->hotkeyValid());
-    EXPECT_EQ(session->activeHotkey(), "");
-    EXPECT_EQ(session->hotkeyProblem(), "\"f7\" không phải phím F1–F12: phím tắt chưa hoạt động.");
+    EXPECT_FALSE(session->HotkeyValid());
+    EXPECT_EQ(session->ActiveHotkey(), "");
+    EXPECT_EQ(session->HotkeyProblem(), "\"f7\" không phải phím F1–F12: phím tắt chưa hoạt động.");
     keys_->pressed.insert(kF7);
     EXPECT_FALSE(session->PollHotkey());
 
-    session->setHotkeyText("F7");
-    EXPECT_TRUE(session->hotkeyProblem().empty());
+    session->SetHotkeyText("F7");
+    EXPECT_TRUE(session->HotkeyProblem().empty());
     keys_->pressed.insert(kF7);
     const std::optional<ApplyRun> run = session->PollHotkey();
     ASSERT_TRUE(run);
@@ -49,16 +53,16 @@ TEST_F(SessionTest, HotkeyFromTheSettingsAppliesOnPressAndABadTextKeepsTheLastKe
     EXPECT_TRUE(run->shown.messages.empty());
     EXPECT_TRUE(fs::exists(game() / "data2/cmn/base.dds"));
 
-    session->setHotkeyText("F");  // halfway through typing "F9"
-    EXPECT_EQ(session->activeHotkey(), "F7");
-    EXPECT_EQ(session->hotkeyProblem(), "\"F\" không phải phím F1–F12: vẫn dùng F7.");
-    EXPECT_EQ(session->settings().hotkey, "F");  // saved as typed
+    session->SetHotkeyText("F");  // halfway through typing "F9"
+    EXPECT_EQ(session->ActiveHotkey(), "F7");
+    EXPECT_EQ(session->HotkeyProblem(), "\"F\" không phải phím F1–F12: vẫn dùng F7.");
+    EXPECT_EQ(session->Settings().hotkey, "F");  // saved as typed
 }
 
 TEST_F(SessionTest, UnreadableSettingsAreNamedAndNothingIsCopied) {
     WriteFile(tool() / "ThietLap.ini", std::string("\x01\x00\x7F\x00junk", 8));
     auto session = Open();
-    EXPECT_FALSE(session->settingsRead());
+    EXPECT_FALSE(session->SettingsRead());
     ASSERT_TRUE(session->SettingsProblem());
     EXPECT_EQ(session->SettingsProblem()->kind, Kind::Warning);
 
@@ -69,6 +73,8 @@ TEST_F(SessionTest, UnreadableSettingsAreNamedAndNothingIsCopied) {
     ASSERT_EQ(run.shown.messages.size(), 1u);
     EXPECT_EQ(run.shown.messages[0], *session->SettingsProblem());
     EXPECT_FALSE(fs::exists(game() / "data2/cmn/base.dds"));
+    // The tray keeps the last real run's line: a refused run copied nothing.
+    EXPECT_FALSE(RunStatusLine(run, {9, 30}));
 }
 
 TEST_F(SessionTest, FailedStepsFollowTheSoundInOneNotice_AStoppedRunHasItsMessageAndNoSound) {
@@ -93,7 +99,7 @@ TEST_F(SessionTest, FailedStepsFollowTheSoundInOneNotice_AStoppedRunHasItsMessag
 
     fs::remove_all(game() / "data2");
     const ApplyRun stopped = session->Apply();
-    EXPECT_TRUE(stopped.apply.stopped());
+    EXPECT_TRUE(stopped.apply.Stopped());
     ASSERT_EQ(stopped.shown.messages.size(), 1u);
     EXPECT_EQ(stopped.shown.messages[0].kind, Kind::Component);
     EXPECT_TRUE(stopped.shown.signalSound.empty());
@@ -102,12 +108,12 @@ TEST_F(SessionTest, FailedStepsFollowTheSoundInOneNotice_AStoppedRunHasItsMessag
 
 TEST_F(SessionTest, SaveConfirmsWithThePopupOrWarnsWithTheReason) {
     auto session = Open();
-    session->setGameFolder("D:\\FO2");
-    session->setCategoryOn(12, true);
-    session->chooseOption(catalog::OptionArray::Other, 9);
+    session->SetGameFolder("D:\\FO2");
+    session->SetCategoryOn(12, true);
+    session->ChooseOption(catalog::OptionArray::Other, 9);
     const Outcome saved = session->Save();
     EXPECT_EQ(saved.popup, (Popup{"Đã lưu thiết lập!", 2}));
-    EXPECT_EQ(catalog::LoadSettings(tool()).settings.selection, session->selection());
+    EXPECT_EQ(catalog::LoadSettings(tool()).settings.selection, session->Selection());
 
     fs::remove(tool() / "ThietLap.ini");
     fs::create_directories(tool() / "ThietLap.ini");  // a folder where the file goes
@@ -127,8 +133,8 @@ TEST_F(SessionTest, FirstSaveOverAnUnreadableFileKeepsItBesideAndSaysSo) {
     WriteFile(tool() / "ThietLap.ini", unreadable);  // larger than the reader accepts
     WriteFile(tool() / "thietlap.ini.BAK", "an older backup");
     auto session = Open();
-    ASSERT_FALSE(session->settingsRead());
-    session->setGameFolder("D:\\FO2");
+    ASSERT_FALSE(session->SettingsRead());
+    session->SetGameFolder("D:\\FO2");
 
     const Outcome first = session->Save();
     ASSERT_TRUE(first.popup);
@@ -142,10 +148,10 @@ TEST_F(SessionTest, FirstSaveOverAnUnreadableFileKeepsItBesideAndSaysSo) {
     }
     EXPECT_EQ(backups, std::vector<std::string>{"thietlap.ini.BAK"});
     EXPECT_EQ(catalog::LoadSettings(tool()).settings.gameFolder, "D:\\FO2");
-    EXPECT_TRUE(session->settingsRead());
-    EXPECT_TRUE(session->Apply().apply.stopped());  // no longer refused: the file is the user's
+    EXPECT_TRUE(session->SettingsRead());
+    EXPECT_TRUE(session->Apply().apply.Stopped());  // no longer refused: the file is the user's
 
-    session->setGameFolder("E:\\FO2");
+    session->SetGameFolder("E:\\FO2");
     EXPECT_EQ(session->Save().popup, (Popup{"Đã lưu thiết lập!", 2}));
     EXPECT_EQ(testing::ReadText(tool() / "thietlap.ini.BAK"), unreadable);
 }
@@ -185,7 +191,7 @@ TEST_F(SessionTest, QuickLoadRemembersItsFolderAndConfirmsWithThePopup) {
     EXPECT_EQ(session->QuickLoad(dir_ / "faces").shown.popup, (Popup{"Hoàn tất!", 2}));
     const QuickLoadRun again = session->QuickLoad(std::nullopt);
     EXPECT_EQ(again.load.copied, std::vector<std::string>{"face1.dds"});
-    EXPECT_EQ(session->quickLoadFolder(), dir_ / "faces");
+    EXPECT_EQ(session->QuickLoadFolder(), dir_ / "faces");
 }
 
 // A set the player drops beside the catalog's is chosen, saved, applied like the others; when
@@ -194,20 +200,20 @@ TEST_F(SessionTest, AddedBallIsChosenSavedAppliedAndFallsBackWhenItsFolderGoes) 
     WriteSettings("F7");
     WriteFile(tool() / u8"extras/Ball/Bóng Tết/textures/ball10.dds", "tet ball");
     auto session = Open();
-    ASSERT_NE(session->addedVariants().Find(catalog::GroupId::Ball, "Bóng Tết"), nullptr);
+    ASSERT_NE(session->AddedVariants().Find(catalog::GroupId::Ball, "Bóng Tết"), nullptr);
     EXPECT_FALSE(session->TakeGoneNotice());
 
     session->ChooseAdded(catalog::GroupId::Ball, "No such set");  // not listed: nothing changes
-    EXPECT_EQ(session->selection().chosen(catalog::GroupId::Ball), 1);
+    EXPECT_EQ(session->Selection().Chosen(catalog::GroupId::Ball), 1);
     session->ChooseAdded(catalog::GroupId::Ball, "Bóng Tết");
-    EXPECT_EQ(session->selection().chosenAdded(catalog::GroupId::Ball), "Bóng Tết");
+    EXPECT_EQ(session->Selection().ChosenAdded(catalog::GroupId::Ball), "Bóng Tết");
     EXPECT_FALSE(session->Save().popup->text.empty());
     const ApplyRun run = session->Apply();
     EXPECT_TRUE(run.apply.Failures().empty());
     EXPECT_EQ(testing::ReadText(game() / "zdata/data2/ball/textures/ball10.dds"), "tet ball");
 
     // A second start reads the choice back.
-    EXPECT_EQ(Open()->selection().chosenAdded(catalog::GroupId::Ball), "Bóng Tết");
+    EXPECT_EQ(Open()->Selection().ChosenAdded(catalog::GroupId::Ball), "Bóng Tết");
 
     fs::remove_all(tool() / u8"extras/Ball/Bóng Tết");
     WriteFile(tool() / "extras/Ball/Empty one/.hidden", "");
@@ -217,8 +223,8 @@ TEST_F(SessionTest, AddedBallIsChosenSavedAppliedAndFallsBackWhenItsFolderGoes) 
     EXPECT_EQ(refreshed.messages[0].text,
               "Không còn thư mục của bộ đã chọn, đã chọn lại mặc định:\n"
               "• extras\\Ball\\Bóng Tết → Europa League 2011");
-    EXPECT_EQ(session->selection().chosen(catalog::GroupId::Ball), 1);
-    EXPECT_EQ(SkippedLine(session->addedVariants(), catalog::GroupId::Ball),
+    EXPECT_EQ(session->Selection().Chosen(catalog::GroupId::Ball), 1);
+    EXPECT_EQ(SkippedLine(session->AddedVariants(), catalog::GroupId::Ball),
               "Bỏ qua: Empty one (thư mục trống)");
     EXPECT_TRUE(session->RefreshAddedVariants().messages.empty());  // said once
 
@@ -228,7 +234,39 @@ TEST_F(SessionTest, AddedBallIsChosenSavedAppliedAndFallsBackWhenItsFolderGoes) 
     ASSERT_TRUE(notice);
     EXPECT_NE(notice->text.find("Bóng Tết"), std::string::npos);
     EXPECT_FALSE(restarted->TakeGoneNotice());
-    EXPECT_EQ(restarted->selection().chosen(catalog::GroupId::Ball), 1);
+    EXPECT_EQ(restarted->Selection().Chosen(catalog::GroupId::Ball), 1);
+}
+
+TEST_F(SessionTest, ANewVersionIsKeptAndRecordedInTheSettingsFileBesideTheUsersChoice) {
+    WriteSettings("F7");
+    auto session = Open();
+    EXPECT_TRUE(session->RecordNewVersion("v2.1\r\n"));
+    session->RecordDownloadLink("https://dl.example.net/kv.zip");
+    EXPECT_EQ(session->Updates().versionText, "v2.1\r\n");
+    EXPECT_EQ(session->Updates().downloadLink, "https://dl.example.net/kv.zip");
+    EXPECT_EQ(catalog::ReadIni(tool() / "ThietLap.ini", "KiemTra", "PhienBan", "-"), "v2.1");
+    EXPECT_EQ(catalog::ReadIni(tool() / "ThietLap.ini", "Thiet lap", "PhimTat", "-"), "F7");
+
+    fs::remove(tool() / "ThietLap.ini");
+    fs::create_directory(tool() / "ThietLap.ini");  // a folder in its place: the write fails
+    EXPECT_FALSE(session->RecordNewVersion("v2.2"));
+    EXPECT_EQ(session->Updates().versionText, "v2.2");
+}
+
+TEST_F(SessionTest, GameSearchRunsOnAnotherThreadInTheFoldersItWasGiven) {
+    auto session = Open();
+    const fs::path home = tool().parent_path() / "home";
+    WriteFile(home / ".wine/system.reg", "WINE REGISTRY Version 2\n");
+    WriteFile(home / ".wine/drive_c/FIFA/Gameloader.exe", "MZ");
+    session->SetGameSearchFolders({home, home / ".config", home / ".local/share", {}});
+    const GameSearch search = session->GameSearchCommand();
+    session.reset();  // the command owns what it needs
+
+    std::atomic<bool> cancel{false};
+    GameSearchOutcome found;
+    std::thread([&] { found = search(cancel); }).join();
+    ASSERT_EQ(found.games.size(), 1u);
+    EXPECT_EQ(fs::canonical(found.games[0].folder), fs::canonical(home / ".wine/drive_c/FIFA"));
 }
 
 }  // namespace

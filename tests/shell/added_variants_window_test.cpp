@@ -34,7 +34,7 @@ protected:
             }
             QImage picture(60, 40, QImage::Format_RGB32);
             picture.fill(Qt::darkGreen);
-            picture.save(PathToQString(tool / "extras" / group / names[0] / "Preview.PNG"), "PNG");
+            picture.save(pathToQString(tool / "extras" / group / names[0] / "Preview.PNG"), "PNG");
         }
     }
 
@@ -102,9 +102,9 @@ TEST_F(AddedVariantsWindowTest, AddedSetsShowAfterTheCatalogAreChosenPreviewedAn
 
     Click(window->buttons().save());
     const catalog::Settings saved =
-        catalog::LoadSettings(tool(), window->session().addedVariants()).settings;
-    EXPECT_EQ(saved.selection.chosenAdded(GroupId::Pitch), "Sọc ngang");
-    EXPECT_EQ(saved.selection.chosen(GroupId::Adboard), 0);
+        catalog::LoadSettings(tool(), window->session().AddedVariants()).settings;
+    EXPECT_EQ(saved.selection.ChosenAdded(GroupId::Pitch), "Sọc ngang");
+    EXPECT_EQ(saved.selection.Chosen(GroupId::Adboard), 0);
 }
 
 TEST_F(AddedVariantsWindowTest, SetsDroppedWhileInTheTrayShowWhenTheWindowComesBack) {
@@ -131,7 +131,7 @@ TEST_F(AddedVariantsWindowTest, PanelsWithAddedSetsInBothSkins) {
     auto window = Open();
     window->show();
     FinishFade(*window);
-    for (const SkinLook& look : {LightSkin(), DarkSkin()}) {
+    for (const SkinLook& look : {lightSkin(), darkSkin()}) {
         window->applySkin(look);
         for (int tab : {1, 2, 3}) {
             Click(window->panels().tabHead(tab));

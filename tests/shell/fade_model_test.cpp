@@ -9,10 +9,10 @@ namespace {
 
 // Runs a fade to its end and returns the opacities it applied.
 std::vector<int> RunFade(FadeModel& fade, int target, int step) {
-    fade.Start(target, step);
+    fade.start(target, step);
     std::vector<int> applied;
     while (fade.running() && applied.size() < 100) {
-        applied.push_back(fade.Step().alpha);
+        applied.push_back(fade.advance().alpha);
     }
     return applied;
 }
@@ -21,11 +21,11 @@ std::vector<int> RunFade(FadeModel& fade, int target, int step) {
 // one step, and the opacity stays within 0 and 255.
 TEST(FadeModel, EachFadeStartsWhereTheLastStoppedAndStaysWithinZeroTo255) {
     FadeModel fade;
-    fade.Start(240, 15);
-    const FadeModel::Tick first = fade.Step();
+    fade.start(240, 15);
+    const FadeModel::Tick first = fade.advance();
     EXPECT_EQ(first.alpha, 15);
     EXPECT_TRUE(first.firstInLife);
-    EXPECT_FALSE(fade.Step().firstInLife);
+    EXPECT_FALSE(fade.advance().firstInLife);
     EXPECT_EQ(RunFade(fade, 240, 15).size(), 14u);  // 45 ... 240
     EXPECT_EQ(RunFade(fade, 150, -15), (std::vector<int>{225, 210, 195, 180, 165, 150}));
     EXPECT_EQ(RunFade(fade, 150, -15), std::vector<int>{135});

@@ -12,7 +12,7 @@ namespace kickvane::testing {
 // Records what the window would show, and answers folder pickers from a queue.
 class RecordingDialogs final : public shell::Dialogs {
 public:
-    std::optional<QString> PickFolder(QWidget*, const QString&, const QString& start) override {
+    std::optional<QString> pickFolder(QWidget*, const QString&, const QString& start) override {
         starts << start;
         if (folders.empty()) {
             return std::nullopt;
@@ -21,14 +21,14 @@ public:
         folders.pop_front();
         return folder;
     }
-    void ShowMessage(QWidget*, const QString& title, const QString& text, Icon) override {
+    void showMessage(QWidget*, const QString& title, const QString& text, Icon) override {
         messages << title + QLatin1Char('|') + text;
     }
-    void ShowNotice(QWidget*, const QString&, const QString& text) override { notices << text; }
-    void ShowPopup(const QString& text, int seconds) override {
+    void showNotice(QWidget*, const QString&, const QString& text) override { notices << text; }
+    void showPopup(const QString& text, int seconds) override {
         popups << text + QLatin1Char('|') + QString::number(seconds);
     }
-    void ShowFailureAlert(const QString& text, int seconds,
+    void showFailureAlert(const QString& text, int seconds,
                           std::function<void()> onClick) override {
         alerts << text + QLatin1Char('|') + QString::number(seconds);
         alertClick = std::move(onClick);
@@ -46,9 +46,9 @@ public:
 // A tray that records whether its icon is there; `hostRunning` says whether a tray host shows it.
 class FakeTray final : public shell::TrayIcon {
 public:
-    void Add() override { added = true; }
-    void Remove() override { added = false; }
-    bool Shown() const override { return added && hostRunning; }
+    void add() override { added = true; }
+    void remove() override { added = false; }
+    bool shown() const override { return added && hostRunning; }
 
     bool added = false;
     bool hostRunning = true;

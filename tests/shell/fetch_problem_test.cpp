@@ -24,14 +24,14 @@ TEST(FetchProblemTest, QtErrorsMapToTheirVietnameseReason) {
         {E::ContentAccessDenied, "lỗi mạng (mã 201)"},  // no words of its own: its code
     };
     for (const auto& c : cases) {
-        EXPECT_EQ(NetworkErrorText(c.error), QString::fromUtf8(c.reason)) << c.reason;
+        EXPECT_EQ(networkErrorText(c.error), QString::fromUtf8(c.reason)) << c.reason;
     }
-    EXPECT_EQ(FetchProblemText(FetchProblem::HttpStatus, 503), "máy chủ trả lời mã HTTP 503");
+    EXPECT_EQ(fetchProblemText(FetchProblem::HttpStatus, 503), "máy chủ trả lời mã HTTP 503");
 
     // Every problem has its own words, so the user can tell them apart.
     std::set<QString> texts;
     for (int p = 0; p <= static_cast<int>(FetchProblem::Other); ++p) {
-        texts.insert(FetchProblemText(static_cast<FetchProblem>(p), 7));
+        texts.insert(fetchProblemText(static_cast<FetchProblem>(p), 7));
     }
     EXPECT_EQ(texts.size(), static_cast<size_t>(FetchProblem::Other) + 1);
 }
@@ -58,7 +58,7 @@ TEST(FetchProblemTest, RealRefusedAndClosedConnectionsAreSaidInVietnamese) {
         QSignalSpy failed(&check, &UpdateCheck::versionFailed);
         check.fetchVersion();
         ASSERT_TRUE(failed.wait(10000)) << host.toStdString();
-        EXPECT_EQ(failed.at(0).at(0).toString(), FetchProblemText(problem));
+        EXPECT_EQ(failed.at(0).at(0).toString(), fetchProblemText(problem));
     }
 }
 

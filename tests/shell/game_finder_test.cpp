@@ -19,11 +19,13 @@ namespace fs = std::filesystem;
 using testing::TempDir;
 using testing::WriteFile;
 
-// A game folder box, and a home folder of its own.
+// A game folder box, and a session whose game search looks in a home folder of its own.
 class GameFinderTest : public ::testing::Test {
 protected:
-    game::UserFolders folders() const {
-        return {dir_ / "home", dir_ / "home/.config", dir_ / "home/.local/share", {}};
+    session::GameSearch search() {
+        session_.SetGameSearchFolders(
+            {dir_ / "home", dir_ / "home/.config", dir_ / "home/.local/share", {}});
+        return session_.GameSearchCommand();
     }
 
     fs::path AddGame(const std::string& prefix) {
@@ -56,12 +58,13 @@ protected:
     }
 
     TempDir dir_;
+    session::Session session_{dir_ / "tool"};
     QWidget panel_;
     QLineEdit* box_ = new QLineEdit(&panel_);
 };
 
 TEST_F(GameFinderTest, OneFindFillsTheBox_SeveralOpenAListWithSources_NoneSaysWhereItLooked) {
-    GameFinderButton button(box_, folders());
+    GameFinderButton button(box_, search());
 
     Search(button);
     auto* message = OpenDialog<QMessageBox>();
@@ -99,16 +102,16 @@ TEST(PathLinesTest, APathBreaksOnlyAfterAFolderSeparator) {
     const auto characters = [](const QString& text) { return static_cast<int>(text.size()); };
     const QString path =
         QStringLiteral("/home/player/.wine/drive_c/Program Files (x86)/FIFA Online 2");
-    const QStringList lines = PathLines(path, 24, characters);
+    const QStringList lines = pathLines(path, 24, characters);
     EXPECT_EQ(lines, QStringList({"/home/player/.wine/", "drive_c/", "Program Files (x86)/",
                                   "FIFA Online 2"}));
-    EXPECT_EQ(PathLines(QStringLiteral("C:\\Games\\FO2"), 8, characters),
+    EXPECT_EQ(pathLines(QStringLiteral("C:\\Games\\FO2"), 8, characters),
               QStringList({"C:\\", "Games\\", "FO2"}));
     // A name wider than the line stays whole; a short path stays on one line.
-    EXPECT_EQ(PathLines(QStringLiteral("/a/averyveryverylongname/b"), 6, characters),
+    EXPECT_EQ(pathLines(QStringLiteral("/a/averyveryverylongname/b"), 6, characters),
               QStringList({"/a/", "averyveryverylongname/", "b"}));
-    EXPECT_EQ(PathLines(path, 200, characters), QStringList{path});
-    EXPECT_EQ(PathLines(QString(), 10, characters), QStringList{QString()});
+    EXPECT_EQ(pathLines(path, 200, characters), QStringList{path});
+    EXPECT_EQ(pathLines(QString(), 10, characters), QStringList{QString()});
 }
 
 TEST_F(GameFinderTest, ClosingTheWindowDuringASearchEndsItCleanly) {
@@ -116,7 +119,7 @@ TEST_F(GameFinderTest, ClosingTheWindowDuringASearchEndsItCleanly) {
         WriteFile(dir_ / "home/.wine/drive_c/d" / std::to_string(i) / "f.txt", "x");
     }
     AddGame(".wine");
-    auto* button = new GameFinderButton(box_, folders());
+    auto* button = new GameFinderButton(box_, search());
     QTest::mouseClick(button, Qt::LeftButton);
     delete button;  // stops and joins the search; its late result is dropped
     QApplication::processEvents();

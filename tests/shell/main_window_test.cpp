@@ -38,7 +38,7 @@ TEST_F(MainWindowTest, TabSwitchesShowOnePanelAndNeverPutTheFocusInTheHotkeyBox)
     }
     // A key typed after the switches does not reach the hotkey.
     QTest::keyClick(QApplication::focusWidget(), Qt::Key_X);
-    EXPECT_EQ(window->session().activeHotkey(), "F7");
+    EXPECT_EQ(window->session().ActiveHotkey(), "F7");
 }
 
 TEST_F(MainWindowTest, SettingsLoadIntoTheWidgetsAndSaveRoundTrips) {
@@ -66,8 +66,8 @@ TEST_F(MainWindowTest, SettingsLoadIntoTheWidgetsAndSaveRoundTrips) {
     const catalog::Settings saved = catalog::LoadSettings(tool()).settings;
     EXPECT_EQ(saved.gameFolder, "/home/player/FIFA Online 2");
     EXPECT_EQ(saved.hotkey, "F2");
-    EXPECT_FALSE(saved.selection.isOn(0));
-    EXPECT_EQ(saved.selection.chosen(GroupId::Scoreboard), 6);
+    EXPECT_FALSE(saved.selection.IsOn(0));
+    EXPECT_EQ(saved.selection.Chosen(GroupId::Scoreboard), 6);
 }
 
 TEST_F(MainWindowTest, UnreadableSettingsAreSaidAtStartAndAFailedSaveShowsNoPopup) {

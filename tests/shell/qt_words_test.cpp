@@ -106,7 +106,7 @@ QStringList VisibleTexts(QWidget& root) {
 
 class QtWordsTest : public testing::WindowFixture {
 protected:
-    static void SetUpTestSuite() { ASSERT_TRUE(UseVietnameseQtTexts()); }
+    static void SetUpTestSuite() { ASSERT_TRUE(useVietnameseQtTexts()); }
 
     static void ExpectNoEnglish(QWidget& root) {
         static const QSet<QString> english = EnglishWords();
@@ -126,7 +126,7 @@ protected:
 TEST_F(QtWordsTest, FolderChooserSpeaksVietnameseAndShowsItsHeadsWhole) {
     std::filesystem::create_directories(dir_ / "Games");
     QFileDialog dialog;
-    PrepareFolderDialog(dialog, QStringLiteral("Chọn thư mục cài đặt FIFA Online 2"),
+    prepareFolderDialog(dialog, QStringLiteral("Chọn thư mục cài đặt FIFA Online 2"),
                         QString::fromStdString(dir_.path().string()));
     dialog.show();
     ASSERT_TRUE(QTest::qWaitForWindowExposed(&dialog));
@@ -188,7 +188,7 @@ TEST_F(QtWordsTest, OutsideTextIsShownAsWrittenNeverAsMarkup) {
           QStringLiteral("<h1>404 Not Found</h1>"), QStringLiteral("Tom &amp; Jerry")}) {
         SCOPED_TRACE(outside.toStdString());
         {
-            std::unique_ptr<QMessageBox> box(NewPlainMessageBox(
+            std::unique_ptr<QMessageBox> box(newPlainMessageBox(
                 QMessageBox::Warning, QStringLiteral("Thông báo"), outside, window.get()));
             EXPECT_EQ(box->textFormat(), Qt::PlainText);
             auto* label = box->findChild<QLabel*>(QStringLiteral("qt_msgbox_label"));
@@ -197,7 +197,7 @@ TEST_F(QtWordsTest, OutsideTextIsShownAsWrittenNeverAsMarkup) {
             EXPECT_EQ(label->text(), outside);
         }
         QtDialogs dialogs;
-        dialogs.ShowNotice(window.get(), QStringLiteral("Thông báo"), outside);
+        dialogs.showNotice(window.get(), QStringLiteral("Thông báo"), outside);
         auto* notice = window->findChild<QMessageBox*>();
         ASSERT_NE(notice, nullptr);
         EXPECT_EQ(notice->textFormat(), Qt::PlainText);
@@ -205,9 +205,9 @@ TEST_F(QtWordsTest, OutsideTextIsShownAsWrittenNeverAsMarkup) {
         delete notice;
 
         // The hotkey's note quotes the text of the settings file.
-        window->session().setHotkeyText(outside.toStdString());
+        window->session().SetHotkeyText(outside.toStdString());
         window->buttons().showHotkey(outside,
-                                     QString::fromStdString(window->session().hotkeyProblem()));
+                                     QString::fromStdString(window->session().HotkeyProblem()));
         EXPECT_EQ(window->buttons().hotkeyProblem()->textFormat(), Qt::PlainText);
         EXPECT_TRUE(window->buttons().hotkeyProblem()->text().contains(outside));
     }

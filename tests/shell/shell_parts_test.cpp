@@ -129,8 +129,8 @@ TEST_F(ShellPartsTest, SkinsRecolourTheEntriesAndUseTheirPicturesKeepingTheTab) 
 // In each skin the note under a bad hotkey reads well on its ground, and skin 2 draws its tick
 // boxes and option buttons on the entries' dark colour.
 TEST_F(ShellPartsTest, TheHotkeyNoteReadsInBothSkinsAndSkinTwoTicksOnItsOwnColour) {
-    EXPECT_NEAR(ContrastRatio(Qt::black, Qt::white), 21.0, 0.01);
-    EXPECT_NEAR(ContrastRatio(Qt::gray, Qt::gray), 1.0, 0.01);
+    EXPECT_NEAR(contrastRatio(Qt::black, Qt::white), 21.0, 0.01);
+    EXPECT_NEAR(contrastRatio(Qt::gray, Qt::gray), 1.0, 0.01);
     auto window = Show();
     QLabel* note = window->buttons().hotkeyProblem();
     for (int skin : {2, 1}) {
@@ -138,7 +138,7 @@ TEST_F(ShellPartsTest, TheHotkeyNoteReadsInBothSkinsAndSkinTwoTicksOnItsOwnColou
         const QPalette palette = note->palette();
         EXPECT_TRUE(note->autoFillBackground());
         EXPECT_GE(
-            ContrastRatio(palette.color(QPalette::WindowText), palette.color(QPalette::Window)),
+            contrastRatio(palette.color(QPalette::WindowText), palette.color(QPalette::Window)),
             4.5)
             << "skin " << skin;
     }
@@ -147,8 +147,8 @@ TEST_F(ShellPartsTest, TheHotkeyNoteReadsInBothSkinsAndSkinTwoTicksOnItsOwnColou
     for (QWidget* entry :
          {static_cast<QWidget*>(panels.categoryCheck(0)),
           static_cast<QWidget*>(panels.optionButton(catalog::OptionArray::Ball, 1))}) {
-        EXPECT_EQ(entry->palette().color(QPalette::Base), DarkSkin().entryBackground);
-        EXPECT_GE(ContrastRatio(entry->palette().color(QPalette::Text),
+        EXPECT_EQ(entry->palette().color(QPalette::Base), darkSkin().entryBackground);
+        EXPECT_GE(contrastRatio(entry->palette().color(QPalette::Text),
                                 entry->palette().color(QPalette::Base)),
                   4.5);
     }
@@ -194,17 +194,17 @@ TEST_F(ShellPartsTest, CheckButtonRunsTheUpdateCheckAndReportsAnUnreachableHost)
 }
 
 TEST_F(ShellPartsTest, PopupWindowFollowsItsModelAndClosesWhenItFinishes) {
-    QPointer<AlertPopup> popup = AlertPopup::Show(QStringLiteral("Đã lưu thiết lập!"), 2);
+    QPointer<AlertPopup> popup = AlertPopup::open(QStringLiteral("Đã lưu thiết lập!"), 2);
     ASSERT_TRUE(popup->isVisible());
     EXPECT_TRUE(popup->testAttribute(Qt::WA_ShowWithoutActivating));
     for (int i = 0; i < 5; ++i) {
-        popup->Tick();
+        popup->tick();
     }
     const popup::PixelRect rect = popup->model().WindowPixels();
     EXPECT_EQ(popup->geometry(), QRect(rect.left, rect.top, rect.width, rect.height));
     // Rising, resting, leaving: it closes and deletes itself at the end.
     for (int i = 0; i < 2000 && popup && popup->isVisible(); ++i) {
-        popup->Tick();
+        popup->tick();
     }
     ASSERT_TRUE(popup);
     EXPECT_TRUE(popup->model().Finished());
@@ -216,7 +216,7 @@ TEST_F(ShellPartsTest, PopupWindowFollowsItsModelAndClosesWhenItFinishes) {
 TEST_F(ShellPartsTest, FailureAlertIsARedPopupWhoseClickOpensTheList) {
     QtDialogs dialogs;
     int clicks = 0;
-    dialogs.ShowFailureAlert(QStringLiteral("Đã chép, 2 bước lỗi: bấm để xem"), 10,
+    dialogs.showFailureAlert(QStringLiteral("Đã chép, 2 bước lỗi: bấm để xem"), 10,
                              [&clicks] { ++clicks; });
     AlertPopup* alert = nullptr;
     for (QWidget* widget : QApplication::topLevelWidgets()) {
@@ -250,7 +250,7 @@ TEST_F(ShellPartsTest, HeaderButtonsLeaveTheBannerTitleVisibleInBothSkins) {
     }
     auto window = Show(tool);
     FinishFade(*window);
-    for (const SkinLook& look : {LightSkin(), DarkSkin()}) {
+    for (const SkinLook& look : {lightSkin(), darkSkin()}) {
         window->applySkin(look);
         const QImage banner = window->skins().background().toImage();
         ASSERT_FALSE(banner.isNull());

@@ -40,30 +40,30 @@ QByteArray Redirect(const QByteArray& to) {
 
 TEST(UpdateCheckTextTest, OurVersionWithBlanksOrLineEndsAroundItIsCurrent) {
     for (const char* same : {"v2.0-demo", "v2.0-demo ", "v2.0-demo\n", "v2.0-demo\r\n\r\n"}) {
-        EXPECT_TRUE(IsCurrentVersion(ReadFetchedText(same))) << same;
+        EXPECT_TRUE(isCurrentVersion(ReadFetchedText(same))) << same;
     }
     for (const char* other : {"v2.0-demo\r\nbeta", "V2.0-DEMO", "v2.0-demo2", ""}) {
-        EXPECT_FALSE(IsCurrentVersion(ReadFetchedText(other))) << other;
+        EXPECT_FALSE(isCurrentVersion(ReadFetchedText(other))) << other;
     }
 }
 
 TEST(UpdateCheckTextTest, MessagesKeepTheFetchedVersionAsItCameAndNoLastWordAlone) {
-    EXPECT_EQ(NewerVersionText("v2.0-beta1"), "Đã có phiên bản mới! v2.0-beta1");
-    EXPECT_EQ(CheckFailedText(QStringLiteral("máy chủ không trả lời kịp ")),
+    EXPECT_EQ(newerVersionText("v2.0-beta1"), "Đã có phiên bản mới! v2.0-beta1");
+    EXPECT_EQ(checkFailedText(QStringLiteral("máy chủ không trả lời kịp ")),
               QStringLiteral("Không kiểm tra được phiên bản mới:\nmáy chủ không trả lời\u00A0kịp"));
-    EXPECT_EQ(CheckFailedText(QStringLiteral("x")), "Không kiểm tra được phiên bản mới:\nx");
+    EXPECT_EQ(checkFailedText(QStringLiteral("x")), "Không kiểm tra được phiên bản mới:\nx");
 }
 
 TEST(UpdateCheckTextTest, RedirectsStayOnTheHostAndNeverLeaveHttps) {
     const QUrl origin(QStringLiteral("http://up.example.net/v"));
     const QUrl secure(QStringLiteral("https://up.example.net/v"));
-    EXPECT_TRUE(UpdateCheck::AllowsRedirect(origin, origin, QUrl("http://up.example.net/v2")));
-    EXPECT_TRUE(UpdateCheck::AllowsRedirect(origin, origin, secure));
-    EXPECT_TRUE(UpdateCheck::AllowsRedirect(origin, secure, QUrl("https://up.example.net/x")));
-    EXPECT_FALSE(UpdateCheck::AllowsRedirect(origin, secure, origin));
-    EXPECT_FALSE(UpdateCheck::AllowsRedirect(origin, origin, QUrl("http://evil.example.net/v")));
-    EXPECT_FALSE(UpdateCheck::AllowsRedirect(origin, origin, QUrl("http://up.example.net:81/v")));
-    EXPECT_FALSE(UpdateCheck::AllowsRedirect(origin, origin, QUrl("file:///etc/passwd")));
+    EXPECT_TRUE(UpdateCheck::allowsRedirect(origin, origin, QUrl("http://up.example.net/v2")));
+    EXPECT_TRUE(UpdateCheck::allowsRedirect(origin, origin, secure));
+    EXPECT_TRUE(UpdateCheck::allowsRedirect(origin, secure, QUrl("https://up.example.net/x")));
+    EXPECT_FALSE(UpdateCheck::allowsRedirect(origin, secure, origin));
+    EXPECT_FALSE(UpdateCheck::allowsRedirect(origin, origin, QUrl("http://evil.example.net/v")));
+    EXPECT_FALSE(UpdateCheck::allowsRedirect(origin, origin, QUrl("http://up.example.net:81/v")));
+    EXPECT_FALSE(UpdateCheck::allowsRedirect(origin, origin, QUrl("file:///etc/passwd")));
 }
 
 // A window with the update buttons, and an HTTP server on 127.0.0.1 that answers each path with
@@ -108,9 +108,9 @@ protected:
         check_->show();
         download_->hide();
         dialogs_.messages.clear();
-        return std::make_unique<UpdateFlow>(UpdateCheck::Options{QUrl(Root()), timeout},
-                                            dir_.path(), dialogs_, &window_, check_, download_,
-                                            state_, [this](const QUrl& url) {
+        return std::make_unique<UpdateFlow>(UpdateCheck::Options{QUrl(Root()), timeout}, *session_,
+                                            dialogs_, &window_, check_, download_,
+                                            [this](const QUrl& url) {
                                                 opened_ << url;
                                                 return true;
                                             });
@@ -142,7 +142,7 @@ protected:
     QWidget window_;
     QPushButton* check_ = new QPushButton(&window_);
     QPushButton* download_ = new QPushButton(&window_);
-    session::UpdateState state_;
+    std::unique_ptr<session::Session> session_ = std::make_unique<session::Session>(dir_.path());
     QList<QUrl> opened_;
 };
 
@@ -156,7 +156,7 @@ TEST_F(UpdateFlowTest, SameVersionSaysSoAndChangesNothing) {
     ASSERT_TRUE(checked.wait(kWaitMs));
 
     EXPECT_EQ(dialogs_.messages, QStringList{Message("Chưa có phiên bản mới")});
-    EXPECT_EQ(state_.versionText, "v2.0-demo");
+    EXPECT_EQ(session_->Updates().versionText, "v2.0-demo");
     EXPECT_TRUE(check_->isEnabled() && Shown(check_) && !Shown(download_));
     EXPECT_EQ(requests_.size(), 1);  // no link fetch
     EXPECT_FALSE(SettingsWritten());
@@ -175,8 +175,8 @@ TEST_F(UpdateFlowTest, NewerVersionIsShownConvertedRecordedAndSwapsTheButtons) {
     Check(*flow);
 
     EXPECT_EQ(dialogs_.messages, QStringList{Message("Đã có phiên bản mới! v2.1-beta1")});
-    EXPECT_EQ(state_.versionText, "v2.1-beta1");
-    EXPECT_EQ(state_.downloadLink, "https://dl.example.net/kv-2.1.zip\r\n");
+    EXPECT_EQ(session_->Updates().versionText, "v2.1-beta1");
+    EXPECT_EQ(session_->Updates().downloadLink, "https://dl.example.net/kv-2.1.zip\r\n");
     EXPECT_TRUE(!Shown(check_) && Shown(download_));
     const auto ini = dir_ / "Thietlap.ini";
     EXPECT_EQ(catalog::ReadIni(ini, "KiemTra", "PhienBan", "-"), "v2.1-beta1");
@@ -209,7 +209,7 @@ TEST_F(UpdateFlowTest, FailedChecksAreReportedAndChangeNothing) {
              {"no answer", QByteArray(""), "không trả lời kịp"}}) {
         SCOPED_TRACE(name);
         responses_["/v"] = response;
-        state_.versionText = "v1.9\r\n";
+        session_->KeepVersion("v1.9\r\n");
         const qsizetype requestsBefore = requests_.size();
         // A short limit for the silent server only: any other case must fail for its own reason.
         const bool silent = !response.isNull() && response.isEmpty();
@@ -221,8 +221,8 @@ TEST_F(UpdateFlowTest, FailedChecksAreReportedAndChangeNothing) {
         EXPECT_TRUE(shown.startsWith(Message("Không kiểm tra được phiên bản mới:\n")) &&
                     shown.contains(QString::fromUtf8(reason)))
             << shown.toStdString();
-        EXPECT_EQ(state_.versionText, "v1.9\r\n");
-        EXPECT_TRUE(state_.downloadLink.empty());
+        EXPECT_EQ(session_->Updates().versionText, "v1.9\r\n");
+        EXPECT_TRUE(session_->Updates().downloadLink.empty());
         EXPECT_TRUE(check_->isEnabled() && Shown(check_) && !Shown(download_));
         EXPECT_FALSE(SettingsWritten());
         for (qsizetype i = requestsBefore; i < requests_.size(); ++i) {
@@ -240,12 +240,12 @@ TEST_F(UpdateFlowTest, AnAnswerThatIsNoVersionIsSaidSoAndChangesNothing) {
           QByteArray("")}) {
         SCOPED_TRACE(answer.toStdString());
         responses_["/v"] = Ok(answer);
-        state_.versionText = "v1.9";
+        session_->KeepVersion("v1.9");
         auto flow = Flow();
         Check(*flow);
         EXPECT_EQ(dialogs_.messages,
                   QStringList{Message("Máy chủ cập nhật trả lời không phải số phiên bản")});
-        EXPECT_EQ(state_.versionText, "v1.9");
+        EXPECT_EQ(session_->Updates().versionText, "v1.9");
         EXPECT_TRUE(check_->isEnabled() && Shown(check_) && !Shown(download_));
         EXPECT_FALSE(SettingsWritten());
     }
@@ -263,14 +263,14 @@ TEST_F(UpdateFlowTest, DownloadOpensNothingButAWebAddress) {
     for (const QByteArray& response : {Ok("file:///etc/passwd\r\n"), QByteArray() /* none */}) {
         SCOPED_TRACE(response.toStdString());
         responses_["/vlink"] = response;
-        state_.downloadLink.clear();
+        session_->RecordDownloadLink({});
         flow = Flow();
         Check(*flow);
         dialogs_.messages.clear();
         flow->download();
         EXPECT_EQ(dialogs_.messages.size(), 1);
         if (response.isNull()) {
-            EXPECT_TRUE(state_.downloadLink.empty());
+            EXPECT_TRUE(session_->Updates().downloadLink.empty());
         }
     }
     EXPECT_TRUE(opened_.isEmpty());

@@ -154,18 +154,18 @@ TEST_F(WindowUsabilityTest, TypingChangesTheHotkeyOnlyOnceFinished) {
     box->lineEdit()->selectAll();
     for (const char key : std::string_view("F13")) {
         QTest::keyClick(box->lineEdit(), key);
-        EXPECT_EQ(window->session().activeHotkey(), "F7") << box->currentText().toStdString();
+        EXPECT_EQ(window->session().ActiveHotkey(), "F7") << box->currentText().toStdString();
     }
     EXPECT_EQ(box->currentText(), "F13");
     Press(box->lineEdit(), Qt::Key_Return);
-    EXPECT_EQ(window->session().settings().hotkey, "F13");
-    EXPECT_EQ(window->session().activeHotkey(), "F7");  // names no key: the last one stays
+    EXPECT_EQ(window->session().Settings().hotkey, "F13");
+    EXPECT_EQ(window->session().ActiveHotkey(), "F7");  // names no key: the last one stays
 
     box->lineEdit()->selectAll();
     QTest::keyClicks(box->lineEdit(), QStringLiteral("F9"));
-    EXPECT_EQ(window->session().activeHotkey(), "F7");
+    EXPECT_EQ(window->session().ActiveHotkey(), "F7");
     head->setFocus(Qt::TabFocusReason);  // leaving the box finishes the name
-    EXPECT_EQ(window->session().activeHotkey(), "F9");
+    EXPECT_EQ(window->session().ActiveHotkey(), "F9");
 }
 
 TEST_F(WindowUsabilityTest, TheWheelTurnsTheHotkeyOnlyWhileItHasTheFocus) {
@@ -179,11 +179,11 @@ TEST_F(WindowUsabilityTest, TheWheelTurnsTheHotkeyOnlyWhileItHasTheFocus) {
     };
     wheelDown();
     EXPECT_EQ(box->currentText(), "F7");
-    EXPECT_EQ(window->session().activeHotkey(), "F7");
+    EXPECT_EQ(window->session().ActiveHotkey(), "F7");
     box->setFocus(Qt::MouseFocusReason);
     wheelDown();
     EXPECT_EQ(box->currentText(), "F8");
-    EXPECT_EQ(window->session().activeHotkey(), "F8");
+    EXPECT_EQ(window->session().ActiveHotkey(), "F8");
 }
 
 // The focus goes back to the current tab head after a tab switch, hiding to the tray and coming
@@ -250,17 +250,17 @@ TEST(SideWindowPositionTest, BesideTheOwnerWhenThereIsRoomElseOverItClearOfTheBu
     const QRect area(0, 0, 1280, 760);
     const QSize size(440, 300);
     // Room on the right, then only on the left.
-    EXPECT_EQ(SideWindowPosition(area, QRect(100, 50, 430, 510), 520, size), QPoint(538, 50));
-    EXPECT_EQ(SideWindowPosition(area, QRect(800, 50, 430, 510), 520, size), QPoint(352, 50));
+    EXPECT_EQ(sideWindowPosition(area, QRect(100, 50, 430, 510), 520, size), QPoint(538, 50));
+    EXPECT_EQ(sideWindowPosition(area, QRect(800, 50, 430, 510), 520, size), QPoint(352, 50));
     // No room on either side: centred over the owner, its bottom above the buttons.
     const QRect owner(420, 100, 430, 510);
-    const QPoint over = SideWindowPosition(area, owner, 560, size);
+    const QPoint over = sideWindowPosition(area, owner, 560, size);
     EXPECT_EQ(over.x(), owner.center().x() - size.width() / 2);
     EXPECT_LE(over.y() + size.height(), 560);
     EXPECT_GE(over.y(), area.top());
     // A screen too small for both: inside the work area all the same.
     const QRect small(0, 20, 600, 400);
-    const QPoint inside = SideWindowPosition(small, QRect(50, 40, 430, 510), 500, size);
+    const QPoint inside = sideWindowPosition(small, QRect(50, 40, 430, 510), 500, size);
     EXPECT_TRUE(small.contains(QRect(inside, size))) << inside.x() << "," << inside.y();
 }
 
@@ -272,26 +272,26 @@ TEST_F(WindowUsabilityTest, FolderDialogStartsAtTheNearestExistingFolderElseInTh
     ScopedEnv prefixEnv("WINEPREFIX", prefix.string());
     const auto native = [](const fs::path& path) { return QString::fromStdString(path.string()); };
 
-    EXPECT_EQ(FolderDialogStart(native(prefix / "drive_c/Program Files/Games")),
+    EXPECT_EQ(folderDialogStart(native(prefix / "drive_c/Program Files/Games")),
               native(prefix / "drive_c/Program Files/Games"));
     // Missing folders below an existing one, in the Wine prefix, in any letter case.
-    EXPECT_EQ(FolderDialogStart(QStringLiteral("c:\\program files\\games\\FIFA Online 2")),
+    EXPECT_EQ(folderDialogStart(QStringLiteral("c:\\program files\\games\\FIFA Online 2")),
               native(prefix / "drive_c/Program Files/Games"));
-    EXPECT_EQ(FolderDialogStart(native(home / "nowhere/deeper")), native(home));
+    EXPECT_EQ(folderDialogStart(native(home / "nowhere/deeper")), native(home));
     // Nothing usable typed: the prefix's drive C, else home.
     for (const char* nothing : {"", "  ", "relative/folder"}) {
-        EXPECT_EQ(FolderDialogStart(QString::fromUtf8(nothing)), native(prefix / "drive_c"))
+        EXPECT_EQ(folderDialogStart(QString::fromUtf8(nothing)), native(prefix / "drive_c"))
             << nothing;
     }
     std::filesystem::remove_all(prefix);
-    EXPECT_EQ(FolderDialogStart(QString()), native(home));
+    EXPECT_EQ(folderDialogStart(QString()), native(home));
 }
 
 TEST_F(WindowUsabilityTest, FolderDialogSpeaksVietnameseAndListsHiddenFolders) {
     std::filesystem::create_directories(dir_ / ".wine");
     std::filesystem::create_directories(dir_ / "Games");
     QFileDialog dialog;
-    PrepareFolderDialog(dialog, QStringLiteral("Hỗ trợ nạp nhanh các file Face và Ball"),
+    prepareFolderDialog(dialog, QStringLiteral("Hỗ trợ nạp nhanh các file Face và Ball"),
                         QString::fromStdString(dir_.path().string()));
     EXPECT_EQ(dialog.proxyModel()->headerData(0, Qt::Horizontal, Qt::DisplayRole).toString(),
               "Tên");
@@ -342,7 +342,7 @@ TEST_F(WindowUsabilityTest, ARunIsSummedUpInTheTrayTooltipAndItsFailedStepsInANo
     EXPECT_LE(tray_->toolTip().size(), 127);
 
     // A line break in the status stays on one line.
-    tray_->SetStatusLine(QStringLiteral("a\nb"));
+    tray_->setStatusLine(QStringLiteral("a\nb"));
     EXPECT_EQ(tray_->toolTip(), "Kickvane v2.0\na b");
 }
 

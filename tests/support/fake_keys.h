@@ -13,7 +13,7 @@ public:
         return {held.count(virtualKey) > 0, pressed.erase(virtualKey) > 0};
     }
 
-    int wakeDescriptor() const override { return wake; }
+    int WakeDescriptor() const override { return wake; }
 
     std::set<int> held;
     std::set<int> pressed;

@@ -16,7 +16,7 @@ class QtApplication : public ::testing::Environment {
 public:
     void SetUp() override {
         app_ = std::make_unique<QApplication>(argc_, argv_);
-        kickvane::shell::UseReadableFonts();
+        kickvane::shell::useReadableFonts();
     }
     void TearDown() override { app_.reset(); }
 

@@ -43,7 +43,7 @@ TEST_F(WindowBoxesTest, GameFolderAndHotkeyShowInTheirBoxes) {
 
 // The Vietnamese words of Qt's own menus travel inside the program's one file.
 TEST_F(WindowBoxesTest, QtsOwnMenusSpeakVietnamese) {
-    ASSERT_TRUE(shell::UseVietnameseQtTexts());
+    ASSERT_TRUE(shell::useVietnameseQtTexts());
     auto window = Open();
     std::unique_ptr<QMenu> menu(window->panels().gameFolderBox()->createStandardContextMenu());
     QStringList entries;

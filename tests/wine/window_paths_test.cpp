@@ -14,7 +14,7 @@ TEST_F(WindowPathsTest, QuickLoadCopiesFromAVietnameseFolderAndOpensThereNextTim
     fs::create_directories(toolFolder / "data/data2/players/heads/textures");
     fs::create_directories(faces);
     WriteFile(faces / "face1.dds", "face");
-    const QString facesText = QStringLiteral("%1/Khuôn mặt").arg(shell::PathToQString(dir_.path()));
+    const QString facesText = QStringLiteral("%1/Khuôn mặt").arg(shell::pathToQString(dir_.path()));
     auto window = Open(toolFolder);
 
     dialogs_.folders = {facesText, std::nullopt};
@@ -23,16 +23,16 @@ TEST_F(WindowPathsTest, QuickLoadCopiesFromAVietnameseFolderAndOpensThereNextTim
     EXPECT_EQ(dialogs_.messages, QStringList());
     EXPECT_EQ(dialogs_.popups, QStringList({"Hoàn tất!|2", "Hoàn tất!|2"}));
     ASSERT_EQ(dialogs_.starts.size(), 2);
-    EXPECT_EQ(shell::QStringToPath(dialogs_.starts[1]), shell::QStringToPath(facesText));
+    EXPECT_EQ(shell::qStringToPath(dialogs_.starts[1]), shell::qStringToPath(facesText));
     EXPECT_TRUE(fs::exists(toolFolder / "data/data2/players/heads/textures/face1.dds"));
 }
 
 TEST_F(WindowPathsTest, PathsAndTextRoundTripThroughQt) {
     for (const char* name : {"Khuôn mặt", "Sân vận động", "Cổ động viên", "ASCII"}) {
         const fs::path path = dir_ / name;
-        const QString text = shell::PathToQString(path);
+        const QString text = shell::pathToQString(path);
         EXPECT_TRUE(text.endsWith(QString::fromUtf8(name))) << name;
-        EXPECT_EQ(shell::QStringToPath(text), path) << name;
+        EXPECT_EQ(shell::qStringToPath(text), path) << name;
     }
 }
 
