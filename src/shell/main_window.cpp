@@ -103,7 +103,12 @@ MainWindow::MainWindow(session::Session& session, ShellServices services, QWidge
     }
 }
 
-MainWindow::~MainWindow() = default;
+MainWindow::~MainWindow() {
+    // The child widgets go after this part of the window: a box that loses the focus (and so
+    // reports its text) while they are destroyed must not call into it any more.
+    buttons_->disconnect(this);
+    panels_->disconnect(this);
+}
 
 void MainWindow::connectPanels() {
     connect(panels_, &CatalogPanels::tabSelected, this, [this] {
