@@ -77,14 +77,5 @@ TEST(ImageSurfaceTest, Fill_ClipsToPicture_EvenAtCoordinateLimits) {
     EXPECT_EQ(target.pixelColor(2, 3), QColor(Qt::white));
 }
 
-TEST(ImageSurfaceTest, Text_DrawsInsideItsBoxOnly) {
-    QImage target = filled(120, 40, Qt::white);
-    ImageSurface dc(target);
-    ASSERT_TRUE(dc.text(Rect{10, 10, 60, 30}, "Kickvane Kickvane Kickvane", rgb(0, 0, 0)).ok());
-    EXPECT_NE(target.copy(10, 10, 50, 20), filled(50, 20, Qt::white));
-    QPainter(&target).fillRect(10, 10, 50, 20, Qt::white);
-    EXPECT_EQ(target, filled(120, 40, Qt::white));  // nothing outside the box
-}
-
 }  // namespace
 }  // namespace kickvane::skin

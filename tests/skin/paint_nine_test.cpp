@@ -35,19 +35,6 @@ TEST(PaintNineTest, PaintNine_SmoothsAndCopiesNinePieces_CornersUnscaledSidesStr
     EXPECT_EQ(copies[8].from, (Piece{3, 135, 37, 60}));
 }
 
-TEST(PaintNineTest, PaintNine_StretchesOnlyAlongWidth_WhenSideMarginsAreZero) {
-    const QImage picture(17, 340, QImage::Format_RGB32);
-    RecordingSurface dc;
-    ASSERT_TRUE(
-        paintNine(dc, picture, Margins{0, 5, 0, 5}, Rect{0, 0, 200, 17}, frameOf(picture, 20, 3))
-            .ok());
-    const auto copies = dc.of(Kind::Copy);
-    ASSERT_EQ(copies.size(), 3u);  // top, bottom, middle; corners and sides are empty
-    EXPECT_EQ(copies[0].to, (Piece{0, 0, 200, 5}));
-    EXPECT_EQ(copies[2].to, (Piece{0, 5, 200, 7}));
-    EXPECT_EQ(copies[2].from, (Piece{0, 56, 17, 7}));
-}
-
 TEST(PaintNineTest, PaintNine_DrawsNothing_WhenTargetNarrowerOrLowerThanMargins) {
     const QImage picture(43, 330, QImage::Format_RGB32);
     const Frame frame = frameOf(picture, 5, 0);
@@ -82,21 +69,6 @@ TEST(PaintNineTest, PaintNine_FailsWithoutDrawing_OnMarginsFrameOrPiecesThatDoNo
         RecordingSurface dc;
         EXPECT_FALSE(paintNine(dc, picture, c.margins, c.target, c.frame).ok());
         EXPECT_TRUE(dc.calls.empty());
-    }
-}
-
-// Keying itself is the image surface's test.
-TEST(PaintNineTest, PaintNineKeyed_CopiesEveryPieceWithTheKey) {
-    const QImage frame(6, 6, QImage::Format_RGB32);
-    RecordingSurface dc;
-    ASSERT_TRUE(paintNineKeyed(dc, frame, Margins{2, 2, 2, 2}, Rect{0, 0, 20, 20}, Frame{6, 6, 0},
-                               kMagentaKey)
-                    .ok());
-    const auto keyed = dc.of(Kind::CopyKeyed);
-    EXPECT_EQ(keyed.size(), 9u);
-    EXPECT_TRUE(dc.of(Kind::Copy).empty());
-    for (const auto& piece : keyed) {
-        EXPECT_EQ(piece.colour, kMagentaKey);
     }
 }
 

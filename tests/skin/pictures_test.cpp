@@ -39,31 +39,5 @@ TEST(PicturesTest, EveryPictureHasItsSize_AndOnlyKeyedOnesUseMagenta) {
     EXPECT_EQ(names.size(), 32u);
 }
 
-TEST(PicturesTest, EveryArrowCellHoldsAGlyphOnTheKey) {
-    const QImage& arrows = thePictures().arrows;
-    for (int cell = 0; cell < 20; ++cell) {
-        const int keyed = countMagenta(arrows, QRect(0, cell * 9, 9, 9));
-        EXPECT_GT(keyed, 40) << cell;
-        EXPECT_LT(keyed, 81 - 6) << cell;
-    }
-}
-
-TEST(PicturesTest, KeyedThumbsKeepTheirPointInsideTheMarginsThatDoNotStretch) {
-    // An upright thumb pointing down keeps its point in the bottom 10 rows, one pointing up in
-    // the top 6; the middle rows between them are a plain body with no keyed pixels inside.
-    const QImage& down = thePictures().trackThumbDown;
-    const QImage& up = thePictures().trackThumbUp;
-    for (int frame = 0; frame < 3; ++frame) {
-        const int top = frame * 21;
-        EXPECT_EQ(countMagenta(down, QRect(1, top + 6, 9, 5)), 0);
-        EXPECT_GT(countMagenta(down, QRect(0, top + 11, 11, 10)), 0);
-        EXPECT_EQ(countMagenta(up, QRect(1, top + 6, 9, 5)), 0);
-        EXPECT_GT(countMagenta(up, QRect(0, top, 11, 6)), 0);
-    }
-    const QImage& left = thePictures().trackThumbLeft;
-    EXPECT_EQ(countMagenta(left, QRect(6, 1, 5, 9)), 0);
-    EXPECT_GT(countMagenta(left, QRect(0, 0, 6, 11)), 0);
-}
-
 }  // namespace
 }  // namespace kickvane::skin

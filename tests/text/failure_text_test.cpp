@@ -32,16 +32,12 @@ TEST(FailureText, SystemReasonsReadAsTheirVietnameseCause) {
     } cases[] = {
         {FailedAction::Replace, EPERM, "không có quyền ghi"},
         {FailedAction::Read, EACCES, "không có quyền đọc"},
-        {FailedAction::Write, EROFS, "ổ đĩa chỉ cho đọc"},
         {FailedAction::Write, ENOSPC, "ổ đĩa đã đầy"},
         {FailedAction::Replace, ETXTBSY,
          "file đang được chương trình khác dùng (có thể là trò chơi)"},
         {FailedAction::Read, ENOENT, "không tìm thấy"},
-        {FailedAction::Write, ENAMETOOLONG, "tên quá dài"},
         {FailedAction::Replace, EISDIR, "ở đó là một thư mục, không phải file"},
         {FailedAction::CreateFolder, ENOTDIR, "ở đó là một file, không phải thư mục"},
-        {FailedAction::Write, EFBIG, "file quá lớn"},
-        {FailedAction::Read, EIO, "lỗi đọc ghi ổ đĩa"},
         {FailedAction::Write, 9999, "lỗi hệ thống (mã 9999)"},
     };
     for (const auto& c : cases) {
