@@ -98,8 +98,8 @@ int main() {
     if (!CreateProcessW(program.c_str(), commandLine.data(), nullptr, nullptr, TRUE, 0, nullptr,
                         nullptr, &startup, &process)) {
         const DWORD error = GetLastError();
-        PrintError(L"kickvane: cannot start " + program + L": error " + std::to_wstring(error) +
-                   L"\n");
+        PrintError(L"kickvane: không chạy được " + program + L": lỗi hệ thống (mã " +
+                   std::to_wstring(error) + L")\n");
         return 2;
     }
     CloseHandle(process.hThread);
