@@ -172,13 +172,23 @@ void PrintUsage(std::ostream& out) {
            "chọn và thư mục trò chơi lấy từ ThietLap.ini trong đó.\n";
 }
 
-int RunApply(Args args) {
-    const std::optional<Options> options = ParseOptions(args, true, 0);
+namespace {
+
+// The session of a command that takes only the folder options; the usage or the settings
+// file's problem is printed when there is none.
+std::optional<session::Session> SessionForArguments(Args args, bool allowGame) {
+    const std::optional<Options> options = ParseOptions(args, allowGame, 0);
     if (!options) {
         PrintUsage(std::cerr);
-        return kExitStopped;
+        return std::nullopt;
     }
-    std::optional<session::Session> session = SessionFor(*options);
+    return SessionFor(*options);
+}
+
+}  // namespace
+
+int RunApply(Args args) {
+    std::optional<session::Session> session = SessionForArguments(args, true);
     if (!session) {
         return kExitStopped;
     }
@@ -201,12 +211,7 @@ int RunApply(Args args) {
 }
 
 int RunPlan(Args args) {
-    const std::optional<Options> options = ParseOptions(args, true, 0);
-    if (!options) {
-        PrintUsage(std::cerr);
-        return kExitStopped;
-    }
-    const std::optional<session::Session> session = SessionFor(*options);
+    const std::optional<session::Session> session = SessionForArguments(args, true);
     if (!session) {
         return kExitStopped;
     }
@@ -222,12 +227,7 @@ int RunPlan(Args args) {
 }
 
 int RunList(Args args) {
-    const std::optional<Options> options = ParseOptions(args, false, 0);
-    if (!options) {
-        PrintUsage(std::cerr);
-        return kExitStopped;
-    }
-    std::optional<session::Session> session = SessionFor(*options);
+    std::optional<session::Session> session = SessionForArguments(args, false);
     if (!session) {
         return kExitStopped;
     }

@@ -87,7 +87,7 @@ series() {
     "$(( $(cut -d' ' -f2 "$work/$name" | median) / 1024 ))"
 }
 
-series "wine: floor" "Kickvane floor" wine "$floor_exe"
+series "wine: floor" "kickvane-floor" wine "$floor_exe"
 series "wine: kickvane.exe" "Kickvane v2.0" wine "$tool/kickvane.exe" --tool-folder "$tool"
 series "wine: notepad" "Untitled - Notepad" wine notepad
 if [ -x "$root/build/default/tool/kickvane" ]; then

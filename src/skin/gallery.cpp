@@ -462,7 +462,7 @@ int runSkinGallery(const std::filesystem::path& outPng, std::ostream& err) {
     if (QCoreApplication::instance() == nullptr) {
         ownApp = std::make_unique<QGuiApplication>(argc, argv);
     } else if (qobject_cast<QGuiApplication*>(QCoreApplication::instance()) == nullptr) {
-        err << "skin-gallery: the running application has no GUI support for fonts\n";
+        err << "skin-gallery: chương trình đang chạy không vẽ được chữ\n";
         return 1;
     }
 
@@ -488,7 +488,7 @@ int runSkinGallery(const std::filesystem::path& outPng, std::ostream& err) {
     const QString path = QString::fromUtf8(reinterpret_cast<const char*>(utf8.data()),
                                            static_cast<qsizetype>(utf8.size()));
     if (!image.copy(0, 0, kSheetWidth, height).save(path, "PNG")) {
-        err << "skin-gallery: cannot write " << path.toStdString() << '\n';
+        err << "skin-gallery: không ghi được " << path.toStdString() << '\n';
         return 1;
     }
     return 0;

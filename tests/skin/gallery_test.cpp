@@ -41,7 +41,7 @@ TEST(GalleryTest, RunSkinGallery_WritesASheetThatIsNotBlank_OrReportsAFileItCann
 
     std::ostringstream unwritable;
     EXPECT_NE(runSkinGallery("/nonexistent-folder/sheet.png", unwritable), 0);
-    EXPECT_NE(unwritable.str().find("cannot write"), std::string::npos);
+    EXPECT_NE(unwritable.str().find("không ghi được"), std::string::npos);
 }
 
 // Every painter in every state, and every picture, drawn exactly as in the reference sheet. A

@@ -27,19 +27,8 @@ cleanup() {  # ends what the test started; its own failure is no failure of the 
 }
 trap cleanup EXIT
 
-failures=0
-check() {  # check DESCRIPTION COMMAND...
-  local what=$1
-  shift
-  if "$@"; then
-    echo "ok: $what"
-  else
-    echo "FAILED: $what"
-    failures=$((failures + 1))
-    windows_now
-  fi
-}
-windows_now() {  # the named windows on the display, to see why a window check failed
+source "$(dirname "${BASH_SOURCE[0]}")/check.sh"
+on_check_failed() {  # the named windows on the display, to see why a window check failed
   [ -n "${DISPLAY:-}" ] &&
     xwininfo -root -tree 2>/dev/null | grep '^     0x' | grep -v 'has no name'
   return 0

@@ -33,17 +33,7 @@ cleanup() {
 }
 trap cleanup EXIT
 
-failures=0
-check() {  # check DESCRIPTION COMMAND...
-  local what=$1
-  shift
-  if "$@"; then
-    echo "ok: $what"
-  else
-    echo "FAILED: $what"
-    failures=$((failures + 1))
-  fi
-}
+source "$(dirname "${BASH_SOURCE[0]}")/check.sh"
 launcher_in() { mkdir -p "$1" && printf 'MZ' >"$1/Gameloader.exe"; }
 listed() {  # listed FOLDER SOURCE: find-game printed the folder with that source
   grep -qxF "$1	$2" "$work/found.txt"
