@@ -26,25 +26,22 @@ using platform::ResolveCaseInsensitive;
 // killed copies left behind: temporary files of ours that nothing writes any more.
 class FolderIndex {
 public:
-    explicit FolderIndex(const fs::path& folder) : names_(platform::EntriesByFoldedName(folder)) {
-        std::erase_if(names_, [&folder](const auto& entry) {
-            return platform::IsTemporaryName(entry.second) &&
-                   platform::RemoveIfStale(folder / platform::PathFromUtf8(entry.second));
+    FolderIndex(const fs::path& folder, platform::FolderCopy& opened)
+        : entries_(opened.ListTarget()) {
+        std::erase_if(entries_, [&folder](const auto& entry) {
+            return platform::IsTemporaryName(entry.second.name) &&
+                   platform::RemoveIfStale(folder / platform::PathFromUtf8(entry.second.name));
         });
     }
 
-    // The name of the existing entry for `name` in any letter case, else `name` as given, and
-    // whether there was one; `folded` is FoldCase(name) where the caller has it already.
-    std::pair<std::string, bool> Name(const std::string& name, const std::string& folded) const {
-        auto found = names_.find(folded);
-        return found == names_.end() ? std::pair{name, false} : std::pair{found->second, true};
-    }
-    std::pair<std::string, bool> Name(const std::string& name) const {
-        return Name(name, platform::FoldCase(name));
+    // The existing entry for `name` in any letter case, or nullptr; `folded` is FoldCase(name).
+    const platform::FolderCopy::TargetEntry* Find(const std::string& folded) const {
+        auto found = entries_.find(folded);
+        return found == entries_.end() ? nullptr : &found->second;
     }
 
 private:
-    std::unordered_map<std::string, std::string> names_;
+    std::unordered_map<std::string, platform::FolderCopy::TargetEntry> entries_;
 };
 
 // Creates one folder. Another program (a second apply on the same game) may have created it
@@ -95,6 +92,7 @@ struct FolderJobs {
 
     std::mutex openMutex;
     std::unique_ptr<platform::FolderCopy> opened;
+    std::atomic<int>* keptOpen = nullptr;  // the walk's count, when it left `opened` open
     std::atomic<size_t> left{0};
 
     platform::FolderCopy& Open() {
@@ -108,6 +106,10 @@ struct FolderJobs {
         if (left.fetch_sub(files) == files) {
             const std::lock_guard lock(openMutex);
             opened.reset();
+            if (keptOpen) {
+                keptOpen->fetch_sub(1);
+                keptOpen = nullptr;
+            }
         }
     }
 };
@@ -147,6 +149,8 @@ public:
 private:
     // A copying thread for every this many files waiting, up to the cores (at most four).
     static constexpr size_t kFilesPerWorker = 32;
+    // Folders that the walk leaves open for their copy, at most (two descriptors each).
+    static constexpr int kMaxKeptOpen = 64;
 
     void Walk(const fs::path& source, const fs::path& target) {
         if (stop_.load(std::memory_order_relaxed)) {
@@ -155,36 +159,40 @@ private:
         auto folder = std::make_unique<FolderJobs>();
         folder->source = source;
         folder->target = target;
-        std::vector<std::string> subfolders;
+        // The folders opened to list them serve the copy of their files as well, unless the walk
+        // is far ahead of the copy: then they are opened again when their turn comes.
+        auto opened = std::make_unique<platform::FolderCopy>(source, target);
+        platform::FolderCopy::SourceEntries entries;
+        if (Status listed = opened->ListSource(entries); !listed) {
+            walkFailure_ = std::move(listed);
+            return;
+        }
+        const FolderIndex index(target, *opened);
         // Two files that would land on one name on a file system that ignores letter case are
         // copied one after the other, so that the last in name order wins as it always has.
         std::unordered_set<std::string> foldedNames;
-        std::error_code ec;
-        const FolderIndex index(target);
-        for (fs::directory_iterator it(source, ec), end; !ec && it != end; it.increment(ec)) {
-            std::string name = platform::PathToUtf8(it->path().filename());
-            std::error_code typeError;
-            if (it->is_directory(typeError)) {
-                subfolders.push_back(std::move(name));
-                continue;
-            }
+        folder->files.reserve(entries.files.size());
+        for (std::string& name : entries.files) {
             std::string folded = platform::FoldCase(name);
-            auto [targetName, exists] = index.Name(name, folded);
+            const auto* existing = index.Find(folded);
+            std::string targetName = existing ? existing->name : name;
             folder->oneByOne = !foldedNames.insert(std::move(folded)).second || folder->oneByOne;
-            folder->files.push_back({std::move(name), std::move(targetName), exists});
-        }
-        if (ec) {
-            walkFailure_ = Status::Fail(FailedAction::ReadFolder, source, ec);
-            return;
+            folder->files.push_back({std::move(name), std::move(targetName), existing != nullptr});
         }
         std::sort(folder->files.begin(), folder->files.end(),
                   [](const FileJob& a, const FileJob& b) { return a.sourceName < b.sourceName; });
-        std::sort(subfolders.begin(), subfolders.end());
+        std::sort(entries.folders.begin(), entries.folders.end());
+        if (!folder->files.empty() && keptOpen_.load() < kMaxKeptOpen) {
+            ++keptOpen_;
+            folder->opened = std::move(opened);
+            folder->keptOpen = &keptOpen_;
+        }
+        opened.reset();
         HandOut(std::move(folder));
-        for (const std::string& name : subfolders) {
-            const auto [targetName, exists] = index.Name(name);
-            const fs::path into = target / platform::PathFromUtf8(targetName);
-            if (!exists || !platform::IsDirectory(into)) {
+        for (const std::string& name : entries.folders) {
+            const auto* existing = index.Find(platform::FoldCase(name));
+            const fs::path into = target / platform::PathFromUtf8(existing ? existing->name : name);
+            if (!existing || !existing->isFolder) {
                 if (Status made = MakeFolderIfMissing(into); !made) {
                     walkFailure_ = std::move(made);
                     return;
@@ -296,6 +304,7 @@ private:
     Status walkFailure_ = Status::Ok();
     std::atomic<int> copied_{0};
     std::atomic<int> upToDate_{0};
+    std::atomic<int> keptOpen_{0};
     std::vector<std::jthread> helpers_;  // last: joined before the rest goes
 };
 

@@ -66,11 +66,29 @@ public:
     Status Copy(const std::string& sourceName, const std::string& targetName, bool targetMayExist,
                 bool* copied);
 
+    // What the source folder holds: its files and its subfolders (links followed), in no
+    // particular order. Lists through the folder opened already, once per FolderCopy.
+    struct SourceEntries {
+        std::vector<std::string> files;
+        std::vector<std::string> folders;
+    };
+    Status ListSource(SourceEntries& entries);
+
+    // The entries of the target folder by case-folded name, as EntriesByFoldedName gives them,
+    // each with whether it is a folder; empty when the folder cannot be read. Once per FolderCopy.
+    struct TargetEntry {
+        std::string name;
+        bool isFolder = false;
+    };
+    std::unordered_map<std::string, TargetEntry> ListTarget();
+
 private:
     fs::path source_;
     fs::path target_;
     int sourceFd_ = -1;
     int targetFd_ = -1;
+    int sourceError_ = 0;  // why a folder could not be opened
+    int targetError_ = 0;
     std::atomic<bool> unnamedFiles_{true};  // new files may be written unnamed, then linked
 };
 

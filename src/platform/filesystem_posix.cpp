@@ -1,5 +1,6 @@
 // File system backend for Linux and other POSIX systems, where names are case-sensitive and a
 // Windows game lives in a Wine prefix.
+#include <dirent.h>
 #include <fcntl.h>
 #include <sys/file.h>
 #include <sys/stat.h>
@@ -221,9 +222,18 @@ bool StatFile(const fs::path& path, struct stat& st) {
 }  // namespace
 
 fs::path ResolveCaseInsensitive(const fs::path& path) {
+    // Mostly the path exists as spelled: one look at the whole spares one per component.
+    const fs::path relative = path.relative_path();
+    const bool plain = std::none_of(relative.begin(), relative.end(), [](const fs::path& part) {
+        return part.empty() || part == "." || part == "..";
+    });
+    struct stat st {};
+    if (plain && !path.empty() && ::lstat(path.c_str(), &st) == 0) {
+        return path;
+    }
     fs::path resolved = path.root_path();
     bool belowMissing = false;
-    for (const fs::path& part : path.relative_path()) {
+    for (const fs::path& part : relative) {
         if (part.empty() || part == ".") {
             continue;  // Doubled or trailing separators name nothing.
         }
@@ -355,11 +365,55 @@ Status ReplaceFile(const fs::path& source, const fs::path& target) {
                     nullptr);
 }
 
+namespace {
+
+// A folder opened for reading its entries and as the base of relative names.
+int OpenReadableFolder(const fs::path& folder, int& error) {
+    const int fd =
+        ::open(folder.empty() ? "." : folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+    error = fd < 0 ? errno : 0;
+    return fd;
+}
+
+// Calls `entry(name, isFolder)` for each entry of the folder open as `fd` but "." and "..",
+// reading the descriptor itself (no second open, no path lookup). Links count as what they
+// point to, as std::filesystem's directory_entry::is_directory() does. False, with errno, when
+// the folder cannot be read.
+template <typename Entry>
+bool ForEachEntry(int fd, Entry&& entry) {
+    alignas(struct dirent64) char buffer[32 * 1024];
+    for (;;) {
+        const ssize_t got = ::getdents64(fd, buffer, sizeof buffer);
+        if (got < 0) {
+            return false;
+        }
+        if (got == 0) {
+            return true;
+        }
+        for (ssize_t at = 0; at < got;) {
+            const auto* item = reinterpret_cast<const struct dirent64*>(buffer + at);
+            at += item->d_reclen;
+            const std::string_view name = item->d_name;
+            if (name == "." || name == "..") {
+                continue;
+            }
+            bool isFolder = item->d_type == DT_DIR;
+            if (item->d_type == DT_UNKNOWN || item->d_type == DT_LNK) {
+                struct stat st {};
+                isFolder = ::fstatat(fd, item->d_name, &st, 0) == 0 && S_ISDIR(st.st_mode);
+            }
+            entry(name, isFolder);
+        }
+    }
+}
+
+}  // namespace
+
 FolderCopy::FolderCopy(const fs::path& sourceFolder, const fs::path& targetFolder)
     : source_(sourceFolder),
       target_(targetFolder),
-      sourceFd_(OpenFolder(sourceFolder)),
-      targetFd_(OpenFolder(targetFolder)) {}
+      sourceFd_(OpenReadableFolder(sourceFolder, sourceError_)),
+      targetFd_(OpenReadableFolder(targetFolder, targetError_)) {}
 
 FolderCopy::~FolderCopy() {
     for (const int fd : {sourceFd_, targetFd_}) {
@@ -369,14 +423,37 @@ FolderCopy::~FolderCopy() {
     }
 }
 
+Status FolderCopy::ListSource(SourceEntries& entries) {
+    const bool read =
+        sourceFd_ >= 0 && ForEachEntry(sourceFd_, [&](std::string_view name, bool isFolder) {
+            (isFolder ? entries.folders : entries.files).emplace_back(name);
+        });
+    return read ? Status::Ok()
+                : Failed(FailedAction::ReadFolder, source_, sourceFd_ < 0 ? sourceError_ : errno);
+}
+
+std::unordered_map<std::string, FolderCopy::TargetEntry> FolderCopy::ListTarget() {
+    std::unordered_map<std::string, TargetEntry> entries;
+    if (targetFd_ >= 0) {
+        ForEachEntry(targetFd_, [&](std::string_view name, bool isFolder) {
+            auto [at, inserted] =
+                entries.try_emplace(FoldCase(name), TargetEntry{std::string(name), isFolder});
+            if (!inserted && name < at->second.name) {
+                at->second = {std::string(name), isFolder};
+            }
+        });
+    }
+    return entries;
+}
+
 Status FolderCopy::Copy(const std::string& sourceName, const std::string& targetName,
                         bool targetMayExist, bool* copied) {
     *copied = false;
     if (sourceFd_ < 0) {
-        return Failed(FailedAction::ReadFolder, source_, errno);
+        return Failed(FailedAction::ReadFolder, source_, sourceError_);
     }
     if (targetFd_ < 0) {
-        return Failed(FailedAction::Write, target_, errno);
+        return Failed(FailedAction::Write, target_, targetError_);
     }
     struct stat st {};
     Fd in;

@@ -171,6 +171,24 @@ Status FolderCopy::Copy(const std::string& sourceName, const std::string& target
     return *copied ? ReplaceFile(source, target) : Status::Ok();
 }
 
+Status FolderCopy::ListSource(SourceEntries& entries) {
+    std::error_code ec;
+    for (fs::directory_iterator it(source_, ec), end; !ec && it != end; it.increment(ec)) {
+        std::error_code typeError;
+        (it->is_directory(typeError) ? entries.folders : entries.files)
+            .push_back(PathToUtf8(it->path().filename()));
+    }
+    return ec ? Status::Fail(FailedAction::ReadFolder, source_, ec) : Status::Ok();
+}
+
+std::unordered_map<std::string, FolderCopy::TargetEntry> FolderCopy::ListTarget() {
+    std::unordered_map<std::string, TargetEntry> entries;
+    for (auto& [folded, name] : EntriesByFoldedName(target_)) {
+        entries.emplace(folded, TargetEntry{name, IsDirectory(target_ / PathFromUtf8(name))});
+    }
+    return entries;
+}
+
 // Windows' sharing rules keep the file replaceable only when it is not held open: nothing is
 // held here.
 FileUpdateLock::FileUpdateLock(const fs::path&) {}
