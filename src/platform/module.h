@@ -26,4 +26,8 @@ private:
     std::string error_;
 };
 
+// The file of the program or shared library that holds `address` (code or data of its own);
+// empty when the system cannot tell.
+std::filesystem::path FileHolding(const void* address);
+
 }  // namespace kickvane::platform

@@ -33,4 +33,12 @@ void* Module::Find(const char* name) {
     return address;
 }
 
+std::filesystem::path FileHolding(const void* address) {
+    Dl_info info{};
+    if (::dladdr(address, &info) == 0 || info.dli_fname == nullptr) {
+        return {};
+    }
+    return info.dli_fname;
+}
+
 }  // namespace kickvane::platform

@@ -16,7 +16,7 @@
 #include "shell/side_window_set.h"
 #include "shell/skins.h"
 #include "shell/tray_menu.h"
-#include "shell/update_check.h"
+#include "shell/update_flow.h"
 
 namespace kickvane::shell {
 
@@ -28,7 +28,7 @@ struct ShellServices {
     Dialogs* dialogs = nullptr;  // not owned
     SoundPlayer playSound;
     // Where the update check asks; tests point it at a server of their own.
-    UpdateCheck::Options updates = UpdateCheck::defaultOptions();
+    UpdateFetchOptions updates = defaultUpdateOptions();
     // Makes the tray icon with the window's tray menu; null: the desktop's tray.
     TrayFactory makeTray;
 };

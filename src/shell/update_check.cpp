@@ -3,45 +3,18 @@
 #include <QNetworkAccessManager>
 #include <QNetworkReply>
 #include <QNetworkRequest>
-#include <QPushButton>
-#include <QWidget>
+#include <string_view>
 #include <utility>
 
 #include "shell/fetch_problem.h"
-#include "shell/message_box.h"
-#include "shell/qt_text.h"
-#include "text/utf.h"
-#include "text/vni.h"
-
-#ifndef KICKVANE_UPDATE_HOST
-#define KICKVANE_UPDATE_HOST "http://kickvane.example.net/"
-#endif
+#include "text/update_answer.h"
 
 namespace kickvane::shell {
 
 namespace {
 
-bool isWebScheme(const QString& scheme) {
-    return scheme.compare(u"http", Qt::CaseInsensitive) == 0 ||
-           scheme.compare(u"https", Qt::CaseInsensitive) == 0;
-}
-
 int defaultPort(const QString& scheme) {
     return scheme.compare(u"https", Qt::CaseInsensitive) == 0 ? 443 : 80;
-}
-
-QString fromVni(std::string_view text) {
-    return QString::fromStdString(text::VniToUnicodeUtf8(text));
-}
-
-// A failure's reason with its last two words joined by a no-break space: a box that wraps it
-// carries the last word over together with the one before.
-QString withLastWordsHeld(const QString& reason) {
-    QString held = reason.trimmed();
-    if (const qsizetype lastBlank = held.lastIndexOf(QLatin1Char(' ')); lastBlank > 0) {
-        held[lastBlank] = QChar::Nbsp;
-    }
-    return held;
 }
 
 const QString kTimedOut = fetchProblemText(FetchProblem::TimedOut);
@@ -51,20 +24,6 @@ const QString kTooManyRedirects = fetchProblemText(FetchProblem::TooManyRedirect
 const QString kBadHost = fetchProblemText(FetchProblem::BadHost);
 
 }  // namespace
-
-bool isCurrentVersion(std::string_view text) {
-    return VersionFromAnswer(text) == kToolVersion;
-}
-
-QString checkFailedText(const QString& reason) {
-    return QStringLiteral("Không kiểm tra được phiên bản mới:\n") + withLastWordsHeld(reason);
-}
-
-QString newerVersionText(std::string_view version) {
-    // Only the tool's own VNI-typed words are converted: a fetched "beta1" must not become
-    // "betá".
-    return fromVni("D9a4 co1 phie6n ba3n mo71i! ") + toQString(version);
-}
 
 UpdateCheck::UpdateCheck(Options options, QObject* parent)
     : QObject(parent), options_(std::move(options)), network_(new QNetworkAccessManager(this)) {
@@ -79,18 +38,6 @@ UpdateCheck::UpdateCheck(Options options, QObject* parent)
 UpdateCheck::~UpdateCheck() {
     release(File::Version);
     release(File::Link);
-}
-
-QUrl UpdateCheck::defaultHost() {
-    const QString fromEnvironment = qEnvironmentVariable("KICKVANE_UPDATE_HOST").trimmed();
-    return QUrl(fromEnvironment.isEmpty() ? QString::fromUtf8(KICKVANE_UPDATE_HOST)
-                                          : fromEnvironment);
-}
-
-UpdateCheck::Options UpdateCheck::defaultOptions() {
-    Options options;
-    options.host = defaultHost();
-    return options;
 }
 
 bool UpdateCheck::allowsRedirect(const QUrl& origin, const QUrl& current, const QUrl& target) {
@@ -242,7 +189,7 @@ void UpdateCheck::succeed(File file) {
     const QByteArray body = std::move(transfer(file).body);
     release(file);
     const QString text = QString::fromStdString(
-        ReadFetchedText(std::string_view(body.constData(), static_cast<size_t>(body.size()))));
+        text::ReadFetchedText(std::string_view(body.constData(), static_cast<size_t>(body.size()))));
     if (file == File::Version) {
         emit versionFetched(text);
     } else {
@@ -259,114 +206,37 @@ void UpdateCheck::fail(File file, const QString& reason) {
     }
 }
 
-UpdateFlow::UpdateFlow(UpdateCheck::Options options, session::Session& session, Dialogs& dialogs,
-                       QWidget* owner, QPushButton* checkButton, QPushButton* downloadButton,
-                       UrlOpener openUrl, QObject* parent)
-    : QObject(parent),
-      updates_(std::move(options)),
-      session_(session),
-      dialogs_(dialogs),
-      owner_(owner),
-      checkButton_(checkButton),
-      downloadButton_(downloadButton),
-      openUrl_(std::move(openUrl)) {
-    connect(&updates_, &UpdateCheck::versionFetched, this, &UpdateFlow::onVersion);
-    connect(&updates_, &UpdateCheck::versionFailed, this, &UpdateFlow::onVersionFailed);
-    connect(&updates_, &UpdateCheck::linkFetched, this, [this](const QString& text) {
-        session_.RecordDownloadLink(text.toStdString());
-        link_ = LinkState::Fetched;
-        emit linkFinished();
-    });
-    connect(&updates_, &UpdateCheck::linkFailed, this, [this](const QString& reason) {
-        link_ = LinkState::Failed;
-        linkFailure_ = reason;
-        emit linkFinished();
-    });
-}
+namespace {
 
-void UpdateFlow::check() {
-    if (checking_) {
-        return;
-    }
-    checking_ = true;
-    if (checkButton_) {
-        checkButton_->setEnabled(false);
-    }
-    updates_.fetchVersion();
-}
-
-void UpdateFlow::onVersion(const QString& text) {
-    // An empty answer, a web page or words are no version: nothing to announce or record.
-    const std::optional<std::string> version = VersionFromAnswer(text.toStdString());
-    if (!version) {
-        checking_ = false;
-        if (checkButton_) {
-            checkButton_->setEnabled(true);
-        }
-        showMessage(QStringLiteral("Máy chủ cập nhật trả lời không phải số phiên bản"),
-                    Dialogs::Icon::Warning);
-        emit checkFinished();
-        return;
-    }
-    checking_ = false;
-    if (checkButton_) {
-        checkButton_->setEnabled(true);
-    }
-    if (*version == kToolVersion) {
-        session_.KeepVersion(*version);
-        showMessage(fromVni("Chu7a co1 phie6n ba3n mo71i"), Dialogs::Icon::Information);
-        emit checkFinished();
-        return;
+// UpdateCheck's signals, passed on to the fetcher's caller.
+class SignalledFetcher final : public UpdateFetcher {
+public:
+    SignalledFetcher(const UpdateFetchOptions& options, Done done)
+        : check_(options), done_(std::move(done)) {
+        QObject::connect(&check_, &UpdateCheck::versionFetched, &check_,
+                         [this](const QString& text) { done_(File::Version, true, text); });
+        QObject::connect(&check_, &UpdateCheck::versionFailed, &check_,
+                         [this](const QString& reason) { done_(File::Version, false, reason); });
+        QObject::connect(&check_, &UpdateCheck::linkFetched, &check_,
+                         [this](const QString& text) { done_(File::Link, true, text); });
+        QObject::connect(&check_, &UpdateCheck::linkFailed, &check_,
+                         [this](const QString& reason) { done_(File::Link, false, reason); });
     }
 
-    link_ = LinkState::Pending;
-    updates_.fetchLink();
-    if (checkButton_) {
-        checkButton_->hide();  // until the tool closes
+    void fetch(File file) override {
+        file == File::Version ? check_.fetchVersion() : check_.fetchLink();
     }
-    // Nothing reads the key back, so a failed write must not keep the user from hearing about
-    // the new version.
-    (void)session_.RecordNewVersion(*version);
-    if (downloadButton_) {
-        downloadButton_->show();
-    }
-    showMessage(newerVersionText(*version), Dialogs::Icon::Information);
-    emit checkFinished();
-}
 
-void UpdateFlow::onVersionFailed(const QString& reason) {
-    checking_ = false;
-    if (checkButton_) {
-        checkButton_->setEnabled(true);
-    }
-    showMessage(checkFailedText(reason), Dialogs::Icon::Warning);
-    emit checkFinished();
-}
+private:
+    UpdateCheck check_;
+    Done done_;
+};
 
-void UpdateFlow::download() {
-    const std::optional<std::string> link = DownloadLink(session_.Updates().downloadLink);
-    const QUrl url = link ? QUrl(QString::fromStdString(*link), QUrl::TolerantMode) : QUrl();
-    if (!url.isValid() || !isWebScheme(url.scheme()) || url.host().isEmpty()) {
-        if (link_ == LinkState::Pending) {
-            showMessage(
-                QStringLiteral("Chưa nhận được đường dẫn tải về, xin thử lại sau giây lát."),
-                Dialogs::Icon::Information);
-        } else if (link_ == LinkState::Failed) {
-            showMessage(QStringLiteral("Không lấy được đường dẫn tải về:\n") +
-                            withLastWordsHeld(linkFailure_),
-                        Dialogs::Icon::Warning);
-        } else {
-            showMessage(QStringLiteral("Đường dẫn tải về không hợp lệ."), Dialogs::Icon::Warning);
-        }
-        return;
-    }
-    if (!openUrl_ || !openUrl_(url)) {
-        showMessage(QStringLiteral("Không mở được đường dẫn tải về."), Dialogs::Icon::Warning);
-    }
-}
+}  // namespace
 
-void UpdateFlow::showMessage(const QString& text, Dialogs::Icon icon) {
-    dialogs_.showMessage(owner_.data(), noticeTitle(), text, icon);
+std::unique_ptr<UpdateFetcher> createUpdateFetcher(const UpdateFetchOptions& options,
+                                                   UpdateFetcher::Done done) {
+    return std::make_unique<SignalledFetcher>(options, std::move(done));
 }
 
 }  // namespace kickvane::shell

@@ -1,47 +1,21 @@
 #pragma once
 
 #include <QByteArray>
-#include <QDesktopServices>
 #include <QObject>
 #include <QPointer>
 #include <QString>
 #include <QTimer>
 #include <QUrl>
 #include <array>
-#include <chrono>
-#include <filesystem>
-#include <functional>
+#include <memory>
 #include <optional>
-#include <string>
-#include <string_view>
 
-#include "session/session.h"
-#include "shell/dialogs.h"
-#include "text/update_answer.h"
+#include "shell/update_fetcher.h"
 
 class QNetworkAccessManager;
 class QNetworkReply;
-class QPushButton;
-class QWidget;
 
 namespace kickvane::shell {
-
-inline constexpr std::string_view kToolVersion = "v2.0-demo";
-
-using text::DownloadLink;
-using text::ReadFetchedText;
-using text::VersionFromAnswer;
-
-// True when the fetched answer names this tool's version (blanks and line ends around it do not
-// count).
-bool isCurrentVersion(std::string_view text);
-
-// The message for a check that could not be done. Its reason starts a line of its own, and the
-// reason's last two words are held together, so that no word stands alone on the last line.
-QString checkFailedText(const QString& reason);
-
-// The message for a newer version: the tool's own words, then the version exactly as it came.
-QString newerVersionText(std::string_view version);
 
 // Fetches the version file ("v" at the host's root) and the link file ("vlink") from the update
 // host, each on its own, without blocking. Answers stay in memory and never come from a cache.
@@ -50,12 +24,8 @@ QString newerVersionText(std::string_view version);
 class UpdateCheck final : public QObject {
     Q_OBJECT
 public:
-    struct Options {
-        QUrl host;  // scheme and host of the update host; any path is ignored
-        std::chrono::milliseconds timeout{10000};  // for a whole fetch, redirects included
-        qint64 maxBytes = 64 * 1024;
-    };
-    enum class File { Version, Link };
+    using Options = UpdateFetchOptions;
+    using File = UpdateFetcher::File;
 
     // At most this many redirects are followed, each to the same origin or from http to https
     // on the same host.
@@ -63,11 +33,6 @@ public:
 
     explicit UpdateCheck(Options options, QObject* parent = nullptr);
     ~UpdateCheck() override;
-
-    // KICKVANE_UPDATE_HOST from the environment when set, else the host the build was made for.
-    static QUrl defaultHost();
-    // The options the tool runs with: the default host, 10 s and 64 KiB per fetch.
-    static Options defaultOptions();
 
     // Whether a fetch that started at `origin` and now stands at `current` may go on to `target`.
     static bool allowsRedirect(const QUrl& origin, const QUrl& current, const QUrl& target);
@@ -115,47 +80,8 @@ private:
     std::array<Transfer, 2> transfers_;
 };
 
-// What the window's update buttons do. The window creates the buttons (check visible, download
-// hidden) and connects their clicks to check() and download(). The fetched version and link go
-// to the session; buttons and session must outlive the flow.
-class UpdateFlow final : public QObject {
-    Q_OBJECT
-public:
-    using UrlOpener = std::function<bool(const QUrl&)>;
-
-    UpdateFlow(UpdateCheck::Options options, session::Session& session, Dialogs& dialogs,
-               QWidget* owner, QPushButton* checkButton, QPushButton* downloadButton,
-               UrlOpener openUrl = &QDesktopServices::openUrl, QObject* parent = nullptr);
-
-    // Asks the host for its version. The check button stays disabled until the answer is in;
-    // a newer version swaps the check button for the download button for good.
-    void check();
-    // Opens the fetched link in the browser when it is a web address.
-    void download();
-
-    bool isChecking() const { return checking_; }
-
-signals:
-    void checkFinished();  // the answer or failure has been shown
-    void linkFinished();   // the link fetch has ended, fetched or not
-
-private:
-    enum class LinkState { NotAsked, Pending, Fetched, Failed };
-
-    void onVersion(const QString& text);
-    void onVersionFailed(const QString& reason);
-    void showMessage(const QString& text, Dialogs::Icon icon);
-
-    UpdateCheck updates_;
-    session::Session& session_;
-    Dialogs& dialogs_;
-    QPointer<QWidget> owner_;
-    QPointer<QPushButton> checkButton_;
-    QPointer<QPushButton> downloadButton_;
-    UrlOpener openUrl_;
-    bool checking_ = false;
-    LinkState link_ = LinkState::NotAsked;
-    QString linkFailure_;
-};
+// The fetcher of the update check, built on UpdateCheck.
+std::unique_ptr<UpdateFetcher> createUpdateFetcher(const UpdateFetchOptions& options,
+                                                   UpdateFetcher::Done done);
 
 }  // namespace kickvane::shell

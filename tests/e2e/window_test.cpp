@@ -2,9 +2,14 @@
 // a hotkey text that names no key, a second start, the trigger command and the tray.
 #include <gtest/gtest.h>
 
+#include <netinet/in.h>
 #include <signal.h>
+#include <sys/socket.h>
+#include <unistd.h>
 
+#include <atomic>
 #include <sstream>
+#include <thread>
 
 #include "support/temp_dir.h"
 #include "support/trees.h"
@@ -267,6 +272,69 @@ TEST_F(WindowTest, AddedBallIsChosenSavedAndApplied) {
         return fs::exists(game() / "zdata/data2/ball/textures/ball10.dds") &&
                ReadText(game() / "zdata/data2/ball/textures/ball10.dds") == "new ball";
     }));
+}
+
+// A loopback web server that answers every request with `body`, until it goes.
+class OneAnswerServer {
+public:
+    explicit OneAnswerServer(std::string body) : body_(std::move(body)) {
+        listener_ = ::socket(AF_INET, SOCK_STREAM | SOCK_CLOEXEC, 0);
+        sockaddr_in address{};
+        address.sin_family = AF_INET;
+        address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
+        socklen_t length = sizeof address;
+        if (::bind(listener_, reinterpret_cast<sockaddr*>(&address), length) != 0 ||
+            ::listen(listener_, 4) != 0 ||
+            ::getsockname(listener_, reinterpret_cast<sockaddr*>(&address), &length) != 0) {
+            return;
+        }
+        port_ = ntohs(address.sin_port);
+        thread_ = std::jthread([this] { Serve(); });
+    }
+    ~OneAnswerServer() { ::shutdown(listener_, SHUT_RDWR); }
+
+    std::string Root() const { return "http://127.0.0.1:" + std::to_string(port_) + "/"; }
+    int requests() const { return requests_; }
+
+private:
+    void Serve() {
+        for (int client; (client = ::accept(listener_, nullptr, nullptr)) >= 0; ::close(client)) {
+            char request[4096];
+            if (::read(client, request, sizeof request) <= 0) {
+                continue;
+            }
+            ++requests_;
+            const std::string answer =
+                "HTTP/1.0 200 OK\r\nContent-Length: " + std::to_string(body_.size()) + "\r\n\r\n" +
+                body_;
+            (void)!::write(client, answer.data(), answer.size());
+        }
+        ::close(listener_);
+    }
+
+    std::string body_;
+    int listener_ = -1;
+    int port_ = 0;
+    std::atomic<int> requests_{0};
+    std::jthread thread_;
+};
+
+// The update check's network code is a module of its own, loaded by the first check: a newer
+// version on the host is recorded in the settings.
+TEST_F(WindowTest, UpdateCheckLoadsItsNetworkCodeAndRecordsANewerVersion) {
+    WriteSettings("F7");
+    OneAnswerServer host("v9.9");
+    ::setenv("KICKVANE_UPDATE_HOST", host.Root().c_str(), 1);
+    auto kickvane = StartKickvane();
+    ::unsetenv("KICKVANE_UPDATE_HOST");
+    ASSERT_TRUE(WindowShown(kWindowTitle, *kickvane)) << ReadText(dir_ / "kickvane.log");
+    const std::string window = FindWindow(kWindowTitle, *kickvane);
+    Capture("xdotool mousemove --window " + window + " 264 23 click 1");  // "Kiểm tra cập nhật"
+    EXPECT_TRUE(WaitFor([&] {
+        return ReadText(tool() / "ThietLap.ini").find("PhienBan=v9.9") != std::string::npos;
+    })) << ReadText(tool() / "ThietLap.ini")
+        << ReadText(dir_ / "kickvane.log");
+    EXPECT_GE(host.requests(), 1);
 }
 
 }  // namespace

@@ -1,4 +1,5 @@
 #include "shell/update_check.h"
+#include "shell/update_flow.h"
 
 #include <gtest/gtest.h>
 
