@@ -8,6 +8,7 @@
 #include <cstdint>
 #include <fstream>
 #include <random>
+#include <string_view>
 #include <vector>
 
 #include "platform/filesystem.h"
@@ -171,21 +172,54 @@ Status FolderCopy::Copy(const std::string& sourceName, const std::string& target
     return *copied ? ReplaceFile(source, target) : Status::Ok();
 }
 
-Status FolderCopy::ListSource(SourceEntries& entries) {
-    std::error_code ec;
-    for (fs::directory_iterator it(source_, ec), end; !ec && it != end; it.increment(ec)) {
-        std::error_code typeError;
-        (it->is_directory(typeError) ? entries.folders : entries.files)
-            .push_back(PathToUtf8(it->path().filename()));
+namespace {
+
+// Calls `entry(name, isFolder)` for each entry of `folder` but "." and "..", with the attributes
+// the listing gives (no look at each entry). A link to a folder counts as a folder. False, with
+// the system's error, when the folder cannot be read.
+template <typename Entry>
+bool ForEachEntry(const fs::path& folder, std::error_code& error, Entry&& entry) {
+    WIN32_FIND_DATAW found{};
+    const fs::path pattern = folder / L"*";
+    HANDLE find = ::FindFirstFileExW(pattern.c_str(), FindExInfoBasic, &found,
+                                     FindExSearchNameMatch, nullptr, FIND_FIRST_EX_LARGE_FETCH);
+    if (find == INVALID_HANDLE_VALUE) {
+        error = LastError();
+        return false;
     }
-    return ec ? Status::Fail(FailedAction::ReadFolder, source_, ec) : Status::Ok();
+    do {
+        const std::wstring_view name = found.cFileName;
+        if (name != L"." && name != L"..") {
+            entry(PathToUtf8(fs::path(name)),
+                  (found.dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY) != 0);
+        }
+    } while (::FindNextFileW(find, &found));
+    const DWORD last = ::GetLastError();
+    ::FindClose(find);
+    if (last != ERROR_NO_MORE_FILES) {
+        error = {static_cast<int>(last), std::system_category()};
+        return false;
+    }
+    return true;
+}
+
+}  // namespace
+
+Status FolderCopy::ListSource(SourceEntries& entries) {
+    std::error_code error;
+    const bool read = ForEachEntry(source_, error, [&](std::string name, bool isFolder) {
+        (isFolder ? entries.folders : entries.files).push_back(std::move(name));
+    });
+    return read ? Status::Ok() : Status::Fail(FailedAction::ReadFolder, source_, error);
 }
 
 std::unordered_map<std::string, FolderCopy::TargetEntry> FolderCopy::ListTarget() {
     std::unordered_map<std::string, TargetEntry> entries;
-    for (auto& [folded, name] : EntriesByFoldedName(target_)) {
-        entries.emplace(folded, TargetEntry{name, IsDirectory(target_ / PathFromUtf8(name))});
-    }
+    std::error_code error;
+    ForEachEntry(target_, error, [&](std::string name, bool isFolder) {
+        std::string folded = FoldCase(name);
+        entries.try_emplace(std::move(folded), TargetEntry{std::move(name), isFolder});
+    });
     return entries;
 }
 
