@@ -114,9 +114,9 @@ struct FolderJobs {
     }
 };
 
-// A share of the work that one thread takes at a time: one file, or every file of a folder whose
-// names collide. Shares are numbered in the order the copy has always taken: a folder's files in
-// name order, then its subfolders in name order, depth first.
+// A share of the work that one thread takes at a time: a few files of a folder in name order, or
+// every file of a folder whose names collide. Shares are numbered in the order the copy has always
+// taken: a folder's files in name order, then its subfolders in name order, depth first.
 struct Share {
     FolderJobs* folder;
     size_t first;
@@ -149,6 +149,8 @@ public:
 private:
     // A copying thread for every this many files waiting, up to the cores (at most four).
     static constexpr size_t kFilesPerWorker = 32;
+    // Files of one folder taken together, so that threads meet at the queue less often.
+    static constexpr size_t kFilesPerShare = 8;
     // Folders that the walk leaves open for their copy, at most (two descriptors each).
     static constexpr int kMaxKeptOpen = 64;
 
@@ -217,8 +219,8 @@ private:
             if (folder->oneByOne) {
                 shares_.push_back({folder.get(), 0, files});
             } else {
-                for (size_t i = 0; i < files; ++i) {
-                    shares_.push_back({folder.get(), i, 1});
+                for (size_t i = 0; i < files; i += kFilesPerShare) {
+                    shares_.push_back({folder.get(), i, std::min(kFilesPerShare, files - i)});
                 }
             }
             waitingFiles_ += files;
