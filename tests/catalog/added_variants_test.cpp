@@ -163,15 +163,6 @@ AddedVariants OneOfEach() {
     return added;
 }
 
-TEST(AddedVariantSettings, FileWithoutAddedVariantsIsWrittenAsBefore) {
-    TempDir tool;
-    const Settings settings{"C:\\Games", "F7", PatchSelection::Defaults()};
-    ASSERT_TRUE(SaveSettings(tool.path(), settings).ok());
-    const std::string before = ReadText(tool / "ThietLap.ini");
-    ASSERT_TRUE(SaveSettings(tool.path(), settings, AddedVariants{}).ok());
-    EXPECT_EQ(ReadText(tool / "ThietLap.ini"), before);
-}
-
 TEST(AddedVariantSettings, ChosenAddedVariantsRoundTripAfterTheCatalogKeys) {
     TempDir tool;
     const AddedVariants added = OneOfEach();

@@ -27,23 +27,6 @@ TEST(Settings, SaveWritesTheToolsSectionsOnlyAndTheirKeysInOrder) {
     EXPECT_EQ(text.find("Extra"), std::string::npos);
 }
 
-TEST(Settings, SaveThenLoadRestoresEverySwitchAndVariant) {
-    TempDir tool;
-    Settings saved{"/home/player/.wine/drive_c/Program Files/Garena/FIFA Online 2 with a long name",
-                   "F3", PatchSelection::Defaults()};
-    saved.selection.SetSwitchValue(0, 0);
-    saved.selection.SetSwitchValue(12, 1);
-    saved.selection.SetOptionValue(OptionArray::Ball, 3, true);
-    saved.selection.SetOptionValue(OptionArray::Other, 6, true);
-    saved.selection.SetOptionValue(OptionArray::Other, 8, false);  // mark: none chosen
-    ASSERT_TRUE(SaveSettings(tool.path(), saved).ok());
-
-    const Settings loaded = LoadSettings(tool.path()).settings;
-    EXPECT_EQ(loaded.gameFolder, saved.gameFolder);  // whole, however long
-    EXPECT_EQ(loaded.hotkey, "F3");
-    EXPECT_EQ(loaded.selection, saved.selection);
-}
-
 TEST(Settings, LoadTakesValuesKeyByKey) {
     TempDir tool;
     WriteFile(tool / "ThietLap.ini",

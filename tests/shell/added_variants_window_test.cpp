@@ -1,13 +1,18 @@
-// The window with sets the player added: shown after the catalog's options, chosen, previewed and
-// saved; folders that cannot be a choice named under their group.
+// The window with sets the player added: shown after the catalog's options, chosen and previewed;
+// folders that cannot be a choice named under their group. Saving the choice is the session's
+// test and the end-to-end window test's.
 #include <gtest/gtest.h>
 
-#include <QDir>
 #include <QScrollBar>
 
 #include "shell/qt_text.h"
 #include "support/trees.h"
+// GCC takes the recording dialogs' std::optional<QString> for uninitialised where this file
+// inlines it (as in the label test).
+#pragma GCC diagnostic push
+#pragma GCC diagnostic ignored "-Wmaybe-uninitialized"
 #include "window_fixture.h"
+#pragma GCC diagnostic pop
 
 namespace kickvane::shell {
 namespace {
@@ -37,14 +42,9 @@ protected:
             picture.save(pathToQString(tool / "extras" / group / names[0] / "Preview.PNG"), "PNG");
         }
     }
-
-    static void SavePicture(QWidget& widget, const QString& name) {
-        QDir().mkpath(QStringLiteral(KICKVANE_ARTIFACTS));
-        widget.grab().save(QStringLiteral(KICKVANE_ARTIFACTS "/") + name);
-    }
 };
 
-TEST_F(AddedVariantsWindowTest, AddedSetsShowAfterTheCatalogAreChosenPreviewedAndSaved) {
+TEST_F(AddedVariantsWindowTest, AddedSetsShowAfterTheCatalogAreChosenAndPreviewed) {
     AddTwoSetsPerGroup(tool());
     fs::create_directories(tool() / "extras/adboard/Trống");
     auto window = Open();
@@ -99,12 +99,6 @@ TEST_F(AddedVariantsWindowTest, AddedSetsShowAfterTheCatalogAreChosenPreviewedAn
     QCoreApplication::sendEvent(panels.addedLabel(GroupId::Pitch, QStringLiteral("Sọc ngang")),
                                 &enter);
     EXPECT_TRUE(preview->pictureFile().endsWith("Sọc ngang/Preview.PNG"));
-
-    Click(window->buttons().save());
-    const catalog::Settings saved =
-        catalog::LoadSettings(tool(), window->session().AddedVariants()).settings;
-    EXPECT_EQ(saved.selection.ChosenAdded(GroupId::Pitch), "Sọc ngang");
-    EXPECT_EQ(saved.selection.Chosen(GroupId::Adboard), 0);
 }
 
 TEST_F(AddedVariantsWindowTest, SetsDroppedWhileInTheTrayShowWhenTheWindowComesBack) {
@@ -114,31 +108,6 @@ TEST_F(AddedVariantsWindowTest, SetsDroppedWhileInTheTrayShowWhenTheWindowComesB
     WriteFile(tool() / "extras/Indicator/Vòng xanh/mark.dds", "x");
     window->tray().entry(QStringLiteral("Hiện chương trình"))->trigger();
     EXPECT_NE(window->panels().addedButton(GroupId::Mark, QStringLiteral("Vòng xanh")), nullptr);
-}
-
-// Pictures of the panels with two added sets per group in both skins, on the built artwork.
-TEST_F(AddedVariantsWindowTest, PanelsWithAddedSetsInBothSkins) {
-    const fs::path built = KICKVANE_TOOL_DIR;
-    if (!fs::exists(built / "skin/skin2_bg.jpg")) {
-        GTEST_SKIP() << "the artwork is not built";
-    }
-    for (const char* folder : {"skin", "img", "icons", "data"}) {
-        fs::create_directories(tool());
-        fs::create_directory_symlink(built / folder, tool() / folder);
-    }
-    AddTwoSetsPerGroup(tool());
-    fs::create_directories(tool() / "extras/Ball/Chưa có file");  // named under the group
-    auto window = Open();
-    window->show();
-    FinishFade(*window);
-    for (const SkinLook& look : {lightSkin(), darkSkin()}) {
-        window->applySkin(look);
-        for (int tab : {1, 2, 3}) {
-            Click(window->panels().tabHead(tab));
-            QCoreApplication::processEvents();
-            SavePicture(*window, QStringLiteral("added-sets-tab%1-%2.png").arg(tab).arg(look.name));
-        }
-    }
 }
 
 }  // namespace

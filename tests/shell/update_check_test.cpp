@@ -39,20 +39,15 @@ QByteArray Redirect(const QByteArray& to) {
     return Response("302 Found", {}, "Location: " + to + "\r\n");
 }
 
-TEST(UpdateCheckTextTest, OurVersionWithBlanksOrLineEndsAroundItIsCurrent) {
-    for (const char* same : {"v2.0-demo", "v2.0-demo ", "v2.0-demo\n", "v2.0-demo\r\n\r\n"}) {
-        EXPECT_TRUE(isCurrentVersion(ReadFetchedText(same))) << same;
-    }
-    for (const char* other : {"v2.0-demo\r\nbeta", "V2.0-DEMO", "v2.0-demo2", ""}) {
+// Blanks and line ends around an answer are the answer reader's own test; the fetched version
+// in the message is the flow's.
+TEST(UpdateCheckTextTest, OnlyOurOwnVersionIsCurrent_AndFailureMessagesKeepNoLastWordAlone) {
+    EXPECT_TRUE(isCurrentVersion(ReadFetchedText("v2.0-demo\r\n\r\n")));
+    for (const char* other : {"v2.0-demo\r\nbeta", "V2.0-DEMO", "v2.0-demo2", "v2.0", ""}) {
         EXPECT_FALSE(isCurrentVersion(ReadFetchedText(other))) << other;
     }
-}
-
-TEST(UpdateCheckTextTest, MessagesKeepTheFetchedVersionAsItCameAndNoLastWordAlone) {
-    EXPECT_EQ(newerVersionText("v2.0-beta1"), "Đã có phiên bản mới! v2.0-beta1");
     EXPECT_EQ(checkFailedText(QStringLiteral("máy chủ không trả lời kịp ")),
               QStringLiteral("Không kiểm tra được phiên bản mới:\nmáy chủ không trả lời\u00A0kịp"));
-    EXPECT_EQ(checkFailedText(QStringLiteral("x")), "Không kiểm tra được phiên bản mới:\nx");
 }
 
 TEST(UpdateCheckTextTest, RedirectsStayOnTheHostAndNeverLeaveHttps) {
@@ -234,11 +229,9 @@ TEST_F(UpdateFlowTest, FailedChecksAreReportedAndChangeNothing) {
 
 TEST_F(UpdateFlowTest, AnAnswerThatIsNoVersionIsSaidSoAndChangesNothing) {
     responses_["/vlink"] = Ok("https://dl.example.net/kv.zip");
+    // Which answers are no version is the answer reader's own test.
     for (const QByteArray& answer :
-         {QByteArray("<html>\n<body>Wi-Fi login</body>\n</html>\n"),
-          QByteArray("<html><body>v9.9</body></html>"), QByteArray("<img src=\"/etc/x.png\">"),
-          QByteArray("<h1>v2.1</h1>"), QByteArray("v2.1&amp;"), QByteArray("hello world"),
-          QByteArray("")}) {
+         {QByteArray("<html>\n<body>Wi-Fi login v9.9</body>\n</html>\n"), QByteArray("")}) {
         SCOPED_TRACE(answer.toStdString());
         responses_["/v"] = Ok(answer);
         session_->KeepVersion("v1.9");
