@@ -2,33 +2,22 @@
 
 #include <gtest/gtest.h>
 
-#include "support/temp_dir.h"
+#include "support/trees.h"
 
 namespace kickvane::engine {
 namespace {
 
 namespace fs = std::filesystem;
 using testing::ReadText;
-using testing::TempDir;
 using testing::WriteFile;
 
-class QuickLoadTest : public ::testing::Test {
+// The tool's folders that quick load fills, and a source folder beside it.
+class QuickLoadTest : public testing::ToolAndGameTest {
 protected:
-    void SetUp() override {
-        for (const char* folder :
-             {"data/data2/players/heads/textures", "data/data2/players/bodies/textures",
-              "data/zdata/data2/ball/textures"}) {
-            fs::create_directories(tool() / folder);
-        }
-    }
-
-    fs::path tool() const { return dir_ / "tool"; }
     fs::path source() const { return dir_ / "source"; }
     fs::path heads() const { return tool() / "data/data2/players/heads"; }
 
     QuickLoadOutcome Load() { return QuickLoad(tool(), source()); }
-
-    TempDir dir_;
 };
 
 TEST_F(QuickLoadTest, DirectFilesGoFirstAndNestedFormsOnlyWhereNoDirectFileMatches) {
