@@ -60,7 +60,9 @@ TEST(PaintersTest, PartsWithoutThatLook_DrawNothing) {
     }
 }
 
-TEST(PaintersTest, CheckBoxAndOptionButton_CopyTheirCell_OptionShowsTheTargetAroundIt) {
+// Which cell each state and look copies, and the option button's keyed copy, are the gallery
+// reference's to check; here, that a larger box does not stretch the 13-pixel cell.
+TEST(PaintersTest, CheckBox_CopiesItsCellUnstretchedWhateverTheBox) {
     Skin& k = theSkin();
     QImage target = filled(40, 40, Qt::black);
     ImageSurface image(target);
@@ -68,23 +70,7 @@ TEST(PaintersTest, CheckBoxAndOptionButton_CopyTheirCell_OptionShowsTheTargetAro
         k.paintCheckBox(image, CheckState::Unticked, ControlLook::Pressed, Rect{5, 7, 30, 30})
             .ok());
     EXPECT_EQ(target.copy(5, 7, 13, 13), k.pictures().checkBox.copy(0, 26, 13, 13));
-    EXPECT_EQ(target.pixelColor(18, 7), QColor(Qt::black));  // 13 wide, whatever the box
-
-    QImage under = filled(13, 13, Qt::black);
-    ImageSurface dc(under);
-    ASSERT_TRUE(
-        k.paintOptionButton(dc, OptionState::Selected, ControlLook::Hot, Rect{0, 0, 13, 13}).ok());
-    const QImage cell = k.pictures().optionButton.copy(0, 5 * 13, 13, 13);
-    int shownThrough = 0;
-    for (int y = 0; y < 13; ++y) {
-        for (int x = 0; x < 13; ++x) {
-            const bool key = (cell.pixel(x, y) & 0xFFFFFFu) == kMagentaKey;
-            EXPECT_EQ(under.pixel(x, y), key ? QColor(Qt::black).rgb() : cell.pixel(x, y))
-                << x << "," << y;
-            shownThrough += key ? 1 : 0;
-        }
-    }
-    EXPECT_GT(shownThrough, 0);
+    EXPECT_EQ(target.pixelColor(18, 7), QColor(Qt::black));
 }
 
 TEST(PaintersTest, ReportingPainters_ReturnFailuresOfTheirSurface) {
