@@ -7,12 +7,7 @@
 
 #include "shell/qt_text.h"
 #include "support/trees.h"
-// GCC takes the recording dialogs' std::optional<QString> for uninitialised where this file
-// inlines it (as in the label test).
-#pragma GCC diagnostic push
-#pragma GCC diagnostic ignored "-Wmaybe-uninitialized"
 #include "window_fixture.h"
-#pragma GCC diagnostic pop
 
 namespace kickvane::shell {
 namespace {
