@@ -1,5 +1,6 @@
 // Subcommands that find the game and start it, and the choice of the tool folder.
 #include <iostream>
+#include <thread>
 
 #include "commands.h"
 #include "game/find_game.h"
@@ -37,15 +38,23 @@ int RunLaunch(Args args) {
         std::cerr << "kickvane: " << problem->text << '\n';
         return 2;
     }
-    const session::LaunchRun run = session.Launch(session::LaunchFrom::Tray);
-    if (!run.launch.started()) {
+    session::LaunchRun run = session.Launch(session::LaunchFrom::Tray);
+    // The program that starts the launcher is watched for a moment: one that fails at once (a
+    // missing prefix, a manager that cannot find its game) is reported as a failure.
+    while (run.watching()) {
+        std::this_thread::sleep_for(session::kLaunchWatchInterval);
+        if (std::optional<session::LaunchRun> decided = session.TickLaunch()) {
+            run = std::move(*decided);
+        }
+    }
+    if (!run.started()) {
         for (const text::Message& message : run.shown.messages) {
             std::cerr << "kickvane: " << message.text << " (" << session.Settings().gameFolder
                       << ")\n";
         }
         return 1;
     }
-    std::cout << "started Gameloader.exe through " << run.launch.startedThrough << '\n';
+    std::cout << "đã khởi động Gameloader.exe " << run.way << '\n';
     return 0;
 }
 

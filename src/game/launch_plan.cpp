@@ -17,10 +17,6 @@ bool SameFile(const fs::path& a, const fs::path& b) {
     return !a.empty() && !b.empty() && fs::equivalent(a, b, error) && !error;
 }
 
-std::string FlatpakNote(bool flatpak) {
-    return flatpak ? " (Flatpak)" : "";
-}
-
 // Lutris starts its own game: only when its program is this very launcher.
 std::optional<LaunchPlan> ThroughLutris(const ManagedPrefix& game, const fs::path& launcher,
                                         const ProgramLookup& findProgram) {
@@ -29,17 +25,22 @@ std::optional<LaunchPlan> ThroughLutris(const ManagedPrefix& game, const fs::pat
     }
     const std::string uri =
         !game.id.empty() ? "lutris:rungameid/" + game.id : "lutris:rungame/" + game.slug;
-    const std::string what = "Lutris" + FlatpakNote(game.flatpak) + ": " +
-                             (game.name.empty() ? game.slug : game.name) +
-                             (game.id.empty() ? "" : " (game " + game.id + ")");
+    LaunchPlan plan;
+    plan.way = LaunchWay::Lutris;
+    plan.flatpak = game.flatpak;
+    plan.gameName = game.name.empty() ? game.slug : game.name;
+    plan.gameId = game.id;
     if (game.flatpak) {
-        if (fs::path flatpak = findProgram("flatpak"); !flatpak.empty()) {
-            return LaunchPlan{flatpak, {"run", std::string(kLutrisFlatpakId), uri}, {}, {}, what};
-        }
-    } else if (fs::path lutris = findProgram("lutris"); !lutris.empty()) {
-        return LaunchPlan{lutris, {uri}, {}, {}, what};
+        plan.program = findProgram("flatpak");
+        plan.arguments = {"run", std::string(kLutrisFlatpakId), uri};
+    } else {
+        plan.program = findProgram("lutris");
+        plan.arguments = {uri};
     }
-    return std::nullopt;
+    if (plan.program.empty()) {
+        return std::nullopt;
+    }
+    return plan;
 }
 
 // Bottles runs any program of a bottle with the bottle's Wine and settings: a program inside the
@@ -51,18 +52,22 @@ std::optional<LaunchPlan> ThroughBottles(const ManagedPrefix& bottle, const fs::
         return std::nullopt;
     }
     const std::vector<std::string> run{"run", "-b", bottle.id, "-e", launcher.string()};
-    const std::string what = "Bottles" + FlatpakNote(bottle.flatpak) + ": bottle " + bottle.id;
+    LaunchPlan plan;
+    plan.way = LaunchWay::Bottles;
+    plan.flatpak = bottle.flatpak;
+    plan.gameId = bottle.id;
     if (bottle.flatpak) {
-        if (fs::path flatpak = findProgram("flatpak"); !flatpak.empty()) {
-            std::vector<std::string> arguments{"run", "--command=bottles-cli",
-                                               std::string(kBottlesFlatpakId)};
-            arguments.insert(arguments.end(), run.begin(), run.end());
-            return LaunchPlan{flatpak, std::move(arguments), {}, {}, what};
-        }
-    } else if (fs::path cli = findProgram("bottles-cli"); !cli.empty()) {
-        return LaunchPlan{cli, run, {}, {}, what};
+        plan.program = findProgram("flatpak");
+        plan.arguments = {"run", "--command=bottles-cli", std::string(kBottlesFlatpakId)};
+        plan.arguments.insert(plan.arguments.end(), run.begin(), run.end());
+    } else {
+        plan.program = findProgram("bottles-cli");
+        plan.arguments = run;
     }
-    return std::nullopt;
+    if (plan.program.empty()) {
+        return std::nullopt;
+    }
+    return plan;
 }
 
 // The prefix that a manager's configuration names for this very launcher (Lutris's "prefix",
@@ -94,7 +99,8 @@ LaunchDecision PlanLaunch(std::string_view gameFolder, const UserFolders& folder
         platform::ResolveCaseInsensitive(platform::NativePathFromUserText(folderText));
     LaunchPlan& plan = decision.plan;
     if (platform::IsNativeExecutable(launcher)) {
-        plan = {launcher, {}, {}, workingFolder, "directly"};
+        plan.program = launcher;
+        plan.workingFolder = workingFolder;
         return decision;
     }
 
@@ -137,19 +143,19 @@ LaunchDecision PlanLaunch(std::string_view gameFolder, const UserFolders& folder
             if (!entry.wineProgram.empty() && !entry.prefix.empty() &&
                 CanonicalOrNormal(entry.prefix) == canonicalPrefix) {
                 wine = entry.wineProgram;
-                plan.description = std::string(ManagerName(entry.manager)) + "'s Wine ";
+                plan.wineKeptBy = entry.manager;
                 break;
             }
         }
     }
     if (wine.empty()) {
         wine = findProgram("wine");
-        plan.description = "Wine ";
     }
     if (wine.empty()) {
         decision.problem = LaunchProblem::WineMissing;
         return decision;
     }
+    plan.way = LaunchWay::Wine;
     plan.program = wine;
     plan.arguments = {launcher.string()};
     plan.workingFolder = workingFolder;
@@ -159,10 +165,8 @@ LaunchDecision PlanLaunch(std::string_view gameFolder, const UserFolders& folder
         if (arch == "win32" || arch == "win64") {
             plan.environment.emplace_back("WINEARCH", arch);
         }
-        plan.description +=
-            "in prefix " + prefix->string() + (arch.empty() ? "" : " (" + arch + ")");
-    } else {
-        plan.description += "in the prefix of the environment";
+        plan.prefix = *prefix;
+        plan.arch = arch;
     }
     return decision;
 }

@@ -2,22 +2,39 @@
 
 #include <filesystem>
 #include <functional>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
 
+#include "game/game_managers.h"
 #include "game/wine_prefix.h"
 #include "platform/process.h"
 
 namespace kickvane::game {
 
-// What to run to start the game's launcher.
+// Which program starts the game's launcher.
+enum class LaunchWay {
+    Direct,   // the launcher itself, a program this system runs
+    Lutris,   // Lutris runs its game
+    Bottles,  // Bottles runs the launcher in a bottle
+    Wine,     // Wine runs the launcher
+};
+
+// What to run to start the game's launcher, and which way that is, for the words a player reads.
 struct LaunchPlan {
     fs::path program;
     std::vector<std::string> arguments;
     platform::EnvironmentAdditions environment;
     fs::path workingFolder;
-    std::string description;  // which way the game is started, for the user
+
+    LaunchWay way = LaunchWay::Direct;
+    bool flatpak = false;                 // Lutris or Bottles: their Flatpak build
+    std::optional<Manager> wineKeptBy;    // Wine: the manager whose Wine build it is
+    fs::path prefix;                      // Wine: the prefix; empty: the environment's
+    std::string arch;                     // Wine: the prefix's "win32" or "win64", when recorded
+    std::string gameName;                 // Lutris: the game's name (or short name)
+    std::string gameId;                   // Lutris: the game's number; Bottles: the bottle
 };
 
 enum class LaunchProblem { None, LauncherMissing, WineMissing };

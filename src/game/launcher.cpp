@@ -1,44 +1,52 @@
 #include "game/launcher.h"
 
-#include "game/launch_plan.h"
-#include "platform/filesystem.h"
 #include "platform/process.h"
-#include "text/failure_text.h"
-#include "text/vni.h"
 
 namespace kickvane::game {
 
-namespace {
-
-LaunchOutcome NotStarted(LaunchResult result, std::string text) {
-    return {result, text::Message{text::Message::Kind::Component, std::move(text), {}}, {}};
+LaunchStart LaunchGame(std::string_view gameFolder) {
+    LaunchDecision decision =
+        PlanLaunch(gameFolder, UserFolders::FromEnvironment(), platform::FindOnPath);
+    LaunchStart start{decision.problem, std::move(decision.plan), nullptr};
+    if (start.problem == LaunchProblem::None) {
+        const LaunchPlan& plan = start.plan;
+        start.program = platform::StartWatched(plan.program, plan.arguments, plan.workingFolder,
+                                               true, plan.environment);
+    }
+    return start;
 }
 
-}  // namespace
+LaunchWatch::LaunchWatch(std::unique_ptr<platform::ProgramWatch> program, Clock now,
+                         std::chrono::milliseconds watchTime)
+    : program_(std::move(program)), now_(std::move(now)), deadline_(now_() + watchTime) {}
 
-LaunchOutcome LaunchGame(std::string_view gameFolder) {
-    const LaunchDecision decision =
-        PlanLaunch(gameFolder, UserFolders::FromEnvironment(), platform::FindOnPath);
-    if (decision.problem == LaunchProblem::LauncherMissing) {
-        return NotStarted(LaunchResult::LauncherMissing,
-                          text::VniToUnicodeUtf8(kLauncherMissingVni));
+LaunchVerdict LaunchWatch::Tick() {
+    if (verdict_ != LaunchVerdict::Watching) {
+        return verdict_;
     }
-    if (decision.problem == LaunchProblem::WineMissing) {
-        return NotStarted(LaunchResult::WineMissing, std::string(kWineMissingText));
+    using Kind = platform::ProgramState::Kind;
+    state_ = program_ ? program_->Poll() : platform::ProgramState{Kind::Running, 0, {}};
+    switch (state_.kind) {
+        case Kind::NotRun:
+        case Kind::Killed:
+            verdict_ = LaunchVerdict::Failed;
+            break;
+        case Kind::Exited:
+            verdict_ = state_.code == 0 ? LaunchVerdict::Started : LaunchVerdict::Failed;
+            break;
+        case Kind::Running:
+            if (now_() >= deadline_) {
+                verdict_ = LaunchVerdict::Started;
+            }
+            break;
+        case Kind::Starting:
+            // Not known yet whether it could be run at all: wait for that, even past the time.
+            break;
     }
-    const LaunchPlan& plan = decision.plan;
-    const Status started = platform::StartDetached(plan.program, plan.arguments, plan.workingFolder,
-                                                   true, plan.environment);
-    if (!started) {
-        return NotStarted(
-            LaunchResult::StartFailed,
-            std::string(kStartFailedText) +
-                text::FailureText(started.failure(),
-                                  {platform::NativePathFromUserText(gameFolder), {}}));
+    if (verdict_ != LaunchVerdict::Watching) {
+        program_.reset();
     }
-    LaunchOutcome outcome;
-    outcome.startedThrough = plan.description;
-    return outcome;
+    return verdict_;
 }
 
 }  // namespace kickvane::game

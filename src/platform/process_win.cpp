@@ -81,14 +81,61 @@ std::wstring EnvironmentBlockWith(const EnvironmentAdditions& additions) {
 
 }  // namespace
 
-Status StartDetached(const fs::path& program, const std::vector<std::string>& arguments,
-                     const fs::path& workingFolder, bool minimised,
-                     const EnvironmentAdditions& environment) {
+namespace {
+
+// Polls the process's handle without waiting; the handle is closed when the watch goes, which
+// leaves the program running on its own.
+class WindowsWatch final : public ProgramWatch {
+public:
+    explicit WindowsWatch(HANDLE process) : process_(process) {
+        state_.kind = ProgramState::Kind::Running;
+    }
+    ~WindowsWatch() override { Close(); }
+    WindowsWatch(const WindowsWatch&) = delete;
+    WindowsWatch& operator=(const WindowsWatch&) = delete;
+
+    ProgramState Poll() override {
+        if (process_ == nullptr || WaitForSingleObject(process_, 0) != WAIT_OBJECT_0) {
+            return state_;
+        }
+        DWORD code = 0;
+        if (GetExitCodeProcess(process_, &code)) {
+            state_.kind = ProgramState::Kind::Exited;
+            state_.code = static_cast<int>(code);
+        }
+        Close();
+        return state_;
+    }
+
+private:
+    void Close() {
+        if (process_ != nullptr) {
+            CloseHandle(process_);
+            process_ = nullptr;
+        }
+    }
+
+    HANDLE process_;
+    ProgramState state_;
+};
+
+std::unique_ptr<ProgramWatch> NotRun(const fs::path& program, std::error_code code) {
+    ProgramState state;
+    state.kind = ProgramState::Kind::NotRun;
+    state.failure = {FailedAction::Run, program, code, {}};
+    return FixedProgramWatch(std::move(state));
+}
+
+}  // namespace
+
+std::unique_ptr<ProgramWatch> StartWatched(const fs::path& program,
+                                           const std::vector<std::string>& arguments,
+                                           const fs::path& workingFolder, bool minimised,
+                                           const EnvironmentAdditions& environment) {
     std::error_code error;
     const fs::path absoluteProgram = fs::absolute(program, error);
     if (program.empty() || error) {
-        return Status::Fail(FailedAction::Run, program,
-                            error ? error : std::make_error_code(std::errc::invalid_argument));
+        return NotRun(program, error ? error : std::make_error_code(std::errc::invalid_argument));
     }
     std::wstring commandLine;
     AppendQuoted(commandLine, absoluteProgram.wstring());
@@ -110,14 +157,11 @@ Status StartDetached(const fs::path& program, const std::vector<std::string>& ar
                         CREATE_NEW_PROCESS_GROUP | CREATE_UNICODE_ENVIRONMENT,
                         environmentBlock.empty() ? nullptr : environmentBlock.data(),
                         folder.empty() ? nullptr : folder.c_str(), &startup, &process)) {
-        return Status::Fail(
-            FailedAction::Run, program,
-            std::error_code(static_cast<int>(GetLastError()), std::system_category()));
+        return NotRun(program,
+                      std::error_code(static_cast<int>(GetLastError()), std::system_category()));
     }
-    // The program runs on its own; the handles are not needed to let it.
     CloseHandle(process.hThread);
-    CloseHandle(process.hProcess);
-    return Status::Ok();
+    return std::make_unique<WindowsWatch>(process.hProcess);
 }
 
 fs::path FindOnPath(const std::string& name) {

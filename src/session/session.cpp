@@ -5,6 +5,8 @@
 #include "platform/filesystem.h"
 #include "platform/text.h"
 #include "text/utf.h"
+#include "text/vni.h"
+#include "session/game_words.h"
 
 namespace kickvane::session {
 
@@ -322,11 +324,54 @@ Outcome Session::Save() {
 }
 
 LaunchRun Session::Launch(LaunchFrom from) {
-    LaunchRun run{launch_(settings_.gameFolder), false, {}};
-    if (run.launch.message) {
-        run.shown.messages.push_back(*run.launch.message);
+    if (launchWatch_) {
+        return {game::LaunchVerdict::Watching, {}, false, {}};
     }
-    if (run.launch.started() && from == LaunchFrom::Window) {
+    game::LaunchStart start = launch_(settings_.gameFolder);
+    if (start.problem != game::LaunchProblem::None) {
+        LaunchRun run{game::LaunchVerdict::Failed, {}, false, {}};
+        run.shown.messages.push_back(
+            {text::Message::Kind::Component,
+             start.problem == game::LaunchProblem::LauncherMissing
+                 ? text::VniToUnicodeUtf8(game::kLauncherMissingVni)
+                 : std::string(game::kWineMissingText),
+             {}});
+        return run;
+    }
+    launchPlan_ = std::move(start.plan);
+    launchFrom_ = from;
+    if (!start.program) {
+        return LaunchDecided(game::LaunchVerdict::Started, {});
+    }
+    launchWatch_.emplace(std::move(start.program), launchClock_);
+    // A program that could not be run at all is known at once.
+    if (std::optional<LaunchRun> decided = TickLaunch()) {
+        return std::move(*decided);
+    }
+    return {game::LaunchVerdict::Watching, LaunchWayText(launchPlan_), false, {}};
+}
+
+std::optional<LaunchRun> Session::TickLaunch() {
+    if (!launchWatch_) {
+        return std::nullopt;
+    }
+    const game::LaunchVerdict verdict = launchWatch_->Tick();
+    if (verdict == game::LaunchVerdict::Watching) {
+        return std::nullopt;
+    }
+    const platform::ProgramState state = launchWatch_->State();
+    launchWatch_.reset();
+    return LaunchDecided(verdict, state);
+}
+
+LaunchRun Session::LaunchDecided(game::LaunchVerdict verdict,
+                                 const platform::ProgramState& state) const {
+    LaunchRun run{verdict, LaunchWayText(launchPlan_), false, {}};
+    if (verdict == game::LaunchVerdict::Failed) {
+        run.shown.messages.push_back(
+            {text::Message::Kind::Component, LaunchFailureText(launchPlan_, state, ShownFolders()),
+             {}});
+    } else if (launchFrom_ == LaunchFrom::Window) {
         run.hideToTray = true;
         run.shown.popup = Popup{std::string(kHiddenPopupText), 2};
     }

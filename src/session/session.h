@@ -69,10 +69,16 @@ struct UpdateState {
 // so; the tray menu's entry leaves everything as it is.
 enum class LaunchFrom { Window, Tray };
 
+// A start of the game's launcher. The program is watched for a moment (Session::TickLaunch)
+// before it counts as started: one that fails at once is reported, and the window stays.
 struct LaunchRun {
-    game::LaunchOutcome launch;
+    game::LaunchVerdict verdict = game::LaunchVerdict::Started;
+    std::string way;  // which way it was started, in words: "qua Wine trong thư mục Wine …"
     bool hideToTray = false;
     Outcome shown;
+
+    bool watching() const { return verdict == game::LaunchVerdict::Watching; }
+    bool started() const { return verdict == game::LaunchVerdict::Started; }
 };
 
 struct ApplyRun {
@@ -92,7 +98,11 @@ struct QuickLoadRun {
     Outcome shown;
 };
 
-using Launcher = std::function<game::LaunchOutcome(std::string_view gameFolder)>;
+// Starts the game's launcher; a start with no program to watch counts as started at once.
+using Launcher = std::function<game::LaunchStart(std::string_view gameFolder)>;
+using LaunchClock = game::LaunchWatch::Clock;
+// How often the user interface ticks a watched launch.
+inline constexpr std::chrono::milliseconds kLaunchWatchInterval = game::kLaunchWatchInterval;
 
 // A time of day on the user's clock.
 using ClockTime = engine::ClockTime;
@@ -167,7 +177,14 @@ public:
     // the old file as "ThietLap.ini.bak" (replacing an older one) and says so; without that copy
     // nothing is written.
     Outcome Save();
+    // Starts the launcher. The run is usually still watched then: TickLaunch says how it ended.
+    // Asked again while a start is watched, it starts nothing and says nothing.
     LaunchRun Launch(LaunchFrom from);
+    bool LaunchWatched() const { return launchWatch_.has_value(); }
+    // One look at the watched start; the run once it is decided (started or failed).
+    std::optional<LaunchRun> TickLaunch();
+    // The clock of the launch's watch; tests set one of their own.
+    void SetLaunchClock(LaunchClock clock) { launchClock_ = std::move(clock); }
     // Loads from `chosen`, or from the folder chosen last time when the user picked none.
     QuickLoadRun QuickLoad(std::optional<std::filesystem::path> chosen);
     const std::filesystem::path& QuickLoadFolder() const { return quickLoadFolder_; }
@@ -191,6 +208,8 @@ public:
     text::ShownFolders ShownFolders() const;
 
 private:
+    LaunchRun LaunchDecided(game::LaunchVerdict verdict, const platform::ProgramState& state) const;
+
     std::filesystem::path toolFolder_;
     catalog::AddedVariants added_;
     std::vector<catalog::GoneChoice> gone_;
@@ -200,6 +219,10 @@ private:
     engine::HotkeyPoll poll_;
     bool hotkeyValid_ = true;
     Launcher launch_;
+    LaunchClock launchClock_ = std::chrono::steady_clock::now;
+    std::optional<game::LaunchWatch> launchWatch_;
+    game::LaunchPlan launchPlan_;
+    LaunchFrom launchFrom_ = LaunchFrom::Window;
     std::filesystem::path quickLoadFolder_;
     UpdateState updates_;
     std::optional<game::UserFolders> searchFolders_;

@@ -63,6 +63,11 @@ void CommandButtons::showHotkey(const QString& text, const QString& problem) {
     hotkeyProblem_->setVisible(!problem.isEmpty());
 }
 
+void CommandButtons::showLaunchWatched(bool watched) {
+    launch_->setEnabled(!watched);
+    launch_->setText(watched ? QStringLiteral("Đang mở FIFA…") : QStringLiteral("Khởi động &FIFA"));
+}
+
 void CommandButtons::paintNote(const SkinLook& look) {
     // On a ground of its own: over the skins' pictures red text could not be read.
     paint(hotkeyProblem_, look.noteBackground, look.noteText);

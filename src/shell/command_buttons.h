@@ -22,6 +22,8 @@ public:
     // Shows the hotkey text; `problem` non-empty says that it names no key, in red beside it.
     void showHotkey(const QString& text, const QString& problem);
     void recolour(const SkinLook& look);
+    // While a start of the game is watched, "Khởi động FIFA" is disabled and says so.
+    void showLaunchWatched(bool watched);
 
     HotkeyBox* hotkeyBox() const { return hotkey_; }
     QLabel* hotkeyProblem() const { return hotkeyProblem_; }

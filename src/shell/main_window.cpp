@@ -286,7 +286,34 @@ void MainWindow::saveSettings() {
 }
 
 void MainWindow::launchGame(session::LaunchFrom from) {
+    if (session_.LaunchWatched()) {
+        return;  // one start at a time; its outcome is on its way
+    }
     session::LaunchRun run = session_.Launch(from);
+    if (!run.watching()) {
+        showLaunch(std::move(run));
+        return;
+    }
+    buttons_->showLaunchWatched(true);
+    if (!launchTimer_.isActive()) {
+        launchTimer_.setInterval(session::kLaunchWatchInterval);
+        connect(&launchTimer_, &QTimer::timeout, this, &MainWindow::watchLaunch,
+                Qt::UniqueConnection);
+        launchTimer_.start();
+    }
+}
+
+void MainWindow::watchLaunch() {
+    std::optional<session::LaunchRun> run = session_.TickLaunch();
+    if (!run) {
+        return;
+    }
+    launchTimer_.stop();
+    buttons_->showLaunchWatched(false);
+    showLaunch(std::move(*run));
+}
+
+void MainWindow::showLaunch(session::LaunchRun run) {
     std::optional<session::Popup> popup = std::move(run.shown.popup);
     run.shown.popup.reset();
     outcomes_.show(run.shown);

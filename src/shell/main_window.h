@@ -87,7 +87,11 @@ private:
     // Starts the run that applyPatchesNow was asked for during the one that just ended.
     void runAgainIfAsked();
     void saveSettings();
+    // Starts the game's launcher; while its start is watched, ticks the watch.
     void launchGame(session::LaunchFrom from);
+    void watchLaunch();
+    // A decided start: hides to the tray after one from the button, or says why it failed.
+    void showLaunch(session::LaunchRun run);
     void quickLoad();
     void browseGameFolder();
     // Starts a fade of the window's opacity towards `target` by `step` every 20 ms.
@@ -126,6 +130,7 @@ private:
     FadeModel fade_;
     QTimer fadeTimer_;
     QTimer hotkeyTimer_;  // runs only while the key needs polling (held, or no key events)
+    QTimer launchTimer_;  // runs only while a start of the game is watched
     std::unique_ptr<QSocketNotifier> hotkeyWake_;  // key events; null where none come
     bool applying_ = false;
     std::optional<text::Message> lastFailures_;

@@ -86,8 +86,30 @@ TEST_F(LaunchTest, WineRunsTheLauncherInItsOwnPrefixAndFolder_AndSaysSo) {
     EXPECT_EQ(record, "program=wine\npwd=" + (prefix / "drive_c/FIFA Online 2").string() +
                           "\nWINEPREFIX=" + prefix.string() + "\nWINEARCH=win32\narg=" +
                           (prefix / "drive_c/FIFA Online 2/GameLoader.exe").string() + "\n");
-    EXPECT_EQ(result.out,
-              "started Gameloader.exe through Wine in prefix " + prefix.string() + " (win32)\n");
+    EXPECT_EQ(result.out, "đã khởi động Gameloader.exe qua Wine trong thư mục Wine " +
+                              prefix.string() + " (win32)\n");
+}
+
+// A Wine (or a manager) that ends at once with an error has not started the game: the command
+// says which program failed and how, and fails; one that could not run at all says why.
+TEST_F(LaunchTest, WineThatFailsAtOnceIsAFailure_NamingItAndItsCode) {
+    WriteFile(dir_ / "game/Gameloader.exe", "MZ");
+    WriteProgram(dir_ / "bin/wine", "#!/bin/sh\necho 'wine: could not load kernel32' >&2\nexit 3\n");
+    Result result = RunLaunch(dir_ / "game");
+    EXPECT_EQ(result.exitCode, 1);
+    EXPECT_EQ(result.out, "");
+    EXPECT_NE(result.err.find("Không khởi động được FIFA: Wine dừng ngay với mã lỗi 3."),
+              std::string::npos)
+        << result.err;
+
+    // Found on PATH, but gone by the time it is run: an exec failure with the system's reason.
+    WriteProgram(dir_ / "bin/wine", "#!/nonexistent/interpreter\n");
+    result = RunLaunch(dir_ / "game");
+    EXPECT_EQ(result.exitCode, 1);
+    EXPECT_NE(result.err.find("Không khởi động được FIFA qua Wine: không chạy được "),
+              std::string::npos)
+        << result.err;
+    EXPECT_NE(result.err.find("không tìm thấy"), std::string::npos) << result.err;
 }
 
 // Which manager starts which game, Flatpak builds included, is the launch plan's unit test.

@@ -44,7 +44,9 @@ TEST(PlanLaunch, LutrisGameStartsThroughLutris_ByItsNumber_OrFlatpak_OrFallsBack
     EXPECT_EQ(decision.plan.program, "/fake/bin/lutris");
     EXPECT_EQ(decision.plan.arguments, Args{"lutris:rungameid/42"});
     EXPECT_EQ(decision.plan.workingFolder, game);
-    EXPECT_EQ(decision.plan.description, "Lutris: FIFA Online 2 (game 42)");
+    EXPECT_EQ(decision.plan.way, LaunchWay::Lutris);
+    EXPECT_EQ(decision.plan.gameName, "FIFA Online 2");
+    EXPECT_EQ(decision.plan.gameId, "42");
 
     // Without Lutris installed: Wine in the prefix, with the Wine build Lutris keeps for it.
     decision = PlanLaunch(game.string(), home.folders(), Installed{{"wine"}}.lookup());
@@ -109,7 +111,9 @@ TEST(PlanLaunch, OtherwiseWineRunsInTheGamesOwnPrefix_WithItsArch) {
     EXPECT_EQ(
         decision.plan.environment,
         (platform::EnvironmentAdditions{{"WINEPREFIX", wine.string()}, {"WINEARCH", "win64"}}));
-    EXPECT_EQ(decision.plan.description, "Wine in prefix " + wine.string() + " (win64)");
+    EXPECT_EQ(decision.plan.way, LaunchWay::Wine);
+    EXPECT_EQ(decision.plan.prefix, wine);
+    EXPECT_EQ(decision.plan.arch, "win64");
 }
 
 TEST(PlanLaunch, MissingLauncherOrWineIsSaid_AndANativeLauncherRunsDirectly) {
@@ -123,12 +127,13 @@ TEST(PlanLaunch, MissingLauncherOrWineIsSaid_AndANativeLauncherRunsDirectly) {
     const LaunchDecision outside =
         PlanLaunch(game.string(), home.folders(), Installed{{"wine"}}.lookup());
     EXPECT_TRUE(outside.plan.environment.empty());
-    EXPECT_EQ(outside.plan.description, "Wine in the prefix of the environment");
+    EXPECT_EQ(outside.plan.way, LaunchWay::Wine);
+    EXPECT_TRUE(outside.plan.prefix.empty());
 
     testing::WriteProgram(game / "Gameloader.exe", "#!/bin/sh\n");
     const LaunchDecision native = PlanLaunch(game.string(), home.folders(), Installed{}.lookup());
     EXPECT_EQ(native.plan.program, game / "Gameloader.exe");
-    EXPECT_EQ(native.plan.description, "directly");
+    EXPECT_EQ(native.plan.way, LaunchWay::Direct);
 }
 
 }  // namespace

@@ -161,7 +161,7 @@ TEST_F(SessionTest, LaunchFromTheWindowHidesItAndFromTheTrayLeavesItAlone) {
     auto session = Open([&](std::string_view folder) {
         ++launches;
         EXPECT_EQ(folder, "C:\\Program Files");
-        return game::LaunchOutcome{};
+        return game::LaunchStart{};
     });
     const LaunchRun fromWindow = session->Launch(LaunchFrom::Window);
     EXPECT_TRUE(fromWindow.hideToTray);

@@ -23,7 +23,7 @@ protected:
         if (countLaunches_) {
             launch = [this](std::string_view) {
                 ++launches_;
-                return game::LaunchOutcome{};
+                return game::LaunchStart{};
             };
         }
         sessions_.push_back(std::make_unique<session::Session>(folder.empty() ? tool() : folder,

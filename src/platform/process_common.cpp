@@ -1,0 +1,23 @@
+// What every system's process start shares.
+#include "platform/process.h"
+
+namespace kickvane::platform {
+
+namespace {
+
+class FixedWatch final : public ProgramWatch {
+public:
+    explicit FixedWatch(ProgramState state) : state_(std::move(state)) {}
+    ProgramState Poll() override { return state_; }
+
+private:
+    ProgramState state_;
+};
+
+}  // namespace
+
+std::unique_ptr<ProgramWatch> FixedProgramWatch(ProgramState state) {
+    return std::make_unique<FixedWatch>(std::move(state));
+}
+
+}  // namespace kickvane::platform
