@@ -7,6 +7,7 @@
 
 #include "catalog/ini.h"
 #include "support/fake_keys.h"
+#include "support/fake_program.h"
 #include "support/trees.h"
 
 namespace kickvane::session {
@@ -156,23 +157,67 @@ TEST_F(SessionTest, FirstSaveOverAnUnreadableFileKeepsItBesideAndSaysSo) {
     EXPECT_EQ(testing::ReadText(tool() / "thietlap.ini.BAK"), unreadable);
 }
 
-TEST_F(SessionTest, LaunchFromTheWindowHidesItAndFromTheTrayLeavesItAlone) {
+// A start is watched for a moment: it hides the window only once the program still runs at the
+// end of the watch; one that fails at once says which program failed and leaves the window.
+TEST_F(SessionTest, LaunchIsWatched_AStartFromTheWindowHidesIt_AFailureSaysWhyAndStays) {
+    using Kind = platform::ProgramState::Kind;
     int launches = 0;
+    std::deque<platform::ProgramState> script{testing::ProgramIs(Kind::Running)};
     auto session = Open([&](std::string_view folder) {
         ++launches;
         EXPECT_EQ(folder, "C:\\Program Files");
-        return game::LaunchStart{};
+        game::LaunchStart start;
+        start.plan.way = game::LaunchWay::Lutris;
+        start.program = std::make_unique<testing::FakeProgramWatch>(script);
+        return start;
     });
+    testing::FakeClock clock;
+    session->SetLaunchClock(clock.function());
+
     const LaunchRun fromWindow = session->Launch(LaunchFrom::Window);
-    EXPECT_TRUE(fromWindow.hideToTray);
-    EXPECT_EQ(fromWindow.shown.popup, (Popup{"Ẩn xuống khay hệ thống!", 2}));
+    EXPECT_TRUE(fromWindow.watching());
+    EXPECT_FALSE(fromWindow.hideToTray);
+    EXPECT_FALSE(fromWindow.shown.popup);
+    EXPECT_TRUE(session->LaunchWatched());
+    EXPECT_FALSE(session->TickLaunch());
+    // Asked again meanwhile: nothing more is started.
+    EXPECT_TRUE(session->Launch(LaunchFrom::Tray).watching());
+    EXPECT_EQ(launches, 1);
+    clock.now += game::kLaunchWatchTime;
+    const std::optional<LaunchRun> started = session->TickLaunch();
+    ASSERT_TRUE(started);
+    EXPECT_TRUE(started->started());
+    EXPECT_TRUE(started->hideToTray);
+    EXPECT_EQ(started->shown.popup, (Popup{"Ẩn xuống khay hệ thống!", 2}));
+    EXPECT_FALSE(session->LaunchWatched());
+    EXPECT_FALSE(session->TickLaunch());
+
+    script = {testing::ProgramIs(Kind::Running), testing::ProgramIs(Kind::Exited, 1)};
+    for (LaunchFrom from : {LaunchFrom::Window, LaunchFrom::Tray}) {
+        EXPECT_TRUE(session->Launch(from).watching());
+        std::optional<LaunchRun> failed;
+        for (int tick = 0; tick < 5 && !failed; ++tick) {
+            failed = session->TickLaunch();
+        }
+        ASSERT_TRUE(failed);
+        EXPECT_FALSE(failed->started());
+        EXPECT_FALSE(failed->hideToTray);
+        EXPECT_FALSE(failed->shown.popup);
+        ASSERT_EQ(failed->shown.messages.size(), 1u);
+        EXPECT_EQ(failed->shown.messages[0].text,
+                  "Không khởi động được FIFA: Lutris dừng ngay với mã lỗi 1.");
+    }
+
+    // A start from the tray that went well leaves the window as it is.
+    script = {testing::ProgramIs(Kind::Exited, 0)};
     const LaunchRun fromTray = session->Launch(LaunchFrom::Tray);
+    EXPECT_TRUE(fromTray.started());
     EXPECT_FALSE(fromTray.hideToTray);
     EXPECT_FALSE(fromTray.shown.popup);
-    EXPECT_EQ(launches, 2);
 
     auto missing = Open();  // the real launcher: no Gameloader.exe in the default folder
     const LaunchRun failed = missing->Launch(LaunchFrom::Window);
+    EXPECT_FALSE(failed.started());
     EXPECT_FALSE(failed.hideToTray);
     EXPECT_FALSE(failed.shown.popup);
     ASSERT_EQ(failed.shown.messages.size(), 1u);
