@@ -83,6 +83,35 @@ TEST_F(ShellPartsTest, TrayMenuEntriesAndRunningHidden) {
     EXPECT_EQ(exit.count(), 1);
 }
 
+// "Khởi động FIFA" waits, disabled, for the started program's fate: a Wine that fails at once
+// leaves the window up with the reason; one that still runs at the end of the watch hides it.
+TEST_F(ShellPartsTest, LaunchButtonWaitsForTheStart_AFailureStaysAndSaysWhy) {
+    using Kind = platform::ProgramState::Kind;
+    launchScript_ = {testing::ProgramIs(Kind::Running), testing::ProgramIs(Kind::Exited, 2)};
+    auto window = Show();
+    QPushButton* launch = window->buttons().launch();
+    Click(launch);
+    EXPECT_EQ(launches_, 1);
+    EXPECT_FALSE(launch->isEnabled());
+    EXPECT_EQ(launch->text(), QStringLiteral("Đang mở FIFA…"));
+    TrayEntry(*window, "Khởi động FIFA")->trigger();  // one start at a time
+    EXPECT_EQ(launches_, 1);
+    QTRY_VERIFY_WITH_TIMEOUT(launch->isEnabled(), 30000);
+    EXPECT_EQ(launch->text(), QStringLiteral("Khởi động &FIFA"));
+    EXPECT_TRUE(window->isVisible());
+    EXPECT_TRUE(dialogs_.popups.isEmpty());
+    EXPECT_EQ(dialogs_.messages,
+              QStringList{"Thông báo|Không khởi động được FIFA: Wine dừng ngay với mã lỗi 2."});
+
+    launchScript_ = {testing::ProgramIs(Kind::Running)};
+    Click(launch);
+    EXPECT_TRUE(window->isVisible());
+    launchClock_.now += game::kLaunchWatchTime;
+    QTRY_VERIFY_WITH_TIMEOUT(!window->isVisible(), 30000);
+    EXPECT_TRUE(launch->isEnabled());
+    EXPECT_EQ(dialogs_.popups, QStringList{"Ẩn xuống khay hệ thống!|2"});
+}
+
 TEST_F(ShellPartsTest, WithoutATrayHostHidingMinimisesAndClosingRemovesTheIcon) {
     hostRunning_ = false;
     auto window = Show();

@@ -6,6 +6,7 @@
 #include <deque>
 
 #include "fakes.h"
+#include "support/fake_program.h"
 #include "shell/main_window.h"
 #include "support/temp_dir.h"
 
@@ -23,11 +24,17 @@ protected:
         if (countLaunches_) {
             launch = [this](std::string_view) {
                 ++launches_;
-                return game::LaunchStart{};
+                game::LaunchStart start;
+                start.plan.way = game::LaunchWay::Wine;
+                if (!launchScript_.empty()) {
+                    start.program = std::make_unique<FakeProgramWatch>(launchScript_);
+                }
+                return start;
             };
         }
         sessions_.push_back(std::make_unique<session::Session>(folder.empty() ? tool() : folder,
                                                                std::move(keys), std::move(launch)));
+        sessions_.back()->SetLaunchClock(launchClock_.function());
 
         shell::ShellServices services;
         services.dialogs = &dialogs_;
@@ -64,6 +71,9 @@ protected:
     bool hostRunning_ = true;
     bool countLaunches_ = false;  // launches are counted instead of started
     int launches_ = 0;
+    // What a counted launch's program does, one state per look; empty: it starts at once.
+    std::deque<platform::ProgramState> launchScript_;
+    FakeClock launchClock_;
 };
 
 }  // namespace kickvane::testing
