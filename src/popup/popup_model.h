@@ -33,7 +33,7 @@ inline constexpr Colour kPopupTextColour{0xFFFFFF};
 // The fill of a popup that reports failures: a dark red that white text reads well on (6.8:1),
 // and that is not taken for a confirmation.
 inline constexpr Colour kFailurePopupColour{0xB00000};
-inline constexpr std::string_view kPopupCaption = "Alert";
+inline constexpr std::string_view kPopupCaption = "Thông báo";
 inline constexpr std::string_view kPopupFontFamily = "Tahoma";
 inline constexpr double kPopupFontPointSize = 9.75;
 inline constexpr double kPopupInitialWidthPoints = 120;
@@ -132,10 +132,10 @@ enum class PopupPhase {
 // How a popup shows itself. The tool's own popups slide, fit their height to the text, and have
 // a square frame with a cream inner line.
 struct PopupStyle {
-    bool fade = false;                     // fades in place instead of sliding
-    bool autoFit = true;                   // fits the height to the text (in slot 1)
-    bool square = true;                    // a two-line rectangular frame instead of rounded corners
-    Colour backColour{0xFFFFC0};           // the inner line or shape: cream
+    bool fade = false;            // fades in place instead of sliding
+    bool autoFit = true;          // fits the height to the text (in slot 1)
+    bool square = true;           // a two-line rectangular frame instead of rounded corners
+    Colour backColour{0xFFFFC0};  // the inner line or shape: cream
     Colour fill = kPopupBackgroundColour;  // the background under the text
 };
 

@@ -11,6 +11,7 @@
 #include <sstream>
 #include <thread>
 
+#include "platform/scoped_env.h"
 #include "support/temp_dir.h"
 #include "support/trees.h"
 #include "support/x_server.h"
@@ -19,6 +20,8 @@ namespace kickvane::testing {
 namespace {
 
 const std::string kWindowTitle = "Kickvane v2.0";
+const std::string kPopupTitle = "Thông báo";
+const std::string kBoxTitle = "Thông báo";
 
 class WindowTest : public ::testing::Test {
 protected:
@@ -70,6 +73,27 @@ protected:
         return FindWindow(title, &owner);
     }
 
+    // The corner popup and a box share their title; the popup is told apart by its window type,
+    // a tool window's.
+    static std::string FindTyped(const std::string& title, const ChildProcess& owner, bool popup) {
+        std::istringstream ids(Capture("xdotool search --all --pid " + std::to_string(owner.pid()) +
+                                       " --name '^" + title + "$' 2>/dev/null"));
+        for (std::string id; std::getline(ids, id);) {
+            const bool utility = Capture("xprop -id " + id + " _NET_WM_WINDOW_TYPE")
+                                     .find("_NET_WM_WINDOW_TYPE_UTILITY") != std::string::npos;
+            if (utility == popup) {
+                return id;
+            }
+        }
+        return {};
+    }
+    static std::string FindPopup(const ChildProcess& owner) {
+        return FindTyped(kPopupTitle, owner, true);
+    }
+    static std::string FindBox(const ChildProcess& owner) {
+        return FindTyped(kBoxTitle, owner, false);
+    }
+
     static bool WindowShown(const std::string& title, const ChildProcess* owner) {
         return WaitFor([&] { return !FindWindow(title, owner).empty(); });
     }
@@ -109,18 +133,20 @@ TEST_F(WindowTest, HotkeyInAnotherWindowApplies_FailedStepsShowTheAlertAndItsCli
     auto focused = FocusOtherWindow();
     const std::string gameWindow = FindWindow("the game", nullptr);
     Capture("xdotool key F7");
-    ASSERT_TRUE(WindowShown("Alert", *kickvane)) << ReadText(dir_ / "kickvane.log");
+    ASSERT_TRUE(WaitFor([&] { return !FindPopup(*kickvane).empty(); }))
+        << ReadText(dir_ / "kickvane.log");
     EXPECT_TRUE(fs::exists(applied()))
         << ReadText(dir_ / "kickvane.log");  // the others went through
     EXPECT_EQ(Capture("xdotool getwindowfocus"), gameWindow + "\n");
-    EXPECT_TRUE(FindWindow("Thông báo", *kickvane).empty());
+    EXPECT_TRUE(FindBox(*kickvane).empty());
     // Once it has risen into its place.
     std::this_thread::sleep_for(std::chrono::milliseconds(1500));
-    SaveScreenshot(FindWindow("Alert", *kickvane), "failure-alert.png");
+    SaveScreenshot(FindPopup(*kickvane), "failure-alert.png");
 
-    Capture("xdotool mousemove --window " + FindWindow("Alert", *kickvane) + " 20 20 click 1");
-    ASSERT_TRUE(WindowShown("Thông báo", *kickvane)) << ReadText(dir_ / "kickvane.log");
-    SaveScreenshot(FindWindow("Thông báo", *kickvane), "failure-list.png");
+    Capture("xdotool mousemove --window " + FindPopup(*kickvane) + " 20 20 click 1");
+    ASSERT_TRUE(WaitFor([&] { return !FindBox(*kickvane).empty(); }))
+        << ReadText(dir_ / "kickvane.log");
+    SaveScreenshot(FindBox(*kickvane), "failure-list.png");
     EXPECT_TRUE(kickvane->Running());
 }
 
@@ -201,15 +227,15 @@ std::string FindTrayIcon() {
 }
 
 // Clicks the second of the five entries in the open tray menu, a visible window of the tool that
-// is neither the main window nor a corner popup ("Alert") of about the same size.
+// is neither the main window nor a corner popup ("Thông báo") of about the same size.
 bool ClickSecondTrayMenuEntry() {
     return !Capture(
                 "for id in $(xdotool search --onlyvisible --classname '^kickvane$' "
                 "2>/dev/null); do eval $(xdotool getwindowgeometry --shell $id); "
                 "[ $HEIGHT -gt 60 ] && [ $HEIGHT -lt 300 ] && [ $WIDTH -lt 400 ] && "
                 "! xdotool getwindowname $id | grep -q -e '" +
-                kWindowTitle +
-                "' -e '^Alert$' && "
+                kWindowTitle + "' -e '^" + kPopupTitle +
+                "$' && "
                 "xdotool mousemove --window $id $((WIDTH / 2)) $((HEIGHT * 3 / 10)) "
                 "click 1 && echo $id && break; done")
                 .empty();
@@ -335,6 +361,33 @@ TEST_F(WindowTest, UpdateCheckLoadsItsNetworkCodeAndRecordsANewerVersion) {
     })) << ReadText(tool() / "ThietLap.ini")
         << ReadText(dir_ / "kickvane.log");
     EXPECT_GE(host.requests(), 1);
+}
+
+// "Khởi động FIFA" with a Wine that ends at once with an error: the window stays and a box says
+// why (its words are the window test's), with no "Ẩn xuống khay hệ thống!".
+TEST_F(WindowTest, LaunchWhoseWineFailsAtOnceSaysSoAndTheWindowStays) {
+    WriteSettings("F7");
+    WriteFile(game() / "Gameloader.exe", "MZ");
+    WriteFile(dir_ / "bin/wine",
+              "#!/bin/sh\necho 'wine: could not load kernel32.dll' >&2\nexit 3\n");
+    fs::permissions(dir_ / "bin/wine", fs::perms::owner_all);
+    const ScopedEnv path("PATH", (dir_ / "bin").string() + ":/usr/bin:/bin");
+    const ScopedEnv home("HOME", (dir_ / "home").string());
+    const ScopedEnv prefix("WINEPREFIX", std::nullopt);
+    auto kickvane = StartKickvane();
+    ASSERT_TRUE(WindowShown(kWindowTitle, *kickvane)) << ReadText(dir_ / "kickvane.log");
+    const std::string window = FindWindow(kWindowTitle, *kickvane);
+    Capture("xdotool mousemove --window " + window + " 278 457 click 1");  // "Khởi động FIFA"
+    ASSERT_TRUE(WaitFor([&] { return !FindBox(*kickvane).empty(); }))
+        << ReadText(dir_ / "kickvane.log");
+    const std::string box = FindBox(*kickvane);
+    SaveScreenshot(box, "launch-failed.png");
+    EXPECT_TRUE(WindowVisible(kWindowTitle));
+    EXPECT_TRUE(FindPopup(*kickvane).empty());  // no "Ẩn xuống khay hệ thống!"
+    Capture("xdotool windowfocus --sync " + box + " key Return");
+    EXPECT_TRUE(WaitFor([&] { return FindBox(*kickvane).empty(); }));
+    EXPECT_TRUE(WindowVisible(kWindowTitle));
+    EXPECT_TRUE(kickvane->Running());
 }
 
 }  // namespace
