@@ -1,6 +1,7 @@
 // A stand-in for the game's Gameloader.exe: writes beside itself, in "started.txt" (UTF-8), the
 // folder it was started in and whether it was asked to show its first window minimised, then
-// exits without showing anything.
+// exits without showing anything. With a file "fail.txt" beside it, it exits at once with code 3
+// instead, as a launcher that cannot start the game does.
 #include <windows.h>
 
 #include <string>
@@ -28,6 +29,9 @@ int WINAPI WinMain(HINSTANCE, HINSTANCE, LPSTR, int) {
     }
     std::wstring record(self, selfLength);
     record.erase(record.find_last_of(L'\\') + 1);
+    if (GetFileAttributesW((record + L"fail.txt").c_str()) != INVALID_FILE_ATTRIBUTES) {
+        return 3;
+    }
     record += L"started.txt";
 
     STARTUPINFOW startup{};

@@ -98,10 +98,17 @@ launcher_started_minimised_in_game() {
   return 1
 }
 check "launch says it started the launcher directly" test \
-  "$(wine "$exe" launch --tool-folder "$tool")" = "started Gameloader.exe through directly"
+  "$(wine "$exe" launch --tool-folder "$tool")" = "đã khởi động Gameloader.exe trực tiếp"
 check "the launcher runs" wait_for test -s "$started_record"
 check "its record names the game folder and the minimised state" launcher_started_minimised_in_game
 rm -f "$started_record"
+# A launcher that ends at once with an error has not started the game: the command says so.
+: >"$game/fail.txt"
+code=0
+wine "$exe" launch --tool-folder "$tool" >"$work/launch.out" 2>"$work/launch.err" || code=$?
+rm -f "$game/fail.txt"
+check "a launcher that fails at once fails the command" test "$code" = 1
+check "and says how it ended" grep -q "Gameloader.exe dừng ngay với mã lỗi 3" "$work/launch.err"
 
 # --- The window on a virtual display: the caller's (KICKVANE_TEST_DISPLAY), which Wine's desktop
 # was started on, else one of our own.
@@ -168,11 +175,12 @@ check "the tray icon is there" wait_for tray_shown
 
 # --- Popups: the one of "Lưu thiết lập" (Alt+L) settles at the bottom-right corner of the work
 # area, inside the screen (no window manager here: the work area is the whole screen).
-no_popup_shown() { [ -z "$(windows_of "$window_pid" Alert --onlyvisible)" ]; }
+# The corner popups are titled "Thông báo", as a box is; none of the steps here shows a box.
+no_popup_shown() { [ -z "$(windows_of "$window_pid" 'Thông báo' --onlyvisible)" ]; }
 read -r screen_width screen_height < <(xdotool getdisplaygeometry)
 popup_at_corner() {
   local id WINDOW X Y WIDTH HEIGHT SCREEN
-  for id in $(windows_of "$window_pid" Alert --onlyvisible); do
+  for id in $(windows_of "$window_pid" 'Thông báo' --onlyvisible); do
     eval "$(xdotool getwindowgeometry --shell "$id")"
     [ "$X" -ge 0 ] && [ "$Y" -ge 0 ] &&
       [ $((X + WIDTH)) -le "$screen_width" ] && [ $((X + WIDTH)) -ge $((screen_width - 4)) ] &&
