@@ -157,6 +157,9 @@ void ClickableLabel::mouseReleaseEvent(QMouseEvent* event) {
 HotkeyBox::HotkeyBox(QWidget* parent) : QComboBox(parent) {
     setEditable(true);
     setInsertPolicy(QComboBox::NoInsert);  // a typed name does not join the list
+    // No completion: it would fill in a key the player did not type ("F" and Enter would take
+    // "F1"). Names are then matched exactly, as the settings file's are.
+    setCompleter(nullptr);
     setFocusPolicy(Qt::StrongFocus);
     connect(lineEdit(), &QLineEdit::editingFinished, this,
             [this] { emit nameChosen(currentText()); });

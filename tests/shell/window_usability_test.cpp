@@ -166,6 +166,20 @@ TEST_F(WindowUsabilityTest, TypingChangesTheHotkeyOnlyOnceFinished) {
     EXPECT_EQ(window->session().ActiveHotkey(), "F7");
     head->setFocus(Qt::TabFocusReason);  // leaving the box finishes the name
     EXPECT_EQ(window->session().ActiveHotkey(), "F9");
+
+    // The box suggests nothing the player did not type: "F" and Enter is no key, so F9 stays;
+    // a choice from the list still is one.
+    box->setFocus(Qt::MouseFocusReason);
+    box->lineEdit()->selectAll();
+    QTest::keyClick(box->lineEdit(), 'F');
+    EXPECT_EQ(box->currentText(), "F");
+    Press(box->lineEdit(), Qt::Key_Return);
+    EXPECT_EQ(box->currentText(), "F");
+    EXPECT_EQ(window->session().ActiveHotkey(), "F9");
+    EXPECT_FALSE(window->buttons().hotkeyProblem()->isHidden());
+    box->setCurrentIndex(3);
+    emit box->textActivated(box->itemText(3));
+    EXPECT_EQ(window->session().ActiveHotkey(), "F4");
 }
 
 TEST_F(WindowUsabilityTest, TheWheelTurnsTheHotkeyOnlyWhileItHasTheFocus) {
