@@ -5,6 +5,7 @@
 #include "commands.h"
 #include "game/find_game.h"
 #include "platform/filesystem.h"
+#include "session/game_words.h"
 #include "session/session.h"
 #include "session/tool_folder.h"
 #include "text/failure_text.h"
@@ -66,13 +67,15 @@ int RunFindGame(Args args) {
     const game::FindOutcome outcome =
         game::FindGame(game::UserFolders::FromEnvironment(), game::SearchLimits{});
     for (const game::FoundGame& game : outcome.games) {
-        std::cout << platform::PathToUtf8(game.folder) << '\t' << game.source << '\n';
+        std::cout << platform::PathToUtf8(game.folder) << '\t' << session::SourceText(game.source)
+                  << '\n';
     }
-    for (const std::string& skipped : outcome.skipped) {
-        std::cerr << "skipped: " << skipped << '\n';
+    for (const game::SkippedFile& skipped : outcome.skipped) {
+        std::cerr << "bỏ qua: " << platform::PathToUtf8(skipped.path) << ": "
+                  << session::SkippedReasonText(skipped) << '\n';
     }
     if (outcome.games.empty()) {
-        std::cerr << "kickvane: no Gameloader.exe found; looked in:\n";
+        std::cerr << "kickvane: không tìm thấy Gameloader.exe; đã tìm trong:\n";
         for (const std::string& place : outcome.looked) {
             std::cerr << "  " << place << '\n';
         }

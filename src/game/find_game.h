@@ -5,6 +5,7 @@
 #include <string>
 #include <vector>
 
+#include "game/game_managers.h"
 #include "game/wine_prefix.h"
 
 namespace kickvane::game {
@@ -12,14 +13,14 @@ namespace kickvane::game {
 // A folder that holds the game's launcher, and how it was found.
 struct FoundGame {
     fs::path folder;
-    fs::path prefix;     // the Wine prefix it lies in; empty when none
-    std::string source;  // e.g. "Lutris: FIFA Online 2 (~/.config/lutris/games/fifa.yml)"
+    fs::path prefix;    // the Wine prefix it lies in; empty when none
+    GameSource source;  // e.g. Lutris's entry "FIFA Online 2", then the search of its drive_c
 };
 
 struct FindOutcome {
     std::vector<FoundGame> games;      // in the search order, each folder once
     std::vector<std::string> looked;   // prefixes and configuration files looked at
-    std::vector<std::string> skipped;  // "file: reason" for what could not be read
+    std::vector<SkippedFile> skipped;  // what could not be read, and why
     bool cutShort = false;             // a prefix's search reached its limits
     bool cancelled = false;
 };

@@ -163,11 +163,18 @@ public:
 private:
     bool Cancelled() const { return cancel_ != nullptr && cancel_->load(); }
 
+    static GameSource DriveSource(const fs::path& root) {
+        GameSource source;
+        source.kind = GameSource::Kind::Drive;
+        source.place = platform::PathToUtf8(root);
+        return source;
+    }
+
     bool HoldsLauncher(const fs::path& folder) const {
         return !folder.empty() && platform::IsRegularFile(folder / kLauncherName);
     }
 
-    void Add(const fs::path& folder, const std::string& source) {
+    void Add(const fs::path& folder, GameSource source) {
         std::error_code error;
         fs::path canonical = fs::canonical(folder, error);
         if (error) {
@@ -175,7 +182,7 @@ private:
         }
         // Windows names differ in letter case only in spelling: one find per folder.
         if (found_.insert(platform::FoldCase(platform::PathToUtf8(canonical))).second) {
-            outcome_.games.push_back({canonical, {}, source});
+            outcome_.games.push_back({canonical, {}, std::move(source)});
         }
     }
 
@@ -233,8 +240,11 @@ private:
                                                : FolderOfProgramValue(text);
                 const fs::path path = platform::PathFromUtf8(folder);
                 if (HoldsLauncher(path)) {
-                    Add(path, "registry: " + place + "\\" + entryName + " (" +
-                                  platform::WideToUtf8(value) + ")");
+                    GameSource source;
+                    source.kind = GameSource::Kind::RegistryEntry;
+                    source.place = place + "\\" + entryName;
+                    source.value = platform::WideToUtf8(value);
+                    Add(path, std::move(source));
                 }
             }
             RegCloseKey(entry);
@@ -277,7 +287,10 @@ private:
             if (platform::NamesEqualIgnoringCase(platform::PathToUtf8(target.filename()),
                                                  kLauncherName) &&
                 platform::IsRegularFile(target)) {
-                Add(target.parent_path(), "shortcut: " + platform::PathToUtf8(path));
+                GameSource source;
+                source.kind = GameSource::Kind::Shortcut;
+                source.place = platform::PathToUtf8(path);
+                Add(target.parent_path(), std::move(source));
             }
             return true;
         });
@@ -298,9 +311,8 @@ private:
             if (!SearchDrive(root)) {
                 outcome_.cutShort = !Cancelled();
                 if (outcome_.cutShort) {
-                    outcome_.skipped.push_back(platform::WideToUtf8(root) +
-                                               ": search stopped at its limits after " +
-                                               std::to_string(entriesSeen_) + " entries");
+                    outcome_.skipped.push_back(
+                        {fs::path(root), SkipReason::SearchCut, entriesSeen_, {}, {}});
                 }
                 break;
             }
@@ -311,7 +323,7 @@ private:
     // the number of entries or a cancel stopped it.
     bool SearchDrive(const fs::path& root) {
         if (HoldsLauncher(root)) {
-            Add(root, "drive " + platform::PathToUtf8(root));
+            Add(root, DriveSource(root));
         }
         std::vector<std::string> top;
         bool within = VisitFolders(
@@ -335,7 +347,7 @@ private:
                 }
             });
             if (holds) {
-                Add(folder, "drive " + platform::PathToUtf8(root));
+                Add(folder, DriveSource(root));
             }
         }
         return within;

@@ -26,15 +26,13 @@ std::string Shorten(const fs::path& path, const fs::path& home) {
     return shortened;
 }
 
-std::string SourceOf(const ManagedPrefix& entry, const fs::path& home) {
-    std::string source(ManagerName(entry.manager));
-    if (entry.flatpak) {
-        source += " (Flatpak)";
-    }
-    if (!entry.name.empty()) {
-        source.append(": ").append(entry.name);
-    }
-    source.append(" (").append(Shorten(entry.configFile, home)).append(")");
+GameSource SourceOf(const ManagedPrefix& entry, const fs::path& home) {
+    GameSource source;
+    source.kind = GameSource::Kind::ManagerProgram;
+    source.manager = entry.manager;
+    source.flatpak = entry.flatpak;
+    source.name = entry.name;
+    source.configFile = Shorten(entry.configFile, home);
     return source;
 }
 
@@ -51,7 +49,7 @@ public:
             if (Cancelled()) {
                 break;
             }
-            const std::string source = SourceOf(entry, folders_.home);
+            const GameSource source = SourceOf(entry, folders_.home);
             if (!entry.executable.empty()) {
                 // The program the manager starts, or the launcher beside it.
                 const fs::path folder = entry.executable.parent_path();
@@ -71,7 +69,7 @@ public:
 private:
     bool Cancelled() const { return cancel_ != nullptr && cancel_->load(); }
 
-    void Add(const fs::path& folder, const fs::path& prefix, const std::string& source) {
+    void Add(const fs::path& folder, const fs::path& prefix, const GameSource& source) {
         std::error_code error;
         fs::path canonical = fs::canonical(folder, error);
         if (error) {
@@ -82,7 +80,7 @@ private:
         }
     }
 
-    void SearchPrefix(const fs::path& prefix, const std::string& source) {
+    void SearchPrefix(const fs::path& prefix, GameSource source) {
         std::error_code error;
         const fs::path canonical = fs::canonical(prefix, error);
         if (error || !searched_.insert(canonical).second) {
@@ -97,18 +95,23 @@ private:
             const fs::path folder = platform::ResolveCaseInsensitive(*mapped);
             if (const auto launcher = platform::FindEntryIgnoringCase(folder, kLauncherName);
                 launcher && platform::IsRegularFile(*launcher)) {
-                Add(folder, prefix, source + ", " + install.source);
+                GameSource recorded = source;
+                recorded.kind = GameSource::Kind::RegistryEntry;
+                recorded.registryFile = install.registryFile;
+                recorded.place = install.key;
+                recorded.value = install.valueName;
+                Add(folder, prefix, recorded);
             }
         }
         const fs::path driveC = prefix / "drive_c";
         const TreeSearch search = SearchTreeForFile(driveC, kLauncherName, limits_, cancel_);
+        source.kind = GameSource::Kind::PrefixSearch;
         for (const fs::path& folder : search.folders) {
-            Add(folder, prefix, source + ", drive_c");
+            Add(folder, prefix, source);
         }
         if (search.cutShort && !Cancelled()) {
             outcome_.cutShort = true;
-            outcome_.skipped.push_back(driveC.string() + ": search stopped at its limits after " +
-                                       std::to_string(search.entriesSeen) + " entries");
+            outcome_.skipped.push_back({driveC, SkipReason::SearchCut, search.entriesSeen, {}, {}});
         }
     }
 

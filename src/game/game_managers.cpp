@@ -11,10 +11,10 @@ namespace kickvane::game {
 namespace managers {
 
 std::optional<std::string> ScanContext::ReadText(const fs::path& file) {
-    std::string problem;
-    std::optional<std::string> text = ReadConfigText(file, kMaxConfigBytes, problem);
+    SkippedFile skipped;
+    std::optional<std::string> text = ReadConfigText(file, kMaxConfigBytes, skipped);
     if (!text) {
-        scan_.skipped.push_back(file.string() + ": " + problem);
+        scan_.skipped.push_back(std::move(skipped));
     }
     return text;
 }
@@ -27,7 +27,13 @@ std::optional<FlatValues> ScanContext::ReadConfig(const fs::path& file,
     }
     Parsed parsed = parse(*text);
     if (!parsed.ok()) {
-        scan_.skipped.push_back(file.string() + ": " + parsed.problem);
+        SkippedFile skipped{file, SkipReason::Malformed, parsed.line, {}, parsed.problem};
+        if (parsed.fault == ParseFault::NotText) {
+            skipped.reason = SkipReason::NotText;
+        } else if (parsed.fault == ParseFault::TooComplex) {
+            skipped.reason = SkipReason::TooComplex;
+        }
+        scan_.skipped.push_back(std::move(skipped));
         return std::nullopt;
     }
     return std::move(parsed.values);

@@ -1,39 +1,20 @@
 #pragma once
 
+#include <cstdint>
 #include <filesystem>
 #include <optional>
 #include <string>
 #include <string_view>
+#include <system_error>
 #include <vector>
 
+#include "game/search_report.h"
 #include "game/wine_prefix.h"
 
 // What the game managers of Linux know about Windows games: Lutris, Bottles, Heroic, PlayOnLinux,
 // Steam (games added to it from outside), Wine's own menu entries, in their usual and their
 // Flatpak and Snap locations. Their files are only ever read.
 namespace kickvane::game {
-
-enum class Manager { Wine, Lutris, Bottles, Heroic, PlayOnLinux, Steam, WineMenu };
-
-constexpr std::string_view ManagerName(Manager manager) {
-    switch (manager) {
-        case Manager::Wine:
-            return "Wine";
-        case Manager::Lutris:
-            return "Lutris";
-        case Manager::Bottles:
-            return "Bottles";
-        case Manager::Heroic:
-            return "Heroic";
-        case Manager::PlayOnLinux:
-            return "PlayOnLinux";
-        case Manager::Steam:
-            return "Steam";
-        case Manager::WineMenu:
-            break;
-    }
-    return "Wine menu";
-}
 
 // One prefix or game that a manager's configuration names.
 struct ManagedPrefix {
@@ -52,7 +33,7 @@ struct ManagedPrefix {
 struct ManagerScan {
     std::vector<ManagedPrefix> entries;
     std::vector<std::string> looked;   // configuration folders and files read
-    std::vector<std::string> skipped;  // "file: reason" for files that could not be used
+    std::vector<SkippedFile> skipped;  // files that could not be used
 };
 
 // Configuration files larger than this are skipped rather than read.

@@ -5,24 +5,26 @@
 namespace kickvane::game {
 
 std::optional<std::string> ReadConfigText(const std::filesystem::path& path,
-                                          std::uintmax_t maxBytes, std::string& problem) {
+                                          std::uintmax_t maxBytes, SkippedFile& skipped) {
     platform::FileRead read = platform::ReadRegularFile(path, maxBytes);
     using Result = platform::FileRead::Result;
+    skipped = SkippedFile{path, SkipReason::Missing, 0, {}, {}};
     switch (read.result) {
         case Result::Read:
             return std::move(read.bytes);
         case Result::Missing:
-            problem = "missing";
             break;
         case Result::Folder:
         case Result::NotRegular:
-            problem = "not a readable file";
+            skipped.reason = SkipReason::NotAFile;
             break;
         case Result::TooLarge:
-            problem = "too large (over " + std::to_string(maxBytes) + " bytes)";
+            skipped.reason = SkipReason::TooLarge;
+            skipped.number = maxBytes;
             break;
         case Result::Unreadable:
-            problem = "cannot read: " + read.error.message();
+            skipped.reason = SkipReason::Unreadable;
+            skipped.error = read.error;
             break;
     }
     return std::nullopt;

@@ -124,7 +124,7 @@ std::string ReadPrefixArch(const fs::path& prefix) {
 }
 
 std::vector<RecordedInstall> ReadRecordedInstalls(const fs::path& prefix,
-                                                  std::vector<std::string>& skipped) {
+                                                  std::vector<SkippedFile>& skipped) {
     std::vector<RecordedInstall> installs;
     const std::vector<std::string> keys(std::begin(kUninstallKeys), std::end(kUninstallKeys));
     for (const char* name : {"system.reg", "user.reg"}) {
@@ -132,15 +132,15 @@ std::vector<RecordedInstall> ReadRecordedInstalls(const fs::path& prefix,
         if (!platform::IsRegularFile(file)) {
             continue;
         }
-        std::string problem;
-        const std::optional<std::string> text = ReadConfigText(file, kMaxRegistryBytes, problem);
-        RegistryFile registry;
-        if (text) {
-            registry = ParseWineRegistry(*text, keys);
-            problem = registry.problem;
+        SkippedFile unread;
+        const std::optional<std::string> text = ReadConfigText(file, kMaxRegistryBytes, unread);
+        if (!text) {
+            skipped.push_back(std::move(unread));
+            continue;
         }
-        if (!problem.empty()) {
-            skipped.push_back(file.string() + ": " + problem);
+        const RegistryFile registry = ParseWineRegistry(*text, keys);
+        if (!registry.problem.empty()) {
+            skipped.push_back({file, SkipReason::NotRegistry, 0, {}, registry.problem});
             continue;
         }
         for (const RegistryValue& value : registry.values) {
@@ -153,8 +153,7 @@ std::vector<RecordedInstall> ReadRecordedInstalls(const fs::path& prefix,
             if (folder.empty()) {
                 continue;
             }
-            installs.push_back(
-                {folder, std::string(name) + ": " + value.key + " (" + value.name + ")"});
+            installs.push_back({folder, name, value.key, value.name});
         }
     }
     return installs;

@@ -8,6 +8,8 @@
 #include <string_view>
 #include <vector>
 
+#include "game/search_report.h"
+
 // Wine prefixes: the folders with "drive_c", the registry files and the "dosdevices" drive links
 // in which Windows programs live on Linux.
 namespace kickvane::game {
@@ -51,14 +53,16 @@ std::string ReadPrefixArch(const fs::path& prefix);
 // A place the registry of a prefix names as a program's install folder.
 struct RecordedInstall {
     std::string windowsFolder;  // as recorded, a folder (for DisplayIcon: the icon file's folder)
-    std::string source;         // e.g. "system.reg: ...\Uninstall\FIFA Online 2 (InstallLocation)"
+    std::string registryFile;   // "system.reg" or "user.reg"
+    std::string key;            // the uninstall entry's key: "...\Uninstall\FIFA Online 2"
+    std::string valueName;      // "InstallLocation" or "DisplayIcon"
 };
 
 // The install folders recorded in the prefix's uninstall entries (InstallLocation and the folder
 // of DisplayIcon, also under Wow6432Node). A registry file that cannot be read, is malformed or is
 // too large is named in `skipped`.
 std::vector<RecordedInstall> ReadRecordedInstalls(const fs::path& prefix,
-                                                  std::vector<std::string>& skipped);
+                                                  std::vector<SkippedFile>& skipped);
 
 // Bounds of one search of a drive_c tree.
 struct SearchLimits {

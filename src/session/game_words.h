@@ -3,6 +3,7 @@
 #include <string>
 
 #include "game/launch_plan.h"
+#include "game/search_report.h"
 #include "platform/process.h"
 #include "text/failure_text.h"
 
@@ -22,5 +23,13 @@ std::string LaunchWayText(const game::LaunchPlan& plan);
 // ngay với mã lỗi 3." A program that could not be run is worded by the failure table.
 std::string LaunchFailureText(const game::LaunchPlan& plan, const platform::ProgramState& state,
                               const text::ShownFolders& folders);
+
+// How a found folder came to be known: "Lutris: FIFA Online 2 (~/.config/lutris/games/fifa.yml),
+// tìm trong drive_c", "lối tắt: C:\Users\An\Desktop\FIFA.lnk". Managers keep their names.
+std::string SourceText(const game::GameSource& source);
+
+// Why a file was passed over: "quá lớn (trên 4 MiB)", "sai định dạng ở dòng 3". A system error
+// is worded by the failure table.
+std::string SkippedReasonText(const game::SkippedFile& skipped);
 
 }  // namespace kickvane::session

@@ -115,6 +115,7 @@ std::optional<std::string> RunStatusLine(const ApplyRun& run, ClockTime at);
 // The game search's answer: the folders that hold the launcher, where it looked, what it skipped.
 using GameSearchOutcome = game::FindOutcome;
 using FoundGame = game::FoundGame;
+using SkippedFile = game::SkippedFile;
 // The game search as a command that owns what it needs, so it can run on another thread;
 // setting `cancel` ends it early.
 using GameSearch = std::function<GameSearchOutcome(const std::atomic<bool>& cancel)>;

@@ -10,6 +10,7 @@
 #include <QVBoxLayout>
 #include <memory>
 
+#include "session/game_words.h"
 #include "shell/message_box.h"
 #include "shell/qt_text.h"
 
@@ -61,7 +62,8 @@ void openChoice(QWidget* owner, QLineEdit* box, const std::vector<session::Found
     const int pathWidth = list->minimumWidth() - 48;  // the frame, the margins, a scroll bar
     for (const session::FoundGame& game : games) {
         auto* item = new QListWidgetItem(brokenPath(pathToQString(game.folder), *list, pathWidth) +
-                                         QStringLiteral("\n    ") + toQString(game.source));
+                                         QStringLiteral("\n    ") +
+                                         toQString(session::SourceText(game.source)));
         item->setData(Qt::UserRole, pathToQString(game.folder));
         list->addItem(item);
     }
@@ -90,8 +92,10 @@ void openNothingFound(QWidget* owner, const session::GameSearchOutcome& outcome)
     }
     if (!outcome.skipped.empty()) {
         text += QStringLiteral("\n\nBỏ qua (không đọc được):");
-        for (const std::string& skipped : outcome.skipped) {
-            text += QStringLiteral("\n  ") + brokenPath(toQString(skipped), *owner, kPlaceWidth);
+        for (const session::SkippedFile& skipped : outcome.skipped) {
+            text += QStringLiteral("\n  ") +
+                    brokenPath(pathToQString(skipped.path), *owner, kPlaceWidth) +
+                    QStringLiteral(": ") + toQString(session::SkippedReasonText(skipped));
         }
     }
     openInformation(owner, text);

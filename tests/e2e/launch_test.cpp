@@ -94,7 +94,8 @@ TEST_F(LaunchTest, WineRunsTheLauncherInItsOwnPrefixAndFolder_AndSaysSo) {
 // says which program failed and how, and fails; one that could not run at all says why.
 TEST_F(LaunchTest, WineThatFailsAtOnceIsAFailure_NamingItAndItsCode) {
     WriteFile(dir_ / "game/Gameloader.exe", "MZ");
-    WriteProgram(dir_ / "bin/wine", "#!/bin/sh\necho 'wine: could not load kernel32' >&2\nexit 3\n");
+    WriteProgram(dir_ / "bin/wine",
+                 "#!/bin/sh\necho 'wine: could not load kernel32' >&2\nexit 3\n");
     Result result = RunLaunch(dir_ / "game");
     EXPECT_EQ(result.exitCode, 1);
     EXPECT_EQ(result.out, "");
@@ -139,15 +140,26 @@ TEST_F(LaunchTest, MissingLauncherOrWineFailsWithAReason) {
 TEST_F(LaunchTest, FindGameListsFoldersWithTheirSources_OrSaysWhereItLooked) {
     Result result = Kickvane("find-game");
     EXPECT_EQ(result.exitCode, 1);
-    EXPECT_NE(result.err.find("looked in:"), std::string::npos);
+    EXPECT_NE(result.err.find("không tìm thấy Gameloader.exe; đã tìm trong:"), std::string::npos);
     EXPECT_NE(result.err.find(".wine"), std::string::npos);
 
     const fs::path prefix = MakePrefix(".PlayOnLinux/wineprefix/FO2", "win32");
     WriteFile(prefix / "drive_c/Games/FIFA/gameloader.EXE", "MZ");
     result = Kickvane("find-game");
     EXPECT_EQ(result.exitCode, 0) << result.err;
-    EXPECT_EQ(result.out, (prefix / "drive_c/Games/FIFA").string() +
-                              "\tPlayOnLinux: FO2 (~/.PlayOnLinux/wineprefix/FO2), drive_c\n");
+    EXPECT_EQ(result.out,
+              (prefix / "drive_c/Games/FIFA").string() +
+                  "\tPlayOnLinux: FO2 (~/.PlayOnLinux/wineprefix/FO2), tìm trong drive_c\n");
+
+    // A file that cannot be read is named with its reason, status word first.
+    WriteFile(home() / ".config/heroic/GamesConfig/bad.json", "{\n\"bad\": ");
+    result = Kickvane("find-game");
+    EXPECT_EQ(result.exitCode, 0) << result.err;
+    EXPECT_NE(
+        result.err.find("bỏ qua: " + (home() / ".config/heroic/GamesConfig/bad.json").string() +
+                        ": sai định dạng ở dòng 2\n"),
+        std::string::npos)
+        << result.err;
 }
 
 }  // namespace

@@ -17,9 +17,19 @@ using testing::WriteFile;
 std::vector<std::string> SourcesOf(const FindOutcome& outcome) {
     std::vector<std::string> sources;
     for (const FoundGame& game : outcome.games) {
-        sources.push_back(game.source);
+        sources.push_back(std::string(ManagerName(game.source.manager)) + ": " + game.source.name);
     }
     return sources;
+}
+
+// The reason a file of this name was skipped for; nullopt when none was.
+std::optional<SkipReason> SkipOf(const FindOutcome& outcome, const std::string& name) {
+    for (const SkippedFile& skipped : outcome.skipped) {
+        if (skipped.path.filename() == name) {
+            return skipped.reason;
+        }
+    }
+    return std::nullopt;
 }
 
 // Every entry under `root` with the size and time of its files, to prove that nothing was written.
@@ -105,24 +115,32 @@ TEST_F(FindGameTest, FindsEveryPlaceInOrder_NamesSources_SkipsBrokenFiles_AndWri
 
     ASSERT_EQ(outcome.games.size(), 5u) << ::testing::PrintToString(SourcesOf(outcome));
     EXPECT_EQ(outcome.games[0].folder, fs::canonical(home_ / "disk-d/Games/FIFA Online 2"));
-    EXPECT_EQ(outcome.games[0].source,
-              "Wine: ~/.wine (~/.wine), system.reg: Software\\Wow6432Node\\Microsoft\\Windows\\"
-              "CurrentVersion\\Uninstall\\FO2 (DisplayIcon)");
+    const GameSource& recorded = outcome.games[0].source;
+    EXPECT_EQ(recorded.kind, GameSource::Kind::RegistryEntry);
+    EXPECT_EQ(recorded.manager, Manager::Wine);
+    EXPECT_EQ(recorded.configFile, "~/.wine");
+    EXPECT_EQ(recorded.registryFile, "system.reg");
+    EXPECT_EQ(recorded.place,
+              "Software\\Wow6432Node\\Microsoft\\Windows\\CurrentVersion\\Uninstall\\FO2");
+    EXPECT_EQ(recorded.value, "DisplayIcon");
     EXPECT_EQ(outcome.games[1].folder,
               fs::canonical(home_ / "Games/fifa-online-2/drive_c/Program Files/FIFA"));
-    EXPECT_EQ(outcome.games[1].source,
-              "Lutris: fifa-online-2 (~/.config/lutris/games/fifa-online-2-1700000000.yml)");
-    EXPECT_EQ(outcome.games[2].source,
-              "Bottles (Flatpak): fifa-bottle (~/elsewhere/fifa-bottle/bottle.yml), drive_c");
-    EXPECT_EQ(outcome.games[3].source,
-              "Heroic: FIFA Heroic (~/.config/heroic/GamesConfig/abc.json)");
-    EXPECT_TRUE(outcome.games[4].source.starts_with("Steam: 3000000000"));
+    EXPECT_EQ(outcome.games[1].source.kind, GameSource::Kind::ManagerProgram);
+    EXPECT_EQ(outcome.games[1].source.configFile,
+              "~/.config/lutris/games/fifa-online-2-1700000000.yml");
+    EXPECT_EQ(outcome.games[2].source.kind, GameSource::Kind::PrefixSearch);
+    EXPECT_TRUE(outcome.games[2].source.flatpak);
+    EXPECT_EQ(outcome.games[2].source.configFile, "~/elsewhere/fifa-bottle/bottle.yml");
+    EXPECT_EQ(SourcesOf(outcome),
+              (std::vector<std::string>{"Wine: ~/.wine", "Lutris: fifa-online-2",
+                                        "Bottles: fifa-bottle", "Heroic: FIFA Heroic",
+                                        "Steam: " + outcome.games[4].source.name}));
+    EXPECT_TRUE(outcome.games[4].source.name.starts_with("3000000000"));
     EXPECT_EQ(outcome.games[4].prefix, home_ / "lib2/steamapps/compatdata/3000000000/pfx");
 
-    const std::string skipped = ::testing::PrintToString(outcome.skipped);
-    EXPECT_NE(skipped.find("broken.yml: not a text file"), std::string::npos) << skipped;
-    EXPECT_NE(skipped.find("bad.json: parse error at line 1"), std::string::npos) << skipped;
-    EXPECT_NE(skipped.find("huge/user.reg: too large"), std::string::npos) << skipped;
+    EXPECT_EQ(SkipOf(outcome, "broken.yml"), SkipReason::NotText);
+    EXPECT_EQ(SkipOf(outcome, "bad.json"), SkipReason::Malformed);
+    EXPECT_EQ(SkipOf(outcome, "user.reg"), SkipReason::TooLarge);
     EXPECT_FALSE(outcome.cutShort);
 }
 
@@ -133,7 +151,8 @@ TEST_F(FindGameTest, LimitsAndCancellationEndTheSearchEarly) {
     EXPECT_TRUE(limited.cutShort);
     // Finds that need no tree search still come through.
     ASSERT_FALSE(limited.games.empty());
-    EXPECT_NE(limited.games[0].source.find("DisplayIcon"), std::string::npos);
+    EXPECT_EQ(limited.games[0].source.value, "DisplayIcon");
+    EXPECT_EQ(SkipOf(limited, "drive_c"), SkipReason::SearchCut);
 
     std::atomic<bool> cancel{true};
     const FindOutcome cancelled = FindGame(home_.folders(), SearchLimits{}, &cancel);

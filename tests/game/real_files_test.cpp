@@ -68,8 +68,9 @@ TEST(RealFiles, LutrisExeFoldedOverTwoLines_OutsideItsPrefix_RunsInTheNamedPrefi
     const FindOutcome found = FindGame(home.folders(), SearchLimits{});
     const FoundGame* lutris = FoundIn(found, game);
     ASSERT_NE(lutris, nullptr) << ::testing::PrintToString(found.skipped);
-    EXPECT_EQ(lutris->source,
-              "Lutris: FIFA Online 2 (~/.config/lutris/games/fifa-online-2-1701234567.yml)");
+    EXPECT_EQ(lutris->source.manager, Manager::Lutris);
+    EXPECT_EQ(lutris->source.name, "FIFA Online 2");
+    EXPECT_EQ(lutris->source.configFile, "~/.config/lutris/games/fifa-online-2-1701234567.yml");
     ASSERT_NE(FoundIn(found, other), nullptr);
 
     const LaunchDecision decision = PlanLaunch(game.string(), home.folders(), Installed({"wine"}));
@@ -141,7 +142,8 @@ TEST(RealFiles, SteamsOlderLibraryListIsRead) {
     const FindOutcome found = FindGame(home.folders(), SearchLimits{});
     const FoundGame* steam = FoundIn(found, game);
     ASSERT_NE(steam, nullptr);
-    EXPECT_TRUE(steam->source.starts_with("Steam: 2871234567")) << steam->source;
+    EXPECT_EQ(steam->source.manager, Manager::Steam);
+    EXPECT_TRUE(steam->source.name.starts_with("2871234567")) << steam->source.name;
 }
 
 // Heroic names the folder of a Proton game, which keeps its Wine prefix in "pfx"; a sideloaded
@@ -177,8 +179,8 @@ TEST(RealFiles, HeroicProtonPrefixIsItsPfx_AndASideloadedGameRunsInItsNamedPrefi
     EXPECT_EQ(inPfx->prefix, pfx);
     const FoundGame* sideloaded = FoundIn(found, outside);
     ASSERT_NE(sideloaded, nullptr);
-    EXPECT_EQ(sideloaded->source.substr(0, sideloaded->source.find(" (")),
-              "Heroic: FIFA Online 2 \"Vi\xE1\xBB\x87t Nam\"");
+    EXPECT_EQ(sideloaded->source.manager, Manager::Heroic);
+    EXPECT_EQ(sideloaded->source.name, "FIFA Online 2 \"Vi\xE1\xBB\x87t Nam\"");
 
     // Proton's own script wants Steam's environment: the Wine inside Proton runs the game.
     for (const fs::path& game : {inside, outside}) {

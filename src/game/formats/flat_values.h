@@ -27,12 +27,26 @@ private:
     std::vector<std::pair<std::string, std::string>> entries_;
 };
 
+// Why a structured file could not be read.
+enum class ParseFault {
+    None,
+    NotText,     // it holds bytes no text has
+    NotMapping,  // its top is no mapping of keys
+    TooComplex,  // nested too deep or too many values
+    Syntax,      // it breaks its format's rules
+};
+
 // A parsed file or the reason it could not be read.
 struct Parsed {
     FlatValues values;
-    std::string problem;  // empty when the file was read
-    bool ok() const { return problem.empty(); }
+    ParseFault fault = ParseFault::None;
+    size_t line = 0;      // Syntax: the line of the fault (from 1), where the reader knows it
+    std::string problem;  // the reader's own words (English), for logs and tests
+    bool ok() const { return fault == ParseFault::None; }
 };
+
+// The line (from 1) that the byte at `offset` of `text` lies on.
+size_t LineAt(std::string_view text, size_t offset);
 
 // Structured files nest no deeper than this and hold no more values; deeper or larger text is
 // refused (a YAML file's aliases could otherwise repeat a tree without end).

@@ -56,15 +56,27 @@ Parsed ParseJson(std::string_view text) {
         });
         if (!Flatten(root, "", parsed.values)) {
             parsed.values = {};
+            parsed.fault = ParseFault::TooComplex;
             parsed.problem = "too many values";
         }
+    } catch (const TooDeep& error) {
+        parsed.fault = ParseFault::TooComplex;
+        parsed.problem = error.what();
+    } catch (const Json::parse_error& error) {
+        parsed.fault = ParseFault::Syntax;
+        parsed.line = LineAt(text, error.byte > 0 ? error.byte - 1 : 0);
+        const std::string_view what = error.what();
+        const size_t tagEnd = what.find("] ");
+        parsed.problem = what.substr(tagEnd == std::string_view::npos ? 0 : tagEnd + 2);
     } catch (const Json::exception& error) {
+        parsed.fault = ParseFault::Syntax;
         // "[json.exception.parse_error.101] parse error at line 1, ...": the reason without its
         // tag.
         const std::string_view what = error.what();
         const size_t tagEnd = what.find("] ");
         parsed.problem = what.substr(tagEnd == std::string_view::npos ? 0 : tagEnd + 2);
     } catch (const std::exception& error) {
+        parsed.fault = ParseFault::Syntax;
         parsed.problem = error.what();
     }
     return parsed;

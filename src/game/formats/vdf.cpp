@@ -13,6 +13,8 @@ Parsed ParseVdf(std::string_view text) {
     size_t pos = 0;
     auto fail = [&](const std::string& what) {
         parsed.values = {};
+        parsed.fault = what == "too many values" ? ParseFault::TooComplex : ParseFault::Syntax;
+        parsed.line = LineAt(text, pos);
         parsed.problem = "offset " + std::to_string(pos) + ": " + what;
         return parsed;
     };

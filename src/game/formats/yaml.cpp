@@ -48,6 +48,7 @@ bool Flatten(const YAML::Node& node, const std::string& path, int depth, FlatVal
 Parsed ParseYaml(std::string_view text) {
     Parsed parsed;
     if (text.find('\0') != std::string_view::npos) {
+        parsed.fault = ParseFault::NotText;
         parsed.problem = "not a text file";
         return parsed;
     }
@@ -55,20 +56,25 @@ Parsed ParseYaml(std::string_view text) {
     try {
         const YAML::Node root = YAML::Load(std::string(text));
         if (!root.IsNull() && !root.IsMap()) {
+            parsed.fault = ParseFault::NotMapping;
             parsed.problem = "not a mapping of keys";
             return parsed;
         }
         if (!Flatten(root, "", 0, parsed.values)) {
             parsed.values = {};
+            parsed.fault = ParseFault::TooComplex;
             parsed.problem = "nested too deep or too many values";
         }
     } catch (const YAML::Exception& error) {
         parsed.values = {};
+        parsed.fault = ParseFault::Syntax;
+        parsed.line = error.mark.is_null() ? 0 : static_cast<size_t>(error.mark.line) + 1;
         parsed.problem = error.mark.is_null()
                              ? error.msg
                              : "line " + std::to_string(error.mark.line + 1) + ": " + error.msg;
     } catch (const std::exception& error) {
         parsed.values = {};
+        parsed.fault = ParseFault::Syntax;
         parsed.problem = error.what();
     }
     return parsed;
