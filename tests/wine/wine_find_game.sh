@@ -75,14 +75,14 @@ wine "$tool/kickvane.com" find-game >"$work/found.txt" 2>"$work/errors.txt" || c
 tr -d '\r' <"$work/found.txt" >"$work/found.tmp" && mv "$work/found.tmp" "$work/found.txt"
 check "find-game ends well when it finds games" test "$code" = 0
 check "the user's uninstall entry, its InstallLocation" \
-  listed "$(win "$user_game")" "registry: HKEY_CURRENT_USER\\$key\\$entry (InstallLocation)"
+  listed "$(win "$user_game")" "sổ đăng ký, mục gỡ cài đặt HKEY_CURRENT_USER\\$key\\$entry (InstallLocation)"
 check "the 32-bit view's uninstall entry, the folder of its UninstallString" \
   listed "$(win "$machine_game")" \
-  "registry: HKEY_LOCAL_MACHINE\\Software\\WOW6432Node\\Microsoft\\Windows\\CurrentVersion\\Uninstall\\$entry (UninstallString)"
+  "sổ đăng ký, mục gỡ cài đặt HKEY_LOCAL_MACHINE\\Software\\WOW6432Node\\Microsoft\\Windows\\CurrentVersion\\Uninstall\\$entry (UninstallString)"
 check "the game that only a Start menu shortcut leads to" \
-  listed "$(win "$linked_game")" "shortcut: $link"
+  listed "$(win "$linked_game")" "lối tắt: $link"
 check "the game on the second fixed drive" \
-  listed "$DRIVE:\\Games\\FIFA Online 2" "drive $DRIVE:\\"
+  listed "$DRIVE:\\Games\\FIFA Online 2" "tìm trên ổ $DRIVE:\\"
 check "no Unix path among the finds" bash -c "! grep -q '^/' '$work/found.txt'"
 
 if [ "$failures" != 0 ]; then
