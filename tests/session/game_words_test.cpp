@@ -155,11 +155,12 @@ TEST(GameWords, FailuresNameTheProgramAndTheirDetail) {
               "Không khởi động được FIFA: Wine của Heroic dừng ngay với mã lỗi 0xC0000135.");
     plan.way = LaunchWay::Direct;
     platform::ProgramState notRun{Kind::NotRun, 0, {}};
+    const std::filesystem::path game = std::filesystem::current_path() / "fifa";
     notRun.failure = {FailedAction::Run,
-                      "/games/fifa/Gameloader.exe",
+                      game / "Gameloader.exe",
                       std::make_error_code(std::errc::permission_denied),
                       {}};
-    EXPECT_EQ(LaunchFailureText(plan, notRun, {"/games/fifa", {}}),
+    EXPECT_EQ(LaunchFailureText(plan, notRun, {game, {}}),
               "Không khởi động được FIFA: không chạy được Gameloader.exe: không có quyền chạy.");
 
     game::SkippedFile malformed{"/x.json", SkipReason::Malformed, 7, {}, {}};
