@@ -29,12 +29,12 @@ struct LaunchPlan {
     fs::path workingFolder;
 
     LaunchWay way = LaunchWay::Direct;
-    bool flatpak = false;                 // Lutris or Bottles: their Flatpak build
-    std::optional<Manager> wineKeptBy;    // Wine: the manager whose Wine build it is
-    fs::path prefix;                      // Wine: the prefix; empty: the environment's
-    std::string arch;                     // Wine: the prefix's "win32" or "win64", when recorded
-    std::string gameName;                 // Lutris: the game's name (or short name)
-    std::string gameId;                   // Lutris: the game's number; Bottles: the bottle
+    bool flatpak = false;               // Lutris or Bottles: their Flatpak build
+    std::optional<Manager> wineKeptBy;  // Wine: the manager whose Wine build it is
+    fs::path prefix;                    // Wine: the prefix; empty: the environment's
+    std::string arch;                   // Wine: the prefix's "win32" or "win64", when recorded
+    std::string gameName;               // Lutris: the game's name (or short name)
+    std::string gameId;                 // Lutris: the game's number; Bottles: the bottle
 };
 
 enum class LaunchProblem { None, LauncherMissing, WineMissing };

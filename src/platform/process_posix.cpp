@@ -193,7 +193,9 @@ void WriteReport(int fd, int kind, int step, int value) {
 class PosixWatch final : public ProgramWatch {
 public:
     PosixWatch(pid_t watcher, int reportFd, fs::path program, fs::path folder)
-        : watcher_(watcher), fd_(reportFd), program_(std::move(program)),
+        : watcher_(watcher),
+          fd_(reportFd),
+          program_(std::move(program)),
           folder_(std::move(folder)) {}
 
     ~PosixWatch() override {
@@ -326,14 +328,14 @@ std::unique_ptr<ProgramWatch> StartWatched(const fs::path& program,
                                            const EnvironmentAdditions& environment) {
     for (const auto& [name, value] : environment) {
         if (name.empty() || name.find('=') != std::string::npos) {
-            return FixedProgramWatch(NotRun(
-                {FailedAction::Run, program, std::make_error_code(std::errc::invalid_argument),
-                 "bad variable name " + name}));
+            return FixedProgramWatch(NotRun({FailedAction::Run, program,
+                                             std::make_error_code(std::errc::invalid_argument),
+                                             "bad variable name " + name}));
         }
     }
     if (program.empty()) {
-        return FixedProgramWatch(NotRun({FailedAction::Run, program,
-                                         std::make_error_code(std::errc::invalid_argument), {}}));
+        return FixedProgramWatch(NotRun(
+            {FailedAction::Run, program, std::make_error_code(std::errc::invalid_argument), {}}));
     }
     // The program's process changes into the working folder before exec, so a relative program
     // path is made absolute against the tool's current folder first.

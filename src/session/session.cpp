@@ -4,9 +4,9 @@
 #include "catalog/ini.h"
 #include "platform/filesystem.h"
 #include "platform/text.h"
+#include "session/game_words.h"
 #include "text/utf.h"
 #include "text/vni.h"
-#include "session/game_words.h"
 
 namespace kickvane::session {
 
@@ -330,12 +330,11 @@ LaunchRun Session::Launch(LaunchFrom from) {
     game::LaunchStart start = launch_(settings_.gameFolder);
     if (start.problem != game::LaunchProblem::None) {
         LaunchRun run{game::LaunchVerdict::Failed, {}, false, {}};
-        run.shown.messages.push_back(
-            {text::Message::Kind::Component,
-             start.problem == game::LaunchProblem::LauncherMissing
-                 ? text::VniToUnicodeUtf8(game::kLauncherMissingVni)
-                 : std::string(game::kWineMissingText),
-             {}});
+        run.shown.messages.push_back({text::Message::Kind::Component,
+                                      start.problem == game::LaunchProblem::LauncherMissing
+                                          ? text::VniToUnicodeUtf8(game::kLauncherMissingVni)
+                                          : std::string(game::kWineMissingText),
+                                      {}});
         return run;
     }
     launchPlan_ = std::move(start.plan);
@@ -368,9 +367,9 @@ LaunchRun Session::LaunchDecided(game::LaunchVerdict verdict,
                                  const platform::ProgramState& state) const {
     LaunchRun run{verdict, LaunchWayText(launchPlan_), false, {}};
     if (verdict == game::LaunchVerdict::Failed) {
-        run.shown.messages.push_back(
-            {text::Message::Kind::Component, LaunchFailureText(launchPlan_, state, ShownFolders()),
-             {}});
+        run.shown.messages.push_back({text::Message::Kind::Component,
+                                      LaunchFailureText(launchPlan_, state, ShownFolders()),
+                                      {}});
     } else if (launchFrom_ == LaunchFrom::Window) {
         run.hideToTray = true;
         run.shown.popup = Popup{std::string(kHiddenPopupText), 2};

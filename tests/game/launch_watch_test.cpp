@@ -22,27 +22,41 @@ struct Case {
 
 TEST(LaunchWatch, DecidesFromTheProgramsEndWithinTheWatch_OrItsRunningAtItsEnd) {
     const Case cases[] = {
-        {"runs on", {ProgramIs(Kind::Starting), ProgramIs(Kind::Running)}, 500ms,
-         LaunchVerdict::Started, 4},
-        {"ends with an error", {ProgramIs(Kind::Running), ProgramIs(Kind::Exited, 3)}, 500ms,
-         LaunchVerdict::Failed, 2},
-        {"hands over and ends well", {ProgramIs(Kind::Exited, 0)}, 100ms,
-         LaunchVerdict::Started, 1},
-        {"killed", {ProgramIs(Kind::Running), ProgramIs(Kind::Killed, 9)}, 100ms,
-         LaunchVerdict::Failed, 2},
+        {"runs on",
+         {ProgramIs(Kind::Starting), ProgramIs(Kind::Running)},
+         500ms,
+         LaunchVerdict::Started,
+         4},
+        {"ends with an error",
+         {ProgramIs(Kind::Running), ProgramIs(Kind::Exited, 3)},
+         500ms,
+         LaunchVerdict::Failed,
+         2},
+        {"hands over and ends well",
+         {ProgramIs(Kind::Exited, 0)},
+         100ms,
+         LaunchVerdict::Started,
+         1},
+        {"killed",
+         {ProgramIs(Kind::Running), ProgramIs(Kind::Killed, 9)},
+         100ms,
+         LaunchVerdict::Failed,
+         2},
         {"cannot run", {ProgramIs(Kind::NotRun)}, 0ms, LaunchVerdict::Failed, 1},
         // Not known yet whether it runs at all: the watch waits for that past its time.
         {"slow to start",
          {ProgramIs(Kind::Starting), ProgramIs(Kind::Starting), ProgramIs(Kind::Starting),
           ProgramIs(Kind::Running)},
-         1500ms, LaunchVerdict::Started, 4},
+         1500ms,
+         LaunchVerdict::Started,
+         4},
     };
     for (const Case& c : cases) {
         SCOPED_TRACE(c.what);
         FakeClock clock;
         bool released = false;
-        LaunchWatch watch(std::make_unique<FakeProgramWatch>(c.states, &released),
-                          clock.function(), 2000ms);
+        LaunchWatch watch(std::make_unique<FakeProgramWatch>(c.states, &released), clock.function(),
+                          2000ms);
         int ticks = 0;
         while (watch.Verdict() == LaunchVerdict::Watching && ticks < 20) {
             clock.now += c.step;
@@ -59,10 +73,10 @@ TEST(LaunchWatch, DecidesFromTheProgramsEndWithinTheWatch_OrItsRunningAtItsEnd) 
 
 TEST(LaunchWatch, AVerdictStays_EvenWhenTheProgramEndsLater) {
     FakeClock clock;
-    LaunchWatch watch(std::make_unique<FakeProgramWatch>(std::deque{ProgramIs(Kind::Running),
-                                                                    ProgramIs(Kind::Running),
-                                                                    ProgramIs(Kind::Exited, 1)}),
-                      clock.function(), 2000ms);
+    LaunchWatch watch(
+        std::make_unique<FakeProgramWatch>(std::deque{
+            ProgramIs(Kind::Running), ProgramIs(Kind::Running), ProgramIs(Kind::Exited, 1)}),
+        clock.function(), 2000ms);
     EXPECT_EQ(watch.Tick(), LaunchVerdict::Watching);
     clock.now += 2000ms;
     // The program's end after the watch is its own business (the game closed, say).

@@ -6,8 +6,8 @@
 #include <deque>
 
 #include "fakes.h"
-#include "support/fake_program.h"
 #include "shell/main_window.h"
+#include "support/fake_program.h"
 #include "support/temp_dir.h"
 
 namespace kickvane::testing {
