@@ -330,7 +330,7 @@ std::unique_ptr<ProgramWatch> StartWatched(const fs::path& program,
         if (name.empty() || name.find('=') != std::string::npos) {
             return FixedProgramWatch(NotRun({FailedAction::Run, program,
                                              std::make_error_code(std::errc::invalid_argument),
-                                             "bad variable name " + name}));
+                                             "tên biến môi trường không hợp lệ: " + name}));
         }
     }
     if (program.empty()) {
