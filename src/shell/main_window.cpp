@@ -75,6 +75,10 @@ MainWindow::MainWindow(session::Session& session, ShellServices services, QWidge
     connectTray();
     tray_->icon().add();
 
+    // A started game is watched for a moment, on a timer that runs only then.
+    launchTimer_.setInterval(session::kLaunchWatchInterval);
+    connect(&launchTimer_, &QTimer::timeout, this, &MainWindow::watchLaunch);
+
     // The hotkey is sampled when a key event arrives and, while it is held (or where no events
     // come), on the poll's interval; an idle tool sleeps.
     hotkeyTimer_.setInterval(session::kHotkeyPollInterval);
@@ -295,12 +299,7 @@ void MainWindow::launchGame(session::LaunchFrom from) {
         return;
     }
     buttons_->showLaunchWatched(true);
-    if (!launchTimer_.isActive()) {
-        launchTimer_.setInterval(session::kLaunchWatchInterval);
-        connect(&launchTimer_, &QTimer::timeout, this, &MainWindow::watchLaunch,
-                Qt::UniqueConnection);
-        launchTimer_.start();
-    }
+    launchTimer_.start();
 }
 
 void MainWindow::watchLaunch() {
