@@ -13,7 +13,8 @@ namespace {
 
 using Result = CommandResult;
 
-class CliTest : public ::testing::Test {
+// A tool folder and a game folder, fresh for each case.
+class CliTest : public ToolAndGameTest {
 protected:
     // Runs the program with `args` (already quoted for the shell) and `input` on standard input.
     Result Kickvane(const std::string& args, const std::string& input = "") {
@@ -22,18 +23,12 @@ protected:
 
     static std::string Quote(const fs::path& path) { return "'" + path.string() + "'"; }
 
-    fs::path tool() const { return dir_ / "tool"; }
-    fs::path game() const { return dir_ / "game"; }
     std::string Folders() const {
         return "--tool-folder " + Quote(tool()) + " --game " + Quote(game());
     }
-
-    TempDir dir_;
 };
 
 TEST_F(CliTest, PlanListsTheStepsAndApplyExitsZeroOneOrTwo) {
-    MakeToolFolder(tool());
-    MakeGameFolder(game());
     const Result plan = Kickvane("plan " + Folders());
     EXPECT_EQ(plan.exitCode, 0);
     EXPECT_NE(plan.out.find("Thay đổi Mark: chép thư mục data\\data2\\gui\\hud\\Indicator vào "
@@ -77,8 +72,6 @@ TEST_F(CliTest, PlanListsTheStepsAndApplyExitsZeroOneOrTwo) {
 // "list" shows every category and group, the chosen variants, the added ones and the skipped
 // folders; "plan" runs an added scoreboard by the steps of the catalog's scoreboards.
 TEST_F(CliTest, ListMarksChosenAndAddedVariantsAndNamesSkippedFolders) {
-    MakeToolFolder(tool());
-    MakeGameFolder(game());
     WriteFile(tool() / "extras/scoreboard/Đài 1/scoreboard/sb.dds", "x");
     WriteFile(tool() / "extras/scoreboard/a=b/sb.dds", "x");
     WriteFile(tool() / "ThietLap.ini", "[Thiet lap]\r\nDuongDan=" + game().string() +
@@ -106,8 +99,6 @@ TEST_F(CliTest, ListMarksChosenAndAddedVariantsAndNamesSkippedFolders) {
 }
 
 TEST_F(CliTest, SettingsThatCannotBeReadStopApplyWithTheReasonAndCopyNothing) {
-    MakeToolFolder(tool());
-    MakeGameFolder(game());
     WriteFile(tool() / "ThietLap.ini", std::string("\x7F"
                                                    "ELF\2\1\1\0\0\0",
                                                    10));
@@ -124,7 +115,6 @@ TEST_F(CliTest, SettingsThatCannotBeReadStopApplyWithTheReasonAndCopyNothing) {
 // A Windows path climbs no higher than its drive's root, as on Windows: the game folder stays
 // in the Wine prefix, and nothing is written beside the prefix.
 TEST_F(CliTest, ApplyToAWindowsPathWithDotsStaysInThePrefix) {
-    MakeToolFolder(tool());
     const fs::path prefix = dir_ / "prefix";
     MakeGameFolder(prefix / "drive_c/elsewhere-game");
     MakeGameFolder(dir_ / "elsewhere-game");
@@ -138,7 +128,7 @@ TEST_F(CliTest, ApplyToAWindowsPathWithDotsStaysInThePrefix) {
 }
 
 TEST_F(CliTest, QuickLoadExitCodes) {
-    fs::create_directories(tool() / "data/data2/players/heads/textures");
+    fs::remove_all(tool() / "data/data2/players/bodies");
     WriteFile(dir_ / "faces/face1.dds", "face");
     WriteFile(dir_ / "faces/skin1.dds", "skin");  // no bodies folder in the base set
     const auto quickLoad = [&](const char* folder) {

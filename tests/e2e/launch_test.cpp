@@ -18,7 +18,7 @@ using Result = CommandResult;
 class LaunchTest : public ::testing::Test {
 protected:
     LaunchTest()
-        : home_("HOME", home().string()),
+        : homeVariable_("HOME", home().string()),
           path_("PATH", (dir_ / "bin").string() + ":/usr/bin:/bin"),
           record_("KICKVANE_TEST_RECORD", (dir_ / "record.txt").string()),
           prefix_("WINEPREFIX", std::nullopt),
@@ -29,7 +29,7 @@ protected:
         }
     }
 
-    fs::path home() const { return dir_ / "home"; }
+    fs::path home() const { return home_.home(); }
 
     // A fake program that writes its name, folder, Wine variables and arguments to the record.
     void Install(const std::string& name) {
@@ -67,19 +67,13 @@ protected:
         return ReadText(dir_ / "record.txt");
     }
 
-    fs::path MakePrefix(const std::string& relative, const std::string& arch) {
-        const fs::path prefix = home() / relative;
-        fs::create_directories(prefix / "drive_c");
-        WriteFile(prefix / "system.reg", "WINE REGISTRY Version 2\n#arch=" + arch + "\n");
-        return prefix;
-    }
-
     TempDir dir_;
-    ScopedEnv home_, path_, record_, prefix_, xdgConfig_, xdgData_;
+    FakeHome home_;
+    ScopedEnv homeVariable_, path_, record_, prefix_, xdgConfig_, xdgData_;
 };
 
 TEST_F(LaunchTest, WineRunsTheLauncherInItsOwnPrefixAndFolder_AndSaysSo) {
-    const fs::path prefix = MakePrefix("Games/fo2", "win32");
+    const fs::path prefix = home_.MakePrefix("Games/fo2", "win32");
     WriteFile(prefix / "drive_c/FIFA Online 2/GameLoader.exe", "MZ");
     Result result;
     const std::string record = Launch(prefix / "drive_c/FIFA Online 2", &result);
@@ -115,7 +109,7 @@ TEST_F(LaunchTest, WineThatFailsAtOnceIsAFailure_NamingItAndItsCode) {
 
 // Which manager starts which game, Flatpak builds included, is the launch plan's unit test.
 TEST_F(LaunchTest, AManagerStartsItsOwnGame_WithoutWineVariablesOfOurs) {
-    const fs::path bottle = MakePrefix(".local/share/bottles/bottles/fifa", "win64");
+    const fs::path bottle = home_.MakePrefix(".local/share/bottles/bottles/fifa", "win64");
     WriteFile(bottle / "bottle.yml", "Name: fifa\n");
     WriteFile(bottle / "drive_c/FO2/Gameloader.exe", "MZ");
     EXPECT_EQ(Launch(bottle / "drive_c/FO2"),
@@ -143,7 +137,7 @@ TEST_F(LaunchTest, FindGameListsFoldersWithTheirSources_OrSaysWhereItLooked) {
     EXPECT_NE(result.err.find("không tìm thấy Gameloader.exe; đã tìm trong:"), std::string::npos);
     EXPECT_NE(result.err.find(".wine"), std::string::npos);
 
-    const fs::path prefix = MakePrefix(".PlayOnLinux/wineprefix/FO2", "win32");
+    const fs::path prefix = home_.MakePrefix(".PlayOnLinux/wineprefix/FO2", "win32");
     WriteFile(prefix / "drive_c/Games/FIFA/gameloader.EXE", "MZ");
     result = Kickvane("find-game");
     EXPECT_EQ(result.exitCode, 0) << result.err;

@@ -3,9 +3,6 @@
 // next save once it has lain untouched for a few seconds.
 #include <gtest/gtest.h>
 #include <signal.h>
-#include <spawn.h>
-#include <sys/wait.h>
-#include <unistd.h>
 
 #include <algorithm>
 #include <chrono>
@@ -15,9 +12,8 @@
 #include <thread>
 #include <vector>
 
+#include "support/process.h"
 #include "support/temp_dir.h"
-
-extern char** environ;
 
 namespace kickvane::testing {
 namespace {
@@ -36,28 +32,18 @@ std::string FileWith(int save) {
 // Starts `kickvane ini set FILE "Thiet lap" GiaTri VALUE`, kills it after `delay` unless it
 // has ended, and returns whether it ended by itself with success.
 bool SaveAndMaybeKill(const fs::path& file, int save, std::chrono::microseconds delay) {
-    const std::string path = file.string();
-    const std::string value = ValueOf(save);
-    std::vector<char*> args{const_cast<char*>(KICKVANE_BINARY), const_cast<char*>("ini"),
-                            const_cast<char*>("set"),           const_cast<char*>(path.c_str()),
-                            const_cast<char*>("Thiet lap"),     const_cast<char*>("GiaTri"),
-                            const_cast<char*>(value.c_str()),   nullptr};
-    pid_t pid = -1;
-    if (::posix_spawn(&pid, args[0], nullptr, nullptr, args.data(), environ) != 0) {
-        ADD_FAILURE() << "cannot start " << KICKVANE_BINARY;
-        return false;
-    }
+    ChildProcess child(
+        {KICKVANE_BINARY, "ini", "set", file.string(), "Thiet lap", "GiaTri", ValueOf(save)});
+    EXPECT_TRUE(child.started()) << "cannot start " << KICKVANE_BINARY;
     const auto deadline = Clock::now() + delay;
-    int status = 0;
-    while (::waitpid(pid, &status, WNOHANG) == 0) {
+    while (child.Running()) {
         if (Clock::now() >= deadline) {
-            ::kill(pid, SIGKILL);
-            ::waitpid(pid, &status, 0);
+            ::kill(child.pid(), SIGKILL);
             break;
         }
         std::this_thread::sleep_for(std::chrono::microseconds(20));
     }
-    return WIFEXITED(status) && WEXITSTATUS(status) == 0;
+    return child.Wait() == 0;
 }
 
 std::set<std::string> Leftovers(const fs::path& folder) {

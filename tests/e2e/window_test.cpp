@@ -20,10 +20,10 @@ namespace kickvane::testing {
 namespace {
 
 const std::string kWindowTitle = "Kickvane v2.0";
-const std::string kPopupTitle = "Thông báo";
-const std::string kBoxTitle = "Thông báo";
+const std::string kNoticeTitle = "Thông báo";  // the corner popups' and the boxes' title
 
-class WindowTest : public ::testing::Test {
+// The tool and game folders, with the hotkey F7 in the settings.
+class WindowTest : public ToolAndGameTest {
 protected:
     static void SetUpTestSuite() { display_ = XServer::Start().release(); }
     static void TearDownTestSuite() {
@@ -40,18 +40,11 @@ protected:
         fs::create_directories(dir_ / "runtime");
         fs::permissions(dir_ / "runtime", fs::perms::owner_all, fs::perm_options::replace);
         ::unsetenv("WAYLAND_DISPLAY");
-        MakeToolFolder(tool());
-        MakeGameFolder(game());
+        ToolAndGameTest::SetUp();
+        WriteSettings("F7");
     }
 
-    fs::path tool() const { return dir_ / "tool"; }
-    fs::path game() const { return dir_ / "game"; }
     fs::path applied() const { return game() / "data2/cmn/base.dds"; }
-
-    void WriteSettings(const std::string& hotkey) {
-        WriteFile(tool() / "ThietLap.ini",
-                  "[Thiet lap]\r\nDuongDan=" + game().string() + "\r\nPhimTat=" + hotkey + "\r\n");
-    }
 
     std::unique_ptr<ChildProcess> StartKickvane(const std::string& log = "kickvane.log") {
         return std::make_unique<ChildProcess>(
@@ -69,15 +62,12 @@ protected:
             Capture("xdotool search --all" + byOwner + " --name '^" + title + "$' 2>/dev/null");
         return ids.substr(0, ids.find('\n'));
     }
-    static std::string FindWindow(const std::string& title, const ChildProcess& owner) {
-        return FindWindow(title, &owner);
-    }
 
     // The corner popup and a box share their title; the popup is told apart by its window type,
     // a tool window's.
-    static std::string FindTyped(const std::string& title, const ChildProcess& owner, bool popup) {
+    static std::string FindNotice(const ChildProcess& owner, bool popup) {
         std::istringstream ids(Capture("xdotool search --all --pid " + std::to_string(owner.pid()) +
-                                       " --name '^" + title + "$' 2>/dev/null"));
+                                       " --name '^" + kNoticeTitle + "$' 2>/dev/null"));
         for (std::string id; std::getline(ids, id);) {
             const bool utility = Capture("xprop -id " + id + " _NET_WM_WINDOW_TYPE")
                                      .find("_NET_WM_WINDOW_TYPE_UTILITY") != std::string::npos;
@@ -87,18 +77,11 @@ protected:
         }
         return {};
     }
-    static std::string FindPopup(const ChildProcess& owner) {
-        return FindTyped(kPopupTitle, owner, true);
-    }
-    static std::string FindBox(const ChildProcess& owner) {
-        return FindTyped(kBoxTitle, owner, false);
-    }
+    static std::string FindPopup(const ChildProcess& owner) { return FindNotice(owner, true); }
+    static std::string FindBox(const ChildProcess& owner) { return FindNotice(owner, false); }
 
     static bool WindowShown(const std::string& title, const ChildProcess* owner) {
         return WaitFor([&] { return !FindWindow(title, owner).empty(); });
-    }
-    static bool WindowShown(const std::string& title, const ChildProcess& owner) {
-        return WindowShown(title, &owner);
     }
 
     // Another program's window takes the keyboard focus, as the game would.
@@ -117,7 +100,6 @@ protected:
     }
 
     static XServer* display_;
-    TempDir dir_;
 };
 
 XServer* WindowTest::display_ = nullptr;
@@ -126,10 +108,9 @@ XServer* WindowTest::display_ = nullptr;
 // in the corner alert, which leaves the focus with the game; a click on the alert opens the list.
 TEST_F(WindowTest, HotkeyInAnotherWindowApplies_FailedStepsShowTheAlertAndItsClickTheList) {
     fs::remove_all(game() / "zdata");  // the ball's copy has nowhere to go
-    WriteSettings("F7");
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle, *kickvane)) << ReadText(dir_ / "kickvane.log");
-    SaveScreenshot(FindWindow(kWindowTitle, *kickvane), "window-after-start.png");
+    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << ReadText(dir_ / "kickvane.log");
+    SaveScreenshot(FindWindow(kWindowTitle, kickvane.get()), "window-after-start.png");
     auto focused = FocusOtherWindow();
     const std::string gameWindow = FindWindow("the game", nullptr);
     Capture("xdotool key F7");
@@ -153,7 +134,7 @@ TEST_F(WindowTest, HotkeyInAnotherWindowApplies_FailedStepsShowTheAlertAndItsCli
 TEST_F(WindowTest, HotkeyTextThatNamesNoKeyTriggersNothing) {
     WriteSettings("f7");  // names are compared exactly: "f7" is no key
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle, *kickvane)) << ReadText(dir_ / "kickvane.log");
+    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << ReadText(dir_ / "kickvane.log");
     auto focused = FocusOtherWindow();
     Capture("xdotool key F7 F1 F12");
     // Several ticks of the 100 ms poll go by; none may react.
@@ -163,30 +144,28 @@ TEST_F(WindowTest, HotkeyTextThatNamesNoKeyTriggersNothing) {
 }
 
 TEST_F(WindowTest, TriggerRunsThePatchesInTheRunningCopyAndASecondStartIsRefused) {
-    WriteSettings("F7");
     const std::string before = ReadText(tool() / "ThietLap.ini");
     EXPECT_NE(ChildProcess({KICKVANE_BINARY, "trigger"}).Wait(), 0);  // nothing runs yet
     auto first = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle, *first)) << ReadText(dir_ / "kickvane.log");
+    ASSERT_TRUE(WindowShown(kWindowTitle, first.get())) << ReadText(dir_ / "kickvane.log");
     EXPECT_EQ(ChildProcess({KICKVANE_BINARY, "trigger"}).Wait(), 0);
     EXPECT_TRUE(WaitFor([&] { return fs::exists(applied()); }));
 
     auto second = StartKickvane("second.log");
-    ASSERT_TRUE(WindowShown("Thông báo", *second));
-    SaveScreenshot(FindWindow("Thông báo", *second), "second-start-refused.png");
-    Capture("xdotool windowfocus --sync " + FindWindow("Thông báo", *second) + " key Return");
+    ASSERT_TRUE(WindowShown(kNoticeTitle, second.get()));
+    SaveScreenshot(FindWindow(kNoticeTitle, second.get()), "second-start-refused.png");
+    Capture("xdotool windowfocus --sync " + FindWindow(kNoticeTitle, second.get()) + " key Return");
     EXPECT_EQ(second->Wait(), 0);
     EXPECT_TRUE(first->Running());
-    EXPECT_FALSE(FindWindow(kWindowTitle, *first).empty());
+    EXPECT_FALSE(FindWindow(kWindowTitle, first.get()).empty());
     EXPECT_EQ(ReadText(tool() / "ThietLap.ini"), before);
 }
 
 // A window that cannot answer (stopped here, as a busy one is) keeps the trigger and runs it once
 // it goes on; the trigger says it is busy, not that nothing runs.
 TEST_F(WindowTest, TriggerToABusyWindowIsQueuedAndRunsWhenItGoesOn) {
-    WriteSettings("F7");
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle, *kickvane)) << ReadText(dir_ / "kickvane.log");
+    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << ReadText(dir_ / "kickvane.log");
     ASSERT_EQ(::kill(kickvane->pid(), SIGSTOP), 0);
     const CommandResult busy =
         RunCommand(std::string("'") + KICKVANE_BINARY + "' trigger", dir_.path());
@@ -203,12 +182,11 @@ TEST_F(WindowTest, TriggerToABusyWindowIsQueuedAndRunsWhenItGoesOn) {
 // SIGTERM, SIGINT and SIGHUP end the window as "Thoát" does: a clean exit, the command socket
 // gone, nothing saved.
 TEST_F(WindowTest, StopSignalsEndTheWindowCleanly) {
-    WriteSettings("F7");
     const std::string settings = ReadText(tool() / "ThietLap.ini");
     const fs::path socket = dir_ / "runtime/kickvane.sock";
     for (const int signal : {SIGTERM, SIGINT, SIGHUP}) {
         auto kickvane = StartKickvane();
-        ASSERT_TRUE(WindowShown(kWindowTitle, *kickvane)) << ReadText(dir_ / "kickvane.log");
+        ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << ReadText(dir_ / "kickvane.log");
         ASSERT_TRUE(fs::exists(socket));
         ::kill(kickvane->pid(), signal);
         EXPECT_EQ(kickvane->Wait(), 0) << "signal " << signal;
@@ -234,7 +212,7 @@ bool ClickSecondTrayMenuEntry() {
                 "2>/dev/null); do eval $(xdotool getwindowgeometry --shell $id); "
                 "[ $HEIGHT -gt 60 ] && [ $HEIGHT -lt 300 ] && [ $WIDTH -lt 400 ] && "
                 "! xdotool getwindowname $id | grep -q -e '" +
-                kWindowTitle + "' -e '^" + kPopupTitle +
+                kWindowTitle + "' -e '^" + kNoticeTitle +
                 "$' && "
                 "xdotool mousemove --window $id $((WIDTH / 2)) $((HEIGHT * 3 / 10)) "
                 "click 1 && echo $id && break; done")
@@ -249,16 +227,15 @@ TEST_F(WindowTest, TrayIconAppearsWhenATrayStartsAndBringsTheHiddenWindowBack) {
     if (Capture("command -v trayer").empty()) {
         GTEST_SKIP() << "no tray host here";
     }
-    WriteSettings("F7");
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle, *kickvane)) << ReadText(dir_ / "kickvane.log");
+    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << ReadText(dir_ / "kickvane.log");
     // The tray host starts after the tool, as it may when the desktop comes up.
     ChildProcess trayer(
         {"trayer", "--edge", "top", "--align", "right", "--width", "10", "--height", "24"});
     ASSERT_TRUE(WaitFor([] { return !FindTrayIcon().empty(); })) << Capture("xwininfo -root -tree");
 
     // "Chạy ẩn" under the tab heads hides the window; the hotkey still works meanwhile.
-    Capture("xdotool mousemove --window " + FindWindow(kWindowTitle, *kickvane) +
+    Capture("xdotool mousemove --window " + FindWindow(kWindowTitle, kickvane.get()) +
             " 50 275 click 1");
     ASSERT_TRUE(WaitFor([] { return !WindowVisible(kWindowTitle); }));
     Capture("xdotool key F7");
@@ -280,11 +257,10 @@ TEST_F(WindowTest, TrayIconAppearsWhenATrayStartsAndBringsTheHiddenWindowBack) {
 // A set the player dropped beside the catalog's balls shows after them on the ball tab; clicked
 // and saved, it is what the hotkey copies.
 TEST_F(WindowTest, AddedBallIsChosenSavedAndApplied) {
-    WriteSettings("F7");
     WriteFile(tool() / u8"extras/Ball/Bóng Mới/textures/ball10.dds", "new ball");
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle, *kickvane)) << ReadText(dir_ / "kickvane.log");
-    const std::string window = FindWindow(kWindowTitle, *kickvane);
+    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << ReadText(dir_ / "kickvane.log");
+    const std::string window = FindWindow(kWindowTitle, kickvane.get());
     // The ball tab's head, then the fifth row's button (after the four catalog balls).
     Capture("xdotool mousemove --window " + window + " 50 125 click 1");
     Capture("xdotool mousemove --window " + window + " 131 243 click 1");
@@ -348,13 +324,12 @@ private:
 // The update check's network code is a module of its own, loaded by the first check: a newer
 // version on the host is recorded in the settings.
 TEST_F(WindowTest, UpdateCheckLoadsItsNetworkCodeAndRecordsANewerVersion) {
-    WriteSettings("F7");
     OneAnswerServer host("v9.9");
     ::setenv("KICKVANE_UPDATE_HOST", host.Root().c_str(), 1);
     auto kickvane = StartKickvane();
     ::unsetenv("KICKVANE_UPDATE_HOST");
-    ASSERT_TRUE(WindowShown(kWindowTitle, *kickvane)) << ReadText(dir_ / "kickvane.log");
-    const std::string window = FindWindow(kWindowTitle, *kickvane);
+    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << ReadText(dir_ / "kickvane.log");
+    const std::string window = FindWindow(kWindowTitle, kickvane.get());
     Capture("xdotool mousemove --window " + window + " 264 23 click 1");  // "Kiểm tra cập nhật"
     EXPECT_TRUE(WaitFor([&] {
         return ReadText(tool() / "ThietLap.ini").find("PhienBan=v9.9") != std::string::npos;
@@ -366,7 +341,6 @@ TEST_F(WindowTest, UpdateCheckLoadsItsNetworkCodeAndRecordsANewerVersion) {
 // "Khởi động FIFA" with a Wine that ends at once with an error: the window stays and a box says
 // why (its words are the window test's), with no "Ẩn xuống khay hệ thống!".
 TEST_F(WindowTest, LaunchWhoseWineFailsAtOnceSaysSoAndTheWindowStays) {
-    WriteSettings("F7");
     WriteFile(game() / "Gameloader.exe", "MZ");
     WriteFile(dir_ / "bin/wine",
               "#!/bin/sh\necho 'wine: could not load kernel32.dll' >&2\nexit 3\n");
@@ -375,8 +349,8 @@ TEST_F(WindowTest, LaunchWhoseWineFailsAtOnceSaysSoAndTheWindowStays) {
     const ScopedEnv home("HOME", (dir_ / "home").string());
     const ScopedEnv prefix("WINEPREFIX", std::nullopt);
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle, *kickvane)) << ReadText(dir_ / "kickvane.log");
-    const std::string window = FindWindow(kWindowTitle, *kickvane);
+    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << ReadText(dir_ / "kickvane.log");
+    const std::string window = FindWindow(kWindowTitle, kickvane.get());
     Capture("xdotool mousemove --window " + window + " 278 457 click 1");  // "Khởi động FIFA"
     ASSERT_TRUE(WaitFor([&] { return !FindBox(*kickvane).empty(); }))
         << ReadText(dir_ / "kickvane.log");

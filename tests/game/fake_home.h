@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <filesystem>
 #include <string>
 #include <string_view>
@@ -52,20 +53,14 @@ private:
     TempDir dir_;
 };
 
-// Programs are "found" in a fake bin folder when the test says they are installed.
-struct Installed {
-    std::vector<std::string> names;
-    game::ProgramLookup lookup() const {
-        return [names = names](const std::string& name) {
-            for (const std::string& installed : names) {
-                if (installed == name) {
-                    return fs::path("/fake/bin") / name;
-                }
-            }
-            return fs::path();
-        };
-    }
-};
+// A program lookup that "finds" the named programs, and no others, in a fake bin folder.
+inline game::ProgramLookup Installed(std::vector<std::string> names) {
+    return [names = std::move(names)](const std::string& name) {
+        return std::find(names.begin(), names.end(), name) != names.end()
+                   ? fs::path("/fake/bin") / name
+                   : fs::path();
+    };
+}
 
 // Writes an executable script.
 inline void WriteProgram(const fs::path& path, std::string_view content) {

@@ -39,7 +39,7 @@ TEST(PlanLaunch, LutrisGameStartsThroughLutris_ByItsNumber_OrFlatpak_OrFallsBack
                           "#!/bin/sh\n");
 
     LaunchDecision decision =
-        PlanLaunch(game.string(), home.folders(), Installed{{"lutris", "wine"}}.lookup());
+        PlanLaunch(game.string(), home.folders(), Installed({"lutris", "wine"}));
     ASSERT_EQ(decision.problem, LaunchProblem::None);
     EXPECT_EQ(decision.plan.program, "/fake/bin/lutris");
     EXPECT_EQ(decision.plan.arguments, Args{"lutris:rungameid/42"});
@@ -49,15 +49,14 @@ TEST(PlanLaunch, LutrisGameStartsThroughLutris_ByItsNumber_OrFlatpak_OrFallsBack
     EXPECT_EQ(decision.plan.gameId, "42");
 
     // Without Lutris installed: Wine in the prefix, with the Wine build Lutris keeps for it.
-    decision = PlanLaunch(game.string(), home.folders(), Installed{{"wine"}}.lookup());
+    decision = PlanLaunch(game.string(), home.folders(), Installed({"wine"}));
     EXPECT_EQ(decision.plan.program, home / ".local/share/lutris/runners/wine/lutris-8/bin/wine");
     EXPECT_EQ(decision.plan.arguments, Args{(game / "Gameloader.exe").string()});
 
     // The Flatpak build's files, without a database: started by the short name.
     fs::remove_all(home / ".config/lutris");
     WriteFile(home / ".var/app/net.lutris.Lutris/data/lutris/games/fifa-online-2-1700.yml", yml);
-    decision = PlanLaunch(game.string(), home.folders(),
-                          Installed{{"lutris", "flatpak", "wine"}}.lookup());
+    decision = PlanLaunch(game.string(), home.folders(), Installed({"lutris", "flatpak", "wine"}));
     EXPECT_EQ(decision.plan.program, "/fake/bin/flatpak");
     EXPECT_EQ(decision.plan.arguments,
               (Args{"run", "net.lutris.Lutris", "lutris:rungame/fifa-online-2"}));
@@ -72,7 +71,7 @@ TEST(PlanLaunch, BottleThatHoldsTheGameStartsThroughBottlesCli_NativeOrFlatpak) 
     const std::string launcher = (game / "gameLoader.exe").string();
 
     LaunchDecision decision =
-        PlanLaunch(game.string(), home.folders(), Installed{{"bottles-cli", "wine"}}.lookup());
+        PlanLaunch(game.string(), home.folders(), Installed({"bottles-cli", "wine"}));
     EXPECT_EQ(decision.plan.program, "/fake/bin/bottles-cli");
     EXPECT_EQ(decision.plan.arguments, (Args{"run", "-b", "FIFA Bottle", "-e", launcher}));
     EXPECT_TRUE(decision.plan.environment.empty());
@@ -82,7 +81,7 @@ TEST(PlanLaunch, BottleThatHoldsTheGameStartsThroughBottlesCli_NativeOrFlatpak) 
     const fs::path moved = home / "moved/bottles/FIFA/drive_c/Program Files/FO2";
     WriteFile(home / ".var/app/com.usebottles.bottles/data/bottles/bottles/FIFA/placeholder.yml",
               "Path: " + (home / "moved/bottles/FIFA").string() + "\n");
-    decision = PlanLaunch(moved.string(), home.folders(), Installed{{"flatpak", "wine"}}.lookup());
+    decision = PlanLaunch(moved.string(), home.folders(), Installed({"flatpak", "wine"}));
     EXPECT_EQ(decision.plan.program, "/fake/bin/flatpak");
     EXPECT_EQ(decision.plan.arguments,
               (Args{"run", "--command=bottles-cli", "com.usebottles.bottles", "run", "-b",
@@ -93,7 +92,7 @@ TEST(PlanLaunch, OtherwiseWineRunsInTheGamesOwnPrefix_WithItsArch) {
     FakeHome home;
     const fs::path prefix = home.MakePrefix("Games/fo2", "win32");
     const fs::path game = FakeHome::MakeGame(prefix / "drive_c/FIFA");
-    const ProgramLookup wineOnly = Installed{{"wine", "lutris", "bottles-cli"}}.lookup();
+    const ProgramLookup wineOnly = Installed({"wine", "lutris", "bottles-cli"});
 
     LaunchDecision decision = PlanLaunch(game.string(), home.folders(), wineOnly);
     ASSERT_EQ(decision.problem, LaunchProblem::None);
@@ -119,19 +118,17 @@ TEST(PlanLaunch, OtherwiseWineRunsInTheGamesOwnPrefix_WithItsArch) {
 TEST(PlanLaunch, MissingLauncherOrWineIsSaid_AndANativeLauncherRunsDirectly) {
     FakeHome home;
     const fs::path game = FakeHome::MakeGame(home / "game");
-    EXPECT_EQ(
-        PlanLaunch((home / "empty").string(), home.folders(), Installed{{"wine"}}.lookup()).problem,
-        LaunchProblem::LauncherMissing);
-    EXPECT_EQ(PlanLaunch(game.string(), home.folders(), Installed{}.lookup()).problem,
+    EXPECT_EQ(PlanLaunch((home / "empty").string(), home.folders(), Installed({"wine"})).problem,
+              LaunchProblem::LauncherMissing);
+    EXPECT_EQ(PlanLaunch(game.string(), home.folders(), Installed({})).problem,
               LaunchProblem::WineMissing);
-    const LaunchDecision outside =
-        PlanLaunch(game.string(), home.folders(), Installed{{"wine"}}.lookup());
+    const LaunchDecision outside = PlanLaunch(game.string(), home.folders(), Installed({"wine"}));
     EXPECT_TRUE(outside.plan.environment.empty());
     EXPECT_EQ(outside.plan.way, LaunchWay::Wine);
     EXPECT_TRUE(outside.plan.prefix.empty());
 
     testing::WriteProgram(game / "Gameloader.exe", "#!/bin/sh\n");
-    const LaunchDecision native = PlanLaunch(game.string(), home.folders(), Installed{}.lookup());
+    const LaunchDecision native = PlanLaunch(game.string(), home.folders(), Installed({}));
     EXPECT_EQ(native.plan.program, game / "Gameloader.exe");
     EXPECT_EQ(native.plan.way, LaunchWay::Direct);
 }

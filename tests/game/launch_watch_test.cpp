@@ -21,35 +21,16 @@ struct Case {
 };
 
 TEST(LaunchWatch, DecidesFromTheProgramsEndWithinTheWatch_OrItsRunningAtItsEnd) {
+    const auto starting = ProgramIs(Kind::Starting), running = ProgramIs(Kind::Running);
+    using V = LaunchVerdict;
     const Case cases[] = {
-        {"runs on",
-         {ProgramIs(Kind::Starting), ProgramIs(Kind::Running)},
-         500ms,
-         LaunchVerdict::Started,
-         4},
-        {"ends with an error",
-         {ProgramIs(Kind::Running), ProgramIs(Kind::Exited, 3)},
-         500ms,
-         LaunchVerdict::Failed,
-         2},
-        {"hands over and ends well",
-         {ProgramIs(Kind::Exited, 0)},
-         100ms,
-         LaunchVerdict::Started,
-         1},
-        {"killed",
-         {ProgramIs(Kind::Running), ProgramIs(Kind::Killed, 9)},
-         100ms,
-         LaunchVerdict::Failed,
-         2},
-        {"cannot run", {ProgramIs(Kind::NotRun)}, 0ms, LaunchVerdict::Failed, 1},
+        {"runs on", {starting, running}, 500ms, V::Started, 4},
+        {"ends with an error", {running, ProgramIs(Kind::Exited, 3)}, 500ms, V::Failed, 2},
+        {"hands over and ends well", {ProgramIs(Kind::Exited, 0)}, 100ms, V::Started, 1},
+        {"killed", {running, ProgramIs(Kind::Killed, 9)}, 100ms, V::Failed, 2},
+        {"cannot run", {ProgramIs(Kind::NotRun)}, 0ms, V::Failed, 1},
         // Not known yet whether it runs at all: the watch waits for that past its time.
-        {"slow to start",
-         {ProgramIs(Kind::Starting), ProgramIs(Kind::Starting), ProgramIs(Kind::Starting),
-          ProgramIs(Kind::Running)},
-         1500ms,
-         LaunchVerdict::Started,
-         4},
+        {"slow to start", {starting, starting, starting, running}, 1500ms, V::Started, 4},
     };
     for (const Case& c : cases) {
         SCOPED_TRACE(c.what);

@@ -12,13 +12,10 @@ namespace {
 
 namespace fs = std::filesystem;
 using testing::FakeHome;
+using testing::Installed;
 using testing::WriteFile;
 using Args = std::vector<std::string>;
 using Env = platform::EnvironmentAdditions;
-
-ProgramLookup Installed(std::vector<std::string> names) {
-    return testing::Installed{std::move(names)}.lookup();
-}
 
 const FoundGame* FoundIn(const FindOutcome& outcome, const fs::path& folder) {
     for (const FoundGame& game : outcome.games) {

@@ -22,11 +22,6 @@ constexpr int kF7 = 0x76;
 
 class SessionTest : public testing::ToolAndGameTest {
 protected:
-    void WriteSettings(const std::string& hotkey) {
-        WriteFile(tool() / "ThietLap.ini",
-                  "[Thiet lap]\r\nDuongDan=" + game().string() + "\r\nPhimTat=" + hotkey + "\r\n");
-    }
-
     std::unique_ptr<Session> Open(Launcher launch = game::LaunchGame) {
         auto keys = std::make_unique<FakeKeySampler>();
         keys_ = keys.get();
@@ -261,8 +256,7 @@ TEST_F(SessionTest, AddedBallIsChosenSavedAppliedAndFallsBackWhenItsFolderGoes) 
     EXPECT_EQ(Open()->Selection().ChosenAdded(catalog::GroupId::Ball), "Bóng Tết");
 
     fs::remove_all(tool() / u8"extras/Ball/Bóng Tết");
-    WriteFile(tool() / "extras/Ball/Empty one/.hidden", "");
-    fs::remove(tool() / "extras/Ball/Empty one/.hidden");
+    fs::create_directories(tool() / "extras/Ball/Empty one");
     const Outcome refreshed = session->RefreshAddedVariants();
     ASSERT_EQ(refreshed.messages.size(), 1u);
     EXPECT_EQ(refreshed.messages[0].text,

@@ -57,6 +57,12 @@ protected:
     fs::path tool() const { return dir_ / "tool"; }
     fs::path game() const { return dir_ / "game"; }
 
+    // Settings that name the game folder and the hotkey.
+    void WriteSettings(const std::string& hotkey) const {
+        WriteFile(tool() / "ThietLap.ini",
+                  "[Thiet lap]\r\nDuongDan=" + game().string() + "\r\nPhimTat=" + hotkey + "\r\n");
+    }
+
     TempDir dir_;
 };
 
