@@ -14,6 +14,8 @@ using game::Manager;
 using game::SkipReason;
 using Kind = platform::ProgramState::Kind;
 
+const std::error_code kDenied = std::make_error_code(std::errc::permission_denied);
+
 // Words a text may hold that carry no mark: names of programs and files, Vietnamese words
 // written without one, units.
 const std::set<std::string> kPlainWords = {
@@ -99,8 +101,7 @@ std::vector<std::pair<std::string, bool>> AllTexts() {
          {SkipReason::Missing, SkipReason::NotAFile, SkipReason::TooLarge, SkipReason::Unreadable,
           SkipReason::NotText, SkipReason::Malformed, SkipReason::TooComplex,
           SkipReason::NotRegistry, SkipReason::SearchCut}) {
-        game::SkippedFile skipped{"/home/an/.config/x/fifa.yml", reason, 4u << 20,
-                                  std::make_error_code(std::errc::permission_denied),
+        game::SkippedFile skipped{"/home/an/.config/x/fifa.yml", reason, 4u << 20, kDenied,
                                   "parse error at line 1"};
         texts.emplace_back(SkippedReasonText(skipped), true);
     }
@@ -121,10 +122,8 @@ std::vector<std::pair<std::string, bool>> AllTexts() {
             texts.emplace_back(LaunchWayText(plan), true);
             for (const Kind kind : {Kind::Exited, Kind::Killed, Kind::NotRun}) {
                 platform::ProgramState state{kind, kind == Kind::Killed ? 9 : 3, {}};
-                state.failure = {FailedAction::Run,
-                                 "/usr/bin/wine",
-                                 std::make_error_code(std::errc::no_such_file_or_directory),
-                                 {}};
+                const auto missing = std::make_error_code(std::errc::no_such_file_or_directory);
+                state.failure = {FailedAction::Run, "/usr/bin/wine", missing, {}};
                 texts.emplace_back(LaunchFailureText(plan, state, {}), true);
             }
         }
@@ -156,10 +155,7 @@ TEST(GameWords, FailuresNameTheProgramAndTheirDetail) {
     plan.way = LaunchWay::Direct;
     platform::ProgramState notRun{Kind::NotRun, 0, {}};
     const std::filesystem::path game = std::filesystem::current_path() / "fifa";
-    notRun.failure = {FailedAction::Run,
-                      game / "Gameloader.exe",
-                      std::make_error_code(std::errc::permission_denied),
-                      {}};
+    notRun.failure = {FailedAction::Run, game / "Gameloader.exe", kDenied, {}};
     EXPECT_EQ(LaunchFailureText(plan, notRun, {game, {}}),
               "Không khởi động được FIFA: không chạy được Gameloader.exe: không có quyền chạy.");
 
@@ -167,11 +163,7 @@ TEST(GameWords, FailuresNameTheProgramAndTheirDetail) {
     EXPECT_EQ(SkippedReasonText(malformed), "sai định dạng ở dòng 7");
     malformed.number = 0;
     EXPECT_EQ(SkippedReasonText(malformed), "sai định dạng");
-    game::SkippedFile unreadable{"/x.json",
-                                 SkipReason::Unreadable,
-                                 0,
-                                 std::make_error_code(std::errc::permission_denied),
-                                 {}};
+    game::SkippedFile unreadable{"/x.json", SkipReason::Unreadable, 0, kDenied, {}};
     EXPECT_EQ(SkippedReasonText(unreadable), "không đọc được: không có quyền đọc");
 }
 
