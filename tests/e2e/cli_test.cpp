@@ -1,4 +1,5 @@
 // The kickvane program's subcommands, run as a user runs them, on temporary folders.
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 #include <sys/wait.h>
 
@@ -12,6 +13,8 @@ namespace kickvane::testing {
 namespace {
 
 using Result = CommandResult;
+using ::testing::HasSubstr;
+using ::testing::Not;
 
 // A tool folder and a game folder, fresh for each case.
 class CliTest : public ToolAndGameTest {
@@ -31,18 +34,16 @@ protected:
 TEST_F(CliTest, PlanListsTheStepsAndApplyExitsZeroOneOrTwo) {
     const Result plan = Kickvane("plan " + Folders());
     EXPECT_EQ(plan.exitCode, 0);
-    EXPECT_NE(plan.out.find("Thay đổi Mark: chép thư mục data\\data2\\gui\\hud\\Indicator vào "
-                            "data2\\gui\\hud\\Indicator\n"),
-              std::string::npos)
-        << plan.out;
+    EXPECT_THAT(plan.out,
+                HasSubstr("Thay đổi Mark: chép thư mục data\\data2\\gui\\hud\\Indicator vào "
+                          "data2\\gui\\hud\\Indicator\n"));
     EXPECT_FALSE(fs::exists(game() / "data2/cmn"));
 
     const Result done = Kickvane("apply " + Folders());
     EXPECT_EQ(done.exitCode, 0) << done.err;
-    EXPECT_NE(done.out.find("xong    Thay đổi bóng: chép thư mục extras\\Ball\\Europa League 2011 "
-                            "vào zdata\\data2\\ball ("),
-              std::string::npos)
-        << done.out;
+    EXPECT_THAT(done.out,
+                HasSubstr("xong    Thay đổi bóng: chép thư mục extras\\Ball\\Europa League 2011 "
+                          "vào zdata\\data2\\ball ("));
 
     // The game folder comes from the settings when not given.
     fs::remove_all(game() / "zdata");
@@ -51,22 +52,19 @@ TEST_F(CliTest, PlanListsTheStepsAndApplyExitsZeroOneOrTwo) {
     const std::string apply = "apply --tool-folder " + Quote(tool());
     const Result failed = Kickvane(apply);
     EXPECT_EQ(failed.exitCode, 1);
-    EXPECT_NE(failed.err.find("lỗi: Thay đổi Cổ động viên: không chép được vào "
-                              "zdata\\data2\\crowd\\textures: trò chơi không có thư mục này\n"),
-              std::string::npos)
-        << failed.err;
-    EXPECT_NE(failed.out.find("LỖI     Thay đổi Cổ động viên: không chép được vào"),
-              std::string::npos)
-        << failed.out;
+    EXPECT_THAT(failed.err,
+                HasSubstr("lỗi: Thay đổi Cổ động viên: không chép được vào "
+                          "zdata\\data2\\crowd\\textures: trò chơi không có thư mục này\n"));
+    EXPECT_THAT(failed.out, HasSubstr("LỖI     Thay đổi Cổ động viên: không chép được vào"));
 
     fs::remove_all(game() / "data2");
     const Result noData = Kickvane(apply);
     EXPECT_EQ(noData.exitCode, 2);
-    EXPECT_NE(noData.err.find("Không tìm thấy thư mục chứa FIFA Online 2"), std::string::npos);
+    EXPECT_THAT(noData.err, HasSubstr("Không tìm thấy thư mục chứa FIFA Online 2"));
     fs::remove_all(tool() / "data");
     const Result noBase = Kickvane(apply);
     EXPECT_EQ(noBase.exitCode, 2);
-    EXPECT_NE(noBase.err.find("Thư mục nguồn: Không tìm thấy: "), std::string::npos);
+    EXPECT_THAT(noBase.err, HasSubstr("Thư mục nguồn: Không tìm thấy: "));
 }
 
 // "list" shows every category and group, the chosen variants, the added ones and the skipped
@@ -78,24 +76,19 @@ TEST_F(CliTest, ListMarksChosenAndAddedVariantsAndNamesSkippedFolders) {
                                            "\r\n[Bang Ti So]\r\nMacDinh=False\r\nĐài 1=True\r\n");
     const Result list = Kickvane("list --tool-folder " + Quote(tool()));
     EXPECT_EQ(list.exitCode, 0) << list.err;
-    EXPECT_NE(list.out.find("Bong [bật] Thay đổi bóng\n  ( ) MacDinh: Mặc định\n"
-                            "  (*) Europa League 2011: Europa League 2011\n"),
-              std::string::npos)
-        << list.out;
-    EXPECT_NE(list.out.find("  ( ) SSUCLRed: Supa Strikas UCL Red\n  (*) Đài 1 [đã thêm]\n"
-                            "  bỏ qua extras\\scoreboard\\a=b: tên có ký tự không dùng được\n"
-                            "Mark [bật]"),
-              std::string::npos)
-        << list.out;
-    EXPECT_NE(list.out.find("SVD [tắt] Thay đổi Sân vận động\n"), std::string::npos);
+    EXPECT_THAT(list.out, HasSubstr("Bong [bật] Thay đổi bóng\n  ( ) MacDinh: Mặc định\n"
+                                    "  (*) Europa League 2011: Europa League 2011\n"));
+    EXPECT_THAT(list.out,
+                HasSubstr("  ( ) SSUCLRed: Supa Strikas UCL Red\n  (*) Đài 1 [đã thêm]\n"
+                          "  bỏ qua extras\\scoreboard\\a=b: tên có ký tự không dùng được\n"
+                          "Mark [bật]"));
+    EXPECT_THAT(list.out, HasSubstr("SVD [tắt] Thay đổi Sân vận động\n"));
 
     const Result plan = Kickvane("plan " + Folders());
-    EXPECT_NE(plan.out.find("Thay đổi bảng tỉ số: chép thư mục extras\\scoreboard\\Đài "
-                            "1\\scoreboard vào data2\\gui\\hud\\scoreboard\n"
-                            "Thay đổi bảng tỉ số: chép thư mục extras\\scoreboard\\Đài "
-                            "1\\namebar vào data2\\gui\\hud\\namebar\n"),
-              std::string::npos)
-        << plan.out;
+    EXPECT_THAT(plan.out, HasSubstr("Thay đổi bảng tỉ số: chép thư mục extras\\scoreboard\\Đài "
+                                    "1\\scoreboard vào data2\\gui\\hud\\scoreboard\n"
+                                    "Thay đổi bảng tỉ số: chép thư mục extras\\scoreboard\\Đài "
+                                    "1\\namebar vào data2\\gui\\hud\\namebar\n"));
 }
 
 TEST_F(CliTest, SettingsThatCannotBeReadStopApplyWithTheReasonAndCopyNothing) {
@@ -104,8 +97,7 @@ TEST_F(CliTest, SettingsThatCannotBeReadStopApplyWithTheReasonAndCopyNothing) {
                                                    10));
     const Result stopped = Kickvane("apply " + Folders());
     EXPECT_EQ(stopped.exitCode, 2);
-    EXPECT_NE(stopped.err.find("ThietLap.ini không phải là văn bản"), std::string::npos)
-        << stopped.err;
+    EXPECT_THAT(stopped.err, HasSubstr("ThietLap.ini không phải là văn bản"));
     EXPECT_FALSE(fs::exists(game() / "data2/cmn"));
     EXPECT_EQ(
         Kickvane("ini get " + Quote(tool() / "ThietLap.ini") + " 'Thiet lap' PhimTat F7").exitCode,
@@ -165,12 +157,12 @@ TEST_F(CliTest, UnknownCommandOrMissingArgumentsShowUsage) {
     EXPECT_EQ(Kickvane("frobnicate").exitCode, 2);
     const Result usage = Kickvane("apply --game");
     EXPECT_EQ(usage.exitCode, 2);
-    EXPECT_NE(usage.err.find("Cách dùng: kickvane"), std::string::npos);
+    EXPECT_THAT(usage.err, HasSubstr("Cách dùng: kickvane"));
     // The help speaks the player's language, with no English left in its descriptions.
     const Result help = Kickvane("--help");
     EXPECT_EQ(help.exitCode, 0);
     for (const char* english : {"Usage", "copy the", "the game", "settings value"}) {
-        EXPECT_EQ(help.out.find(english), std::string::npos) << english;
+        EXPECT_THAT(help.out, Not(HasSubstr(english)));
     }
 }
 

@@ -1,5 +1,6 @@
 // `kickvane launch` and `kickvane find-game` on a home of their own, with fake `wine`, `lutris`,
 // `bottles-cli` and `flatpak` programs on a PATH of their own that record how they were started.
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 #include <sys/wait.h>
 
@@ -14,6 +15,7 @@ namespace kickvane::testing {
 namespace {
 
 using Result = CommandResult;
+using ::testing::HasSubstr;
 
 class LaunchTest : public ::testing::Test {
 protected:
@@ -93,18 +95,14 @@ TEST_F(LaunchTest, WineThatFailsAtOnceIsAFailure_NamingItAndItsCode) {
     Result result = RunLaunch(dir_ / "game");
     EXPECT_EQ(result.exitCode, 1);
     EXPECT_EQ(result.out, "");
-    EXPECT_NE(result.err.find("Không khởi động được FIFA: Wine dừng ngay với mã lỗi 3."),
-              std::string::npos)
-        << result.err;
+    EXPECT_THAT(result.err, HasSubstr("Không khởi động được FIFA: Wine dừng ngay với mã lỗi 3."));
 
     // Found on PATH, but gone by the time it is run: an exec failure with the system's reason.
     WriteProgram(dir_ / "bin/wine", "#!/nonexistent/interpreter\n");
     result = RunLaunch(dir_ / "game");
     EXPECT_EQ(result.exitCode, 1);
-    EXPECT_NE(result.err.find("Không khởi động được FIFA qua Wine: không chạy được "),
-              std::string::npos)
-        << result.err;
-    EXPECT_NE(result.err.find("không tìm thấy"), std::string::npos) << result.err;
+    EXPECT_THAT(result.err, HasSubstr("Không khởi động được FIFA qua Wine: không chạy được "));
+    EXPECT_THAT(result.err, HasSubstr("không tìm thấy"));
 }
 
 // Which manager starts which game, Flatpak builds included, is the launch plan's unit test.
@@ -121,21 +119,21 @@ TEST_F(LaunchTest, AManagerStartsItsOwnGame_WithoutWineVariablesOfOurs) {
 TEST_F(LaunchTest, MissingLauncherOrWineFailsWithAReason) {
     Result result = RunLaunch(dir_ / "none");
     EXPECT_EQ(result.exitCode, 1);
-    EXPECT_NE(result.err.find("Gameloader.exe"), std::string::npos);
+    EXPECT_THAT(result.err, HasSubstr("Gameloader.exe"));
 
     WriteFile(dir_ / "game/Gameloader.exe", "MZ");
     fs::remove(dir_ / "bin/wine");
     const ScopedEnv noSystemWine("PATH", (dir_ / "bin").string());
     result = RunLaunch(dir_ / "game");
     EXPECT_EQ(result.exitCode, 1);
-    EXPECT_NE(result.err.find("Wine"), std::string::npos) << result.err;
+    EXPECT_THAT(result.err, HasSubstr("Wine"));
 }
 
 TEST_F(LaunchTest, FindGameListsFoldersWithTheirSources_OrSaysWhereItLooked) {
     Result result = Kickvane("find-game");
     EXPECT_EQ(result.exitCode, 1);
-    EXPECT_NE(result.err.find("không tìm thấy Gameloader.exe; đã tìm trong:"), std::string::npos);
-    EXPECT_NE(result.err.find(".wine"), std::string::npos);
+    EXPECT_THAT(result.err, HasSubstr("không tìm thấy Gameloader.exe; đã tìm trong:"));
+    EXPECT_THAT(result.err, HasSubstr(".wine"));
 
     const fs::path prefix = home_.MakePrefix(".PlayOnLinux/wineprefix/FO2", "win32");
     WriteFile(prefix / "drive_c/Games/FIFA/gameloader.EXE", "MZ");
@@ -149,11 +147,9 @@ TEST_F(LaunchTest, FindGameListsFoldersWithTheirSources_OrSaysWhereItLooked) {
     WriteFile(home() / ".config/heroic/GamesConfig/bad.json", "{\n\"bad\": ");
     result = Kickvane("find-game");
     EXPECT_EQ(result.exitCode, 0) << result.err;
-    EXPECT_NE(
-        result.err.find("bỏ qua: " + (home() / ".config/heroic/GamesConfig/bad.json").string() +
-                        ": sai định dạng ở dòng 2\n"),
-        std::string::npos)
-        << result.err;
+    EXPECT_THAT(result.err,
+                HasSubstr("bỏ qua: " + (home() / ".config/heroic/GamesConfig/bad.json").string() +
+                          ": sai định dạng ở dòng 2\n"));
 }
 
 }  // namespace
