@@ -45,6 +45,7 @@ protected:
     }
 
     fs::path applied() const { return game() / "data2/cmn/base.dds"; }
+    std::string Log() const { return ReadText(dir_ / "kickvane.log"); }  // the window's output
 
     std::unique_ptr<ChildProcess> StartKickvane(const std::string& log = "kickvane.log") {
         return std::make_unique<ChildProcess>(
@@ -109,15 +110,13 @@ XServer* WindowTest::display_ = nullptr;
 TEST_F(WindowTest, HotkeyInAnotherWindowApplies_FailedStepsShowTheAlertAndItsClickTheList) {
     fs::remove_all(game() / "zdata");  // the ball's copy has nowhere to go
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << ReadText(dir_ / "kickvane.log");
+    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << Log();
     SaveScreenshot(FindWindow(kWindowTitle, kickvane.get()), "window-after-start.png");
     auto focused = FocusOtherWindow();
     const std::string gameWindow = FindWindow("the game", nullptr);
     Capture("xdotool key F7");
-    ASSERT_TRUE(WaitFor([&] { return !FindPopup(*kickvane).empty(); }))
-        << ReadText(dir_ / "kickvane.log");
-    EXPECT_TRUE(fs::exists(applied()))
-        << ReadText(dir_ / "kickvane.log");  // the others went through
+    ASSERT_TRUE(WaitFor([&] { return !FindPopup(*kickvane).empty(); })) << Log();
+    EXPECT_TRUE(fs::exists(applied())) << Log();  // the others went through
     EXPECT_EQ(Capture("xdotool getwindowfocus"), gameWindow + "\n");
     EXPECT_TRUE(FindBox(*kickvane).empty());
     // Once it has risen into its place.
@@ -125,8 +124,7 @@ TEST_F(WindowTest, HotkeyInAnotherWindowApplies_FailedStepsShowTheAlertAndItsCli
     SaveScreenshot(FindPopup(*kickvane), "failure-alert.png");
 
     Capture("xdotool mousemove --window " + FindPopup(*kickvane) + " 20 20 click 1");
-    ASSERT_TRUE(WaitFor([&] { return !FindBox(*kickvane).empty(); }))
-        << ReadText(dir_ / "kickvane.log");
+    ASSERT_TRUE(WaitFor([&] { return !FindBox(*kickvane).empty(); })) << Log();
     SaveScreenshot(FindBox(*kickvane), "failure-list.png");
     EXPECT_TRUE(kickvane->Running());
 }
@@ -134,7 +132,7 @@ TEST_F(WindowTest, HotkeyInAnotherWindowApplies_FailedStepsShowTheAlertAndItsCli
 TEST_F(WindowTest, HotkeyTextThatNamesNoKeyTriggersNothing) {
     WriteSettings("f7");  // names are compared exactly: "f7" is no key
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << ReadText(dir_ / "kickvane.log");
+    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << Log();
     auto focused = FocusOtherWindow();
     Capture("xdotool key F7 F1 F12");
     // Several ticks of the 100 ms poll go by; none may react.
@@ -147,7 +145,7 @@ TEST_F(WindowTest, TriggerRunsThePatchesInTheRunningCopyAndASecondStartIsRefused
     const std::string before = ReadText(tool() / "ThietLap.ini");
     EXPECT_NE(ChildProcess({KICKVANE_BINARY, "trigger"}).Wait(), 0);  // nothing runs yet
     auto first = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle, first.get())) << ReadText(dir_ / "kickvane.log");
+    ASSERT_TRUE(WindowShown(kWindowTitle, first.get())) << Log();
     EXPECT_EQ(ChildProcess({KICKVANE_BINARY, "trigger"}).Wait(), 0);
     EXPECT_TRUE(WaitFor([&] { return fs::exists(applied()); }));
 
@@ -165,7 +163,7 @@ TEST_F(WindowTest, TriggerRunsThePatchesInTheRunningCopyAndASecondStartIsRefused
 // it goes on; the trigger says it is busy, not that nothing runs.
 TEST_F(WindowTest, TriggerToABusyWindowIsQueuedAndRunsWhenItGoesOn) {
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << ReadText(dir_ / "kickvane.log");
+    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << Log();
     ASSERT_EQ(::kill(kickvane->pid(), SIGSTOP), 0);
     const CommandResult busy =
         RunCommand(std::string("'") + KICKVANE_BINARY + "' trigger", dir_.path());
@@ -186,7 +184,7 @@ TEST_F(WindowTest, StopSignalsEndTheWindowCleanly) {
     const fs::path socket = dir_ / "runtime/kickvane.sock";
     for (const int signal : {SIGTERM, SIGINT, SIGHUP}) {
         auto kickvane = StartKickvane();
-        ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << ReadText(dir_ / "kickvane.log");
+        ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << Log();
         ASSERT_TRUE(fs::exists(socket));
         ::kill(kickvane->pid(), signal);
         EXPECT_EQ(kickvane->Wait(), 0) << "signal " << signal;
@@ -228,7 +226,7 @@ TEST_F(WindowTest, TrayIconAppearsWhenATrayStartsAndBringsTheHiddenWindowBack) {
         GTEST_SKIP() << "no tray host here";
     }
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << ReadText(dir_ / "kickvane.log");
+    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << Log();
     // The tray host starts after the tool, as it may when the desktop comes up.
     ChildProcess trayer(
         {"trayer", "--edge", "top", "--align", "right", "--width", "10", "--height", "24"});
@@ -259,7 +257,7 @@ TEST_F(WindowTest, TrayIconAppearsWhenATrayStartsAndBringsTheHiddenWindowBack) {
 TEST_F(WindowTest, AddedBallIsChosenSavedAndApplied) {
     WriteFile(tool() / u8"extras/Ball/Bóng Mới/textures/ball10.dds", "new ball");
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << ReadText(dir_ / "kickvane.log");
+    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << Log();
     const std::string window = FindWindow(kWindowTitle, kickvane.get());
     // The ball tab's head, then the fifth row's button (after the four catalog balls).
     Capture("xdotool mousemove --window " + window + " 50 125 click 1");
@@ -328,13 +326,13 @@ TEST_F(WindowTest, UpdateCheckLoadsItsNetworkCodeAndRecordsANewerVersion) {
     ::setenv("KICKVANE_UPDATE_HOST", host.Root().c_str(), 1);
     auto kickvane = StartKickvane();
     ::unsetenv("KICKVANE_UPDATE_HOST");
-    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << ReadText(dir_ / "kickvane.log");
+    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << Log();
     const std::string window = FindWindow(kWindowTitle, kickvane.get());
     Capture("xdotool mousemove --window " + window + " 264 23 click 1");  // "Kiểm tra cập nhật"
     EXPECT_TRUE(WaitFor([&] {
         return ReadText(tool() / "ThietLap.ini").find("PhienBan=v9.9") != std::string::npos;
     })) << ReadText(tool() / "ThietLap.ini")
-        << ReadText(dir_ / "kickvane.log");
+        << Log();
     EXPECT_GE(host.requests(), 1);
 }
 
@@ -349,11 +347,10 @@ TEST_F(WindowTest, LaunchWhoseWineFailsAtOnceSaysSoAndTheWindowStays) {
     const ScopedEnv home("HOME", (dir_ / "home").string());
     const ScopedEnv prefix("WINEPREFIX", std::nullopt);
     auto kickvane = StartKickvane();
-    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << ReadText(dir_ / "kickvane.log");
+    ASSERT_TRUE(WindowShown(kWindowTitle, kickvane.get())) << Log();
     const std::string window = FindWindow(kWindowTitle, kickvane.get());
     Capture("xdotool mousemove --window " + window + " 278 457 click 1");  // "Khởi động FIFA"
-    ASSERT_TRUE(WaitFor([&] { return !FindBox(*kickvane).empty(); }))
-        << ReadText(dir_ / "kickvane.log");
+    ASSERT_TRUE(WaitFor([&] { return !FindBox(*kickvane).empty(); })) << Log();
     const std::string box = FindBox(*kickvane);
     SaveScreenshot(box, "launch-failed.png");
     EXPECT_TRUE(WindowVisible(kWindowTitle));
