@@ -122,9 +122,14 @@ else
   export DISPLAY=":$(head -n 1 "$work/display")"
 fi
 
-rm -rf "$game/data2" "$game/zdata"
-cp -r "$demo_game/." "$game/"
 files_in_game() { find "$game" -type f | wc -l; }
+fresh_game() {  # the running copy may still be writing: wait until the count stands still
+  local count=-1
+  while [ "$count" != "$(files_in_game)" ]; do count=$(files_in_game); sleep 0.5; done
+  rm -rf "$game/data2" "$game/zdata"
+  cp -r "$demo_game/." "$game/"
+}
+fresh_game
 before=$(files_in_game)
 # Windows are found by the process that owns them (Wine gives each its _NET_WM_PID), not by their
 # title alone: another program on the display may show a window of the same title.
@@ -137,12 +142,6 @@ visible_window() { windows_of "$window_pid" 'Kickvane v2.0' --onlyvisible | head
 window_shown() { [ -n "$(visible_window)" ]; }
 notice_shown() { [ -n "$(windows_of "$second_pid" 'Thông báo')" ]; }
 game_has_more_files() { [ "$(files_in_game)" -gt "$before" ]; }
-fresh_game() {  # the running copy may still be writing: wait until the count stands still
-  local count=-1
-  while [ "$count" != "$(files_in_game)" ]; do count=$(files_in_game); sleep 0.5; done
-  rm -rf "$game/data2" "$game/zdata"
-  cp -r "$demo_game/." "$game/"
-}
 
 started=$(now_ms)
 (cd "$tool" && exec wine "$exe") >"$artifacts/wine-window.log" 2>&1 &
@@ -155,7 +154,6 @@ focus_window() {
   xdotool windowactivate --sync "$window" 2>/dev/null || xdotool windowfocus --sync "$window"
 }
 sleep 1  # let it paint before the screenshot
-mkdir -p "$artifacts"
 import -window root "$artifacts/wine-window.png" 2>/dev/null || true
 
 focus_window
