@@ -340,9 +340,8 @@ TEST_F(WindowTest, UpdateCheckLoadsItsNetworkCodeAndRecordsANewerVersion) {
 // why (its words are the window test's), with no "Ẩn xuống khay hệ thống!".
 TEST_F(WindowTest, LaunchWhoseWineFailsAtOnceSaysSoAndTheWindowStays) {
     WriteFile(game() / "Gameloader.exe", "MZ");
-    WriteFile(dir_ / "bin/wine",
-              "#!/bin/sh\necho 'wine: could not load kernel32.dll' >&2\nexit 3\n");
-    fs::permissions(dir_ / "bin/wine", fs::perms::owner_all);
+    WriteProgram(dir_ / "bin/wine",
+                 "#!/bin/sh\necho 'wine: could not load kernel32.dll' >&2\nexit 3\n");
     const ScopedEnv path("PATH", (dir_ / "bin").string() + ":/usr/bin:/bin");
     const ScopedEnv home("HOME", (dir_ / "home").string());
     const ScopedEnv prefix("WINEPREFIX", std::nullopt);

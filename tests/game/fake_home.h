@@ -62,10 +62,4 @@ inline game::ProgramLookup Installed(std::vector<std::string> names) {
     };
 }
 
-// Writes an executable script.
-inline void WriteProgram(const fs::path& path, std::string_view content) {
-    WriteFile(path, content);
-    fs::permissions(path, fs::perms::owner_all);
-}
-
 }  // namespace kickvane::testing

@@ -20,11 +20,7 @@ using testing::ScopedEnv;
 using testing::TempDir;
 using testing::WaitFor;
 using testing::WriteFile;
-
-void WriteExecutable(const fs::path& path, std::string_view content) {
-    WriteFile(path, content);
-    fs::permissions(path, fs::perms::owner_all);
-}
+using testing::WriteProgram;
 
 // Polls the watch until its answer is no longer Starting (or, with `ended`, until the program
 // has ended or could not run).
@@ -47,13 +43,13 @@ TEST(StartWatched, RunsProgramInWorkingFolder_WithArgumentsUntouchedByAShell_And
     const ScopedEnv replaced("WINEPREFIX", "/old/prefix");
     // The program waits for "go", which the test makes only once the watch is gone. The report
     // is written beside and renamed into place, so a file that exists is whole.
-    WriteExecutable(dir / "tools/launcher.sh",
-                    "#!/bin/sh\n"
-                    "while [ ! -e go ]; do sleep 0.05; done\n"
-                    "{ pwd; printf '%s\\n' \"$#\" \"$@\"; cat; echo "
-                    "\"$KICKVANE_TEST_KEPT|$WINEPREFIX|$WINEARCH\"; "
-                    "} > report.tmp\n"
-                    "mv report.tmp report.txt\n");
+    WriteProgram(dir / "tools/launcher.sh",
+                 "#!/bin/sh\n"
+                 "while [ ! -e go ]; do sleep 0.05; done\n"
+                 "{ pwd; printf '%s\\n' \"$#\" \"$@\"; cat; echo "
+                 "\"$KICKVANE_TEST_KEPT|$WINEPREFIX|$WINEARCH\"; "
+                 "} > report.tmp\n"
+                 "mv report.tmp report.txt\n");
 
     auto watch =
         StartWatched(dir / "tools/launcher.sh", {"two words", "$(touch injected)", ""},
@@ -113,7 +109,7 @@ TEST(StartWatched, TellsHowTheProgramEnded_AndLeavesNoChildOnceItHas) {
 TEST(StartWatched, ProgramThatCannotRun_IsNotRunWithTheSystemsError) {
     TempDir dir;
     WriteFile(dir / "plain.txt", "not a program");
-    WriteExecutable(dir / "ok.sh", "#!/bin/sh\nexit 0\n");
+    WriteProgram(dir / "ok.sh", "#!/bin/sh\nexit 0\n");
     // {program, folder, action, cause}
     const std::tuple<fs::path, fs::path, FailedAction, FailureCause> cases[] = {
         {dir / "Gameloader.exe", dir.path(), FailedAction::Run, FailureCause::NotFound},
@@ -137,10 +133,10 @@ TEST(StartWatched, ProgramThatCannotRun_IsNotRunWithTheSystemsError) {
 
 TEST(IsNativeExecutable, AcceptsElfAndScripts_RejectsWindowsProgramsAndPlainFiles) {
     TempDir dir;
-    WriteExecutable(dir / "run.sh", "#!/bin/sh\necho hi\n");
-    WriteExecutable(dir / "Gameloader.exe", std::string("MZ\x90\0\3\0\0\0", 8));
+    WriteProgram(dir / "run.sh", "#!/bin/sh\necho hi\n");
+    WriteProgram(dir / "Gameloader.exe", std::string("MZ\x90\0\3\0\0\0", 8));
     WriteFile(dir / "notes.sh", "#!/bin/sh\necho hi\n");  // a script without the executable bit
-    WriteExecutable(dir / "empty", "");
+    WriteProgram(dir / "empty", "");
     fs::create_directories(dir / "folder");
 
     EXPECT_TRUE(IsNativeExecutable(fs::read_symlink("/proc/self/exe")));
@@ -156,9 +152,9 @@ TEST(FindOnPath, FindsExecutablesInPathFolders_NeverInTheCurrentFolder) {
     EXPECT_TRUE(sh.is_absolute());
 
     TempDir dir;
-    WriteExecutable(dir / "bin/kv-tool", "#!/bin/sh\n");
+    WriteProgram(dir / "bin/kv-tool", "#!/bin/sh\n");
     WriteFile(dir / "other/kv-plain", "#!/bin/sh\n");  // not executable
-    WriteExecutable(dir / "cwd/kv-here", "#!/bin/sh\n");
+    WriteProgram(dir / "cwd/kv-here", "#!/bin/sh\n");
     // An empty PATH entry would mean the current folder, where anything may lie.
     ScopedEnv path("PATH", ":" + (dir / "other").string() + ":" + (dir / "bin").string());
     const fs::path previous = fs::current_path();

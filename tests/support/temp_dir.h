@@ -44,6 +44,12 @@ inline void WriteFile(const fs::path& path, std::string_view content) {
     std::ofstream(path, std::ios::binary) << content;
 }
 
+// Writes a file that its owner may run, as a script or program.
+inline void WriteProgram(const fs::path& path, std::string_view content) {
+    WriteFile(path, content);
+    fs::permissions(path, fs::perms::owner_all);
+}
+
 inline std::string ReadText(const fs::path& path) {
     std::ifstream in(path, std::ios::binary);
     std::ostringstream content;

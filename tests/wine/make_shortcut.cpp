@@ -13,6 +13,8 @@
 #include <cstdio>
 #include <string>
 
+#include "utf8.h"
+
 int main() {
     int count = 0;
     LPWSTR* args = CommandLineToArgvW(GetCommandLineW(), &count);
@@ -49,11 +51,7 @@ int main() {
     }
     CoUninitialize();
     if (saved) {
-        const int size =
-            WideCharToMultiByte(CP_UTF8, 0, link.c_str(), -1, nullptr, 0, nullptr, nullptr);
-        std::string utf8(static_cast<size_t>(size), '\0');
-        WideCharToMultiByte(CP_UTF8, 0, link.c_str(), -1, utf8.data(), size, nullptr, nullptr);
-        std::printf("%s\n", utf8.c_str());
+        std::printf("%s\n", Utf8(link).c_str());
     }
     LocalFree(args);
     return saved ? 0 : 1;
