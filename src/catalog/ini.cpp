@@ -336,7 +336,7 @@ Status IniDocument::Save(const fs::path& file) const {
     const std::string bytes = Serialize();
     // A file the reader would refuse loses every setting at the next start: keep the old one.
     if (bytes.size() > kMaxIniBytes) {
-        return Status::Fail("Tệp thiết lập " + DisplayName(resolved) + " sẽ quá lớn (hơn " +
+        return Status::Fail("File thiết lập " + DisplayName(resolved) + " sẽ quá lớn (hơn " +
                             std::to_string(kMaxIniBytes >> 10) +
                             " KiB): thay đổi này không được ghi.");
     }

@@ -308,7 +308,7 @@ Outcome Session::Save() {
                 platform::FindEntryIgnoringCase(toolFolder_, kSettingsBackupName)
                     .value_or(toolFolder_ / kSettingsBackupName);
             if (const Status kept = platform::ReplaceFile(file, backup); !kept) {
-                return refuse(kept.failure(), "Không giữ lại được tệp cũ thành " +
+                return refuse(kept.failure(), "Không giữ lại được file cũ thành " +
                                                   std::string(kSettingsBackupName) + ":\n");
             }
             keptOld = true;

@@ -33,7 +33,7 @@ std::string FailureAlertText(size_t failures);
 inline constexpr std::string_view kSavedPopupText = "Đã lưu thiết lập!";
 // After a save over a settings file that could not be read: the old file was kept beside it.
 inline constexpr std::string_view kSavedKeepingOldPopupText =
-    "Đã lưu thiết lập!\nTệp cũ không đọc được, đã giữ lại thành ThietLap.ini.bak";
+    "Đã lưu thiết lập!\nFile cũ không đọc được, đã giữ lại thành ThietLap.ini.bak";
 inline constexpr std::string_view kSettingsBackupName = "ThietLap.ini.bak";
 inline constexpr std::string_view kHiddenPopupText = "Ẩn xuống khay hệ thống!";
 // Said instead where no tray is up: the window minimises, since hidden it could not come back.

@@ -86,8 +86,8 @@ TEST(FailureText, WhatFailedLeadsAndCanStartASentence) {
         FailureText(SystemFailure(FailedAction::Run, kRoot / "usr/bin/wine", EACCES), kFolders),
         "không chạy được " + (kRoot / "usr/bin/wine").string() + ": không có quyền chạy");
     // A failure no system code describes keeps the words its finder chose.
-    EXPECT_EQ(FailureText({FailedAction::Other, {}, {}, "Tệp thiết lập hỏng."}, kFolders),
-              "Tệp thiết lập hỏng.");
+    EXPECT_EQ(FailureText({FailedAction::Other, {}, {}, "File thiết lập hỏng."}, kFolders),
+              "File thiết lập hỏng.");
 }
 
 }  // namespace
