@@ -51,8 +51,8 @@ std::unique_ptr<ProgramWatch> StartWatched(const std::filesystem::path& program,
                                            bool minimised = false,
                                            const EnvironmentAdditions& environment = {});
 
-// A watch whose answer is known from the start (a program that could not be started at all).
-std::unique_ptr<ProgramWatch> FixedProgramWatch(ProgramState state);
+// The watch of a program that could not be started at all: NotRun with `failure`, for good.
+std::unique_ptr<ProgramWatch> NotRunWatch(Failure failure);
 
 // The full path of a program found on PATH; empty when there is none.
 std::filesystem::path FindOnPath(const std::string& name);

@@ -16,7 +16,10 @@ private:
 
 }  // namespace
 
-std::unique_ptr<ProgramWatch> FixedProgramWatch(ProgramState state) {
+std::unique_ptr<ProgramWatch> NotRunWatch(Failure failure) {
+    ProgramState state;
+    state.kind = ProgramState::Kind::NotRun;
+    state.failure = std::move(failure);
     return std::make_unique<FixedWatch>(std::move(state));
 }
 

@@ -285,13 +285,6 @@ private:
     ProgramState state_;
 };
 
-ProgramState NotRun(Failure failure) {
-    ProgramState state;
-    state.kind = ProgramState::Kind::NotRun;
-    state.failure = std::move(failure);
-    return state;
-}
-
 bool IsExecutableFile(const fs::path& path) {
     struct stat st {};
     return ::stat(path.c_str(), &st) == 0 && S_ISREG(st.st_mode) &&
@@ -328,21 +321,21 @@ std::unique_ptr<ProgramWatch> StartWatched(const fs::path& program,
                                            const EnvironmentAdditions& environment) {
     for (const auto& [name, value] : environment) {
         if (name.empty() || name.find('=') != std::string::npos) {
-            return FixedProgramWatch(NotRun({FailedAction::Run, program,
-                                             std::make_error_code(std::errc::invalid_argument),
-                                             "tên biến môi trường không hợp lệ: " + name}));
+            return NotRunWatch({FailedAction::Run, program,
+                                std::make_error_code(std::errc::invalid_argument),
+                                "tên biến môi trường không hợp lệ: " + name});
         }
     }
     if (program.empty()) {
-        return FixedProgramWatch(NotRun(
-            {FailedAction::Run, program, std::make_error_code(std::errc::invalid_argument), {}}));
+        return NotRunWatch(
+            {FailedAction::Run, program, std::make_error_code(std::errc::invalid_argument), {}});
     }
     // The program's process changes into the working folder before exec, so a relative program
     // path is made absolute against the tool's current folder first.
     std::error_code error;
     const fs::path absoluteProgram = fs::absolute(program, error);
     if (error) {
-        return FixedProgramWatch(NotRun({FailedAction::Run, program, error, {}}));
+        return NotRunWatch({FailedAction::Run, program, error, {}});
     }
     const fs::path folder = workingFolder.empty() ? fs::path(".") : workingFolder;
 
@@ -369,14 +362,14 @@ std::unique_ptr<ProgramWatch> StartWatched(const fs::path& program,
 
     std::array<int, 2> pipe{};
     if (::pipe2(pipe.data(), O_CLOEXEC) != 0) {
-        return FixedProgramWatch(NotRun({FailedAction::Run, program, LastSystemError(), {}}));
+        return NotRunWatch({FailedAction::Run, program, LastSystemError(), {}});
     }
     const pid_t watcher = ::fork();
     if (watcher < 0) {
         const std::error_code forkError = LastSystemError();
         ::close(pipe[0]);
         ::close(pipe[1]);
-        return FixedProgramWatch(NotRun({FailedAction::Run, program, forkError, {}}));
+        return NotRunWatch({FailedAction::Run, program, forkError, {}});
     }
     if (watcher == 0) {
         ::close(pipe[0]);

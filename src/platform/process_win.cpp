@@ -120,10 +120,7 @@ private:
 };
 
 std::unique_ptr<ProgramWatch> NotRun(const fs::path& program, std::error_code code) {
-    ProgramState state;
-    state.kind = ProgramState::Kind::NotRun;
-    state.failure = {FailedAction::Run, program, code, {}};
-    return FixedProgramWatch(std::move(state));
+    return NotRunWatch({FailedAction::Run, program, code, {}});
 }
 
 }  // namespace

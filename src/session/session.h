@@ -181,7 +181,6 @@ public:
     // Starts the launcher. The run is usually still watched then: TickLaunch says how it ended.
     // Asked again while a start is watched, it starts nothing and says nothing.
     LaunchRun Launch(LaunchFrom from);
-    bool LaunchWatched() const { return launchWatch_.has_value(); }
     // One look at the watched start; the run once it is decided (started or failed).
     std::optional<LaunchRun> TickLaunch();
     // The clock of the launch's watch; tests set one of their own.

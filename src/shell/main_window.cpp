@@ -290,9 +290,7 @@ void MainWindow::saveSettings() {
 }
 
 void MainWindow::launchGame(session::LaunchFrom from) {
-    if (session_.LaunchWatched()) {
-        return;  // one start at a time; its outcome is on its way
-    }
+    // While a start is watched, the session starts nothing more and the watch goes on.
     session::LaunchRun run = session_.Launch(from);
     if (!run.watching()) {
         showLaunch(std::move(run));
